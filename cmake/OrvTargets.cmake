@@ -1,0 +1,29 @@
+# What every native target of this project is compiled with, and the platform
+# libraries that Debian packages.
+
+set(CMAKE_CXX_STANDARD 17)
+set(CMAKE_CXX_STANDARD_REQUIRED ON)
+set(CMAKE_CXX_EXTENSIONS OFF)
+set(CMAKE_EXPORT_COMPILE_COMMANDS ON)
+set(CMAKE_POSITION_INDEPENDENT_CODE ON)
+set(CMAKE_LIBRARY_OUTPUT_DIRECTORY ${CMAKE_BINARY_DIR}/lib)
+set(CMAKE_RUNTIME_OUTPUT_DIRECTORY ${CMAKE_BINARY_DIR}/bin)
+if(NOT CMAKE_BUILD_TYPE)
+  set(CMAKE_BUILD_TYPE RelWithDebInfo)
+endif()
+
+add_library(orv_warnings INTERFACE)
+target_compile_options(orv_warnings INTERFACE -Wall -Wextra -Werror)
+
+# Debian's Android libraries: utils, log and nativehelper. Their headers warn,
+# so they are system headers; jni.h stands in a folder of its own.
+find_path(ANDROID_INCLUDE_DIR utils/RefBase.h PATH_SUFFIXES android REQUIRED)
+find_library(ANDROID_UTILS_LIBRARY utils PATH_SUFFIXES android ${CMAKE_LIBRARY_ARCHITECTURE}/android REQUIRED)
+get_filename_component(ANDROID_LIBRARY_DIR ${ANDROID_UTILS_LIBRARY} DIRECTORY)
+add_library(android_packages INTERFACE)
+target_include_directories(android_packages SYSTEM INTERFACE
+  ${ANDROID_INCLUDE_DIR} ${ANDROID_INCLUDE_DIR}/nativehelper)
+target_link_directories(android_packages INTERFACE ${ANDROID_LIBRARY_DIR})
+target_link_libraries(android_packages INTERFACE utils log nativehelper)
+set(CMAKE_BUILD_RPATH ${ANDROID_LIBRARY_DIR})
+find_package(Threads REQUIRED)
