@@ -1,0 +1,50 @@
+# SPDX-License-Identifier: Apache-2.0
+# shellcheck shell=bash
+# help: test [--target native|armhf|all] [--filter REGEX] [--no-lint]    every test; a filter runs the tests whose names match
+use packages build lint
+
+target=all
+filter=
+with_lint=yes
+while [ $# -gt 0 ]; do
+    case $1 in
+    --target) target=${2:-} && shift ;;
+    --target=*) target=${1#*=} ;;
+    --filter) filter=${2:-} && shift ;;
+    --filter=*) filter=${1#*=} ;;
+    --no-lint) with_lint= ;;
+    *) die_usage "test does not know '$1'." ;;
+    esac
+    shift || die_usage "an option of test lacks its value."
+done
+
+test_native() {
+    need_packages "build and test" play test
+    build_targets on all
+    [ -z "$with_lint" ] || [ -n "$filter" ] || lint_everything
+    on_some_display ctest --test-dir "$ORV_BUILD" --output-on-failure --no-tests=error \
+        ${filter:+--tests-regex "$filter"}
+}
+
+# The window's tests need a display; a virtual one does where there is none.
+on_some_display() {
+    if [ -n "${DISPLAY:-}" ]; then
+        "$@"
+    else
+        xvfb-run -a -s '-screen 0 1280x800x24' "$@"
+    fi
+}
+
+test_armhf() {
+    "$ORV_ROOT/tools/armhf-test" ${filter:+--filter "$filter"}
+}
+
+case $target in
+native) test_native ;;
+armhf) test_armhf ;;
+all)
+    test_native
+    [ ! -x "$ORV_ROOT/tools/armhf-test" ] || test_armhf
+    ;;
+*) die_usage "--target is native, armhf or all, not '$target'." ;;
+esac

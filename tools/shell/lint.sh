@@ -1,0 +1,37 @@
+# SPDX-License-Identifier: Apache-2.0
+# shellcheck shell=bash
+# The static checks. Each prints what it finds and says how it ended.
+
+lint_everything() {
+    local failed=() check
+    for check in format scripts tidy; do
+        "lint_$check" || failed+=("$check")
+    done
+    [ ${#failed[@]} -eq 0 ] || die "lint failed: ${failed[*]}"
+    say "lint: layout, scripts and static checks are clean"
+}
+
+# find_sources NAME…: the files of ours whose names match, NUL between them.
+find_sources() {
+    local names=() name
+    for name in "$@"; do names+=(-o -name "$name"); done
+    find "$ORV_ROOT" \( -name .git -o -name 'build*' -type d \) -prune -o \
+        -type f \( "${names[@]:1}" \) -print0
+}
+
+lint_format() {
+    find_sources '*.cpp' '*.h' | xargs -0 clang-format --dry-run -Werror
+}
+
+lint_scripts() {
+    { find_sources '*.sh' && grep -rlIZ --exclude-dir='build*' --exclude-dir=.git \
+        -m 1 -e '^#!/usr/bin/env bash' -e '^#!/bin/sh' -e '^#!/bin/bash' "$ORV_ROOT"; } |
+        sort -zu | xargs -0 shellcheck --external-sources
+}
+
+lint_tidy() {
+    local log=$ORV_BUILD/log/tidy.log
+    run-clang-tidy -quiet -p "$ORV_BUILD" >"$log" 2>/dev/null && return
+    grep -E '(warning|error):' "$log" | sort -u
+    return 1
+}
