@@ -1,0 +1,27 @@
+// SPDX-License-Identifier: Apache-2.0
+#pragma once
+
+#include <orvtarn/PcmRecords.h>
+
+#include <string>
+#include <utility>
+#include <vector>
+
+namespace orvtarn {
+
+// How mpv is told to read a stream of raw samples.
+struct PcmFormat {
+    // Options of "loadfile", names and values as they are (not quoted).
+    std::vector<std::pair<std::string, std::string>> options;
+    int bytesPerSecond = 0;
+};
+
+// Checks the whole description against orvtarn/PcmRecords.h. True with the
+// format, or false with the reason, such as "blockAlign is 3, must be 4": a
+// wrong description would play as noise.
+bool pcmFormat(const IORV_PB_CTRL_SET_MEDIA_INFO_T& info, PcmFormat& format, std::string& reason);
+
+// The options as the third argument of the command "loadfile", values quoted.
+std::string loadfileOptions(const PcmFormat& format);
+
+}  // namespace orvtarn
