@@ -1,6 +1,5 @@
 // SPDX-License-Identifier: Apache-2.0
 #include <jni.h>
-#include <nativehelper/JNIHelp.h>
 
 #include <new>
 
@@ -34,9 +33,14 @@ READER_METHOD(void, nativeDestroy)(JNIEnv*, jclass, jlong queue) {
     queueOf(queue)->decStrong(&kJavaReference);
 }
 
-// The queue as its producer interface: the base class has another address.
-READER_METHOD(jlong, nativeGetProducer)(JNIEnv*, jobject, jlong queue) {
-    return toHandle<IGraphicBufferProducer>(queueOf(queue));
+// Through the surface's private constructor, which takes a producer: the base
+// class has another address than the queue.
+READER_METHOD(jobject, nativeCreateSurface)(JNIEnv* env, jobject, jlong queue) {
+    jclass const clazz = env->FindClass("android/view/Surface");
+    if (clazz == nullptr) return nullptr;
+    jmethodID const constructor = env->GetMethodID(clazz, "<init>", "(J)V");
+    if (constructor == nullptr) return nullptr;
+    return env->NewObject(clazz, constructor, toHandle<IGraphicBufferProducer>(queueOf(queue)));
 }
 
 READER_METHOD(jint, nativeSetDefaultSize)(JNIEnv*, jobject, jlong queue, jint width, jint height) {
