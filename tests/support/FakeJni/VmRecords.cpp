@@ -1,0 +1,129 @@
+// SPDX-License-Identifier: Apache-2.0
+// What the virtual machine remembers for the test: calls, buffers given out,
+// failures to come, and broken rules.
+#include <algorithm>
+
+#include "FakeJni/EnvSupport.h"
+
+namespace fakejni {
+
+namespace {
+
+using Lock = std::lock_guard<std::recursive_mutex>;
+
+}  // namespace
+
+void Vm::fail(const std::string& function, int nth) {
+    Lock lock(mMutex);
+    mPlans.push_back({function, nth});
+}
+
+void Vm::failNth(int n) { fail("", n); }
+
+bool Vm::mustFail(const std::string& function) {
+    bool hit = false;
+    for (Plan& plan : mPlans) {
+        const bool counts = plan.function.empty() || plan.function == function;
+        if (counts && plan.remaining > 0 && --plan.remaining == 0) hit = true;
+    }
+    mFailures += hit;
+    return hit;
+}
+
+void Vm::record(const std::string& function, const std::string& detail) {
+    mCalls.push_back({function, detail, std::this_thread::get_id()});
+}
+
+void Vm::recordJava(JavaCall call) { mJavaCalls.push_back(std::move(call)); }
+
+std::vector<JniCall> Vm::calls() {
+    Lock lock(mMutex);
+    return mCalls;
+}
+
+std::vector<std::string> Vm::callsOf(const std::string& function) {
+    Lock lock(mMutex);
+    std::vector<std::string> details;
+    for (const JniCall& call : mCalls) {
+        if (call.function == function) details.push_back(call.detail);
+    }
+    return details;
+}
+
+std::vector<JavaCall> Vm::javaCalls() {
+    Lock lock(mMutex);
+    return mJavaCalls;
+}
+
+std::vector<std::string> Vm::javaCallTexts() {
+    std::vector<std::string> texts;
+    for (const JavaCall& call : javaCalls()) texts.push_back(toString(call));
+    return texts;
+}
+
+void Vm::forgetCalls() {
+    Lock lock(mMutex);
+    mCalls.clear();
+    mJavaCalls.clear();
+}
+
+size_t Vm::globalReferences() {
+    Lock lock(mMutex);
+    return mReferences.liveCount(RefKind::kGlobal) + mReferences.liveCount(RefKind::kWeak);
+}
+
+size_t Vm::localReferences() {
+    Lock lock(mMutex);
+    return mReferences.liveCount(RefKind::kLocal);
+}
+
+std::vector<std::string> Vm::unreleased() {
+    Lock lock(mMutex);
+    std::vector<std::string> functions;
+    for (const auto& [buffer, pin] : mPins) functions.push_back(pin.function);
+    std::sort(functions.begin(), functions.end());
+    return functions;
+}
+
+std::vector<std::string> Vm::violations() {
+    Lock lock(mMutex);
+    return mViolations;
+}
+
+void Vm::violation(const std::string& text) {
+    Lock lock(mMutex);
+    for (const std::string& tolerated : mTolerated) {
+        if (text.find(tolerated) != std::string::npos) return;
+    }
+    mViolations.push_back(text);
+}
+
+void Vm::tolerate(const std::string& text) {
+    Lock lock(mMutex);
+    mTolerated.push_back(text);
+    std::vector<std::string> earlier;
+    earlier.swap(mViolations);
+    for (const std::string& one : earlier) violation(one);
+}
+
+void Vm::handOut(const void* id) { mIds.insert(id); }
+
+bool Vm::isHandedOut(const void* id) const { return mIds.count(id) != 0; }
+
+void Vm::pin(const void* buffer, const std::string& function, ObjectPtr owner) {
+    mPins[buffer] = {function, std::move(owner)};
+}
+
+ObjectPtr Vm::unpin(const void* buffer, const std::string& function, bool keep) {
+    auto found = mPins.find(buffer);
+    const std::string giver = "Get" + function.substr(std::string("Release").size());
+    if (found == mPins.end() || found->second.function != giver) {
+        violation(function + ": not a buffer that " + giver + " gave");
+        return nullptr;
+    }
+    ObjectPtr owner = found->second.owner;
+    if (!keep) mPins.erase(found);
+    return owner;
+}
+
+}  // namespace fakejni
