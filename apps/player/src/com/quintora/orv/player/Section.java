@@ -1,0 +1,32 @@
+// SPDX-License-Identifier: Apache-2.0
+package com.quintora.orv.player;
+
+import picocli.CommandLine.ITypeConverter;
+import picocli.CommandLine.TypeConversionException;
+
+/** A section to repeat, in milliseconds: written A-B or, with plain seconds, A:B. */
+record Section(int from, int to) {
+    static Section parse(String text) {
+        int cut = text.indexOf(text.indexOf('-') > 0 ? '-' : ':');
+        if (cut <= 0) {
+            throw new TypeConversionException(
+                    "'" + text + "' is not a section; write 10:20 for seconds, or 0:10-0:20");
+        }
+        Section section =
+                new Section(
+                        Times.parseMillis(text.substring(0, cut)),
+                        Times.parseMillis(text.substring(cut + 1)));
+        if (section.from >= section.to) {
+            throw new TypeConversionException(
+                    "the section '" + text + "' ends before it begins");
+        }
+        return section;
+    }
+
+    static final class Converter implements ITypeConverter<Section> {
+        @Override
+        public Section convert(String value) {
+            return parse(value);
+        }
+    }
+}

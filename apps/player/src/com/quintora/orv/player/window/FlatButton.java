@@ -1,0 +1,79 @@
+// SPDX-License-Identifier: Apache-2.0
+package com.quintora.orv.player.window;
+
+import java.awt.Dimension;
+import java.awt.FontMetrics;
+import java.awt.Graphics;
+import java.awt.Graphics2D;
+import javax.swing.JButton;
+
+/** A borderless button with a picture, or with a short text. */
+final class FlatButton extends JButton {
+    private static final int GLYPH_SIZE = 20;
+
+    private Glyph glyph;
+
+    FlatButton(Glyph glyph, String tip, Runnable action) {
+        this.glyph = glyph;
+        describe(tip);
+        setFocusable(false);
+        setOpaque(false);
+        setContentAreaFilled(false);
+        setBorderPainted(false);
+        setFont(Theme.BODY);
+        addActionListener(event -> action.run());
+    }
+
+    void show(Glyph glyph, String tip) {
+        this.glyph = glyph;
+        describe(tip);
+        repaint();
+    }
+
+    private void describe(String tip) {
+        setToolTipText(tip);
+        getAccessibleContext().setAccessibleName(tip);
+    }
+
+    @Override
+    public Dimension getPreferredSize() {
+        int text = getText().isEmpty() ? 0 : getFontMetrics(getFont()).stringWidth(getText()) + 16;
+        return new Dimension(Math.max(Theme.BUTTON, text), Theme.BUTTON);
+    }
+
+    @Override
+    public Dimension getMaximumSize() {
+        return getPreferredSize();
+    }
+
+    @Override
+    protected void paintComponent(Graphics graphics) {
+        Graphics2D g = Theme.smooth(graphics);
+        if (isEnabled() && (getModel().isRollover() || getModel().isPressed())) {
+            g.setColor(getModel().isPressed() ? Theme.TRACK : Theme.HOVER);
+            g.fillRoundRect(0, 0, getWidth(), getHeight(), Theme.CORNER, Theme.CORNER);
+        }
+        paintContent(g);
+        g.dispose();
+    }
+
+    private void paintContent(Graphics2D g) {
+        var color = isEnabled() ? Theme.TEXT : Theme.BUFFERED;
+        if (getText().isEmpty()) {
+            glyph.paint(
+                    g,
+                    (getWidth() - GLYPH_SIZE) / 2.0,
+                    (getHeight() - GLYPH_SIZE) / 2.0,
+                    GLYPH_SIZE,
+                    color);
+            return;
+        }
+        FontMetrics metrics = g.getFontMetrics(getFont());
+        g.setFont(getFont());
+        g.setColor(color);
+        g.drawString(
+                getText(),
+                (getWidth() - metrics.stringWidth(getText())) / 2,
+                (getHeight() - metrics.getHeight()) / 2 + metrics.getAscent());
+    }
+}

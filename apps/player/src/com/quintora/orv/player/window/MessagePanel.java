@@ -1,0 +1,74 @@
+// SPDX-License-Identifier: Apache-2.0
+package com.quintora.orv.player.window;
+
+import java.awt.BorderLayout;
+import java.awt.Color;
+import java.awt.Dimension;
+import java.awt.Graphics;
+import java.awt.GridBagLayout;
+import javax.swing.BorderFactory;
+import javax.swing.JComponent;
+import javax.swing.JLabel;
+import javax.swing.JPanel;
+import javax.swing.JTextArea;
+
+/** What the window says in place of a picture: why it cannot play, or what it waits for. */
+final class MessagePanel extends JPanel {
+    private static final int TEXT_WIDTH = 420;
+
+    private final JLabel title = new JLabel();
+    private final JTextArea text = new JTextArea();
+    private final JComponent sign = new Sign();
+    private Glyph glyph = Glyph.ALERT;
+    private Color color = Theme.ALERT;
+
+    MessagePanel() {
+        super(new GridBagLayout());
+        setBackground(Theme.STAGE);
+        title.setFont(Theme.TITLE);
+        title.setForeground(Theme.TEXT);
+        text.setFont(Theme.BODY.deriveFont(14f));
+        text.setForeground(Theme.MUTED);
+        text.setOpaque(false);
+        text.setEditable(false);
+        text.setFocusable(false);
+        text.setLineWrap(true);
+        text.setWrapStyleWord(true);
+        JPanel words = new JPanel(new BorderLayout(0, Theme.GAP));
+        words.setOpaque(false);
+        words.add(title, BorderLayout.NORTH);
+        words.add(text, BorderLayout.CENTER);
+        JPanel card = new JPanel(new BorderLayout(20, 0));
+        card.setBackground(Theme.PANEL);
+        card.setBorder(BorderFactory.createEmptyBorder(24, 24, 24, 28));
+        card.add(sign, BorderLayout.WEST);
+        card.add(words, BorderLayout.CENTER);
+        add(card);
+    }
+
+    void tell(Glyph glyph, Color color, String title, String text) {
+        this.glyph = glyph;
+        this.color = color;
+        this.title.setText(title);
+        this.text.setText(text);
+        // A text area knows its height only once its width is set.
+        this.text.setSize(TEXT_WIDTH, Short.MAX_VALUE);
+        this.text.setPreferredSize(
+                new Dimension(TEXT_WIDTH, this.text.getUI().getPreferredSize(this.text).height));
+        revalidate();
+        repaint();
+    }
+
+    private final class Sign extends JComponent {
+        Sign() {
+            setPreferredSize(new Dimension(44, 44));
+        }
+
+        @Override
+        protected void paintComponent(Graphics graphics) {
+            var g = Theme.smooth(graphics);
+            glyph.paint(g, 0, 0, 44, color);
+            g.dispose();
+        }
+    }
+}
