@@ -17,7 +17,7 @@ enum E_Orv_Aud_Enc : int32_t {
 };
 
 enum E_Orv_Pcm_Type : int32_t {
-    E_ORV_PCM_TYPE_SIGNED = 0,
+    E_ORV_PCM_TYPE_SIGNED = 0,    // 8, 16, 24 or 32 bits per sample
     E_ORV_PCM_TYPE_UNSIGNED = 1,  // 8 bits per sample only
     E_ORV_PCM_TYPE_FLOAT = 2,     // 32 bits per sample only
     E_ORV_PCM_TYPE_ALAW = 3,      // 8 bits per sample
@@ -35,21 +35,21 @@ struct ORV_AUD_PCM_INFO_T {
     E_Orv_Aud_Sample_Rate eSampleRate;         // Hz, 1000 to 384000
     uint16_t u2BlockAlign;                     // bytes of one sample of all channels
     E_Orv_Aud_Bits_Per_Sample eBitsPerSample;  // 8, 16, 24 or 32
-    uint8_t fgBigEndian;                       // 0 or 1
+    uint8_t fgBigEndian;                       // 0 or 1, of no effect on 8 bits
 };
 
 struct ORV_AUD_INFO_T {
-    E_Orv_Aud_Enc eAudEnc;
+    E_Orv_Aud_Enc eAudEnc;  // E_ORV_AUD_ENC_PCM
     union {
         ORV_AUD_PCM_INFO_T t_pcm_info;
     } uAudCodecInfo;
 };
 
 struct IORV_PB_CTRL_SET_MEDIA_INFO_T {
-    E_Orv_Media_Type eMediaType;
-    uint32_t u4TotalDuration;  // milliseconds, 0 when unknown
-    int64_t u8Size;            // bytes, 0 when unknown
-    uint8_t fgSynchronized;    // 0 or 1
+    E_Orv_Media_Type eMediaType;  // E_ORV_MEDIA_TYPE_AUDIO_ES
+    uint32_t u4TotalDuration;     // milliseconds, 0 when unknown
+    int64_t u8Size;               // bytes, 0 or negative when unknown
+    uint8_t fgSynchronized;       // 0 or 1
     union alignas(8) {
         struct {
             ORV_AUD_INFO_T tAudInfo;

@@ -1,0 +1,144 @@
+// SPDX-License-Identifier: Apache-2.0
+#include "SubtitleStyle.h"
+
+#include <stdio.h>
+
+#include <algorithm>
+#include <cmath>
+#include <cstdlib>
+
+namespace orvtarn {
+namespace {
+
+// Sizes of mpv's sub-font-size, which counts pixels on a picture of 720 rows.
+const int64_t kSmallFont = 40;
+const int64_t kMediumFont = 55;
+const int64_t kLargeFont = 75;
+
+// mpv lays plain-text subtitles out on a canvas 960 units wide and takes
+// margins of up to 300.
+const double kCanvasWidth = 960;
+const int64_t kMaxMargin = 300;
+const int64_t kUsualMargin = 25;
+
+const int64_t kUsualPosition = 100;  // percent of the picture's height
+const int64_t kMaxPosition = 150;
+
+// The number of mpv for a font, or 0 for one that is refused.
+int64_t fontSize(const Subtitle_FontInfo& font) {
+    switch (font.mFontSizeType) {
+        case ORV_SUBTITLE_FONT_SMALL:
+            return kSmallFont;
+        case ORV_SUBTITLE_FONT_MEDIUM:
+            return kMediumFont;
+        case ORV_SUBTITLE_FONT_LARGE:
+            return kLargeFont;
+        case ORV_SUBTITLE_FONT_CUSTOM:
+            return font.mCustomSize;
+        default:
+            return 0;
+    }
+}
+
+bool isTimeOffset(const Subtitle_TimeOffset& offset) {
+    return offset.mTimeOffsetType == ORV_SUBTITLE_TIME_OFFSET_DELAY ||
+           offset.mTimeOffsetType == ORV_SUBTITLE_TIME_OFFSET_ADVANCE;
+}
+
+bool isDisplayOffset(const Subtitle_TimeOffset& offset) {
+    const auto inPicture = [](int32_t value) { return value >= -1000 && value <= 1000; };
+    return inPicture(offset.mTimeOffsetType) && inPicture(offset.mOffsetValue);
+}
+
+double delaySeconds(const Subtitle_TimeOffset& offset) {
+    const double seconds = offset.mOffsetValue / 1000.0;
+    return offset.mTimeOffsetType == ORV_SUBTITLE_TIME_OFFSET_ADVANCE ? -seconds : seconds;
+}
+
+std::string colorText(const Subtitle_Color& color) {
+    char text[10];
+    snprintf(text, sizeof(text), "#%02X%02X%02X%02X", color.mA, color.mR, color.mG, color.mB);
+    return text;
+}
+
+int64_t marginOf(int x) {
+    return std::min<int64_t>(std::llround(std::abs(x) * kCanvasWidth / 1000), kMaxMargin);
+}
+
+void addHorizontal(int x, std::vector<MpvAssignment>& style) {
+    style.push_back({"sub-align-x", std::string(x > 0 ? "left" : x < 0 ? "right" : "center")});
+    style.push_back({"sub-margin-x", x == 0 ? kUsualMargin : marginOf(x)});
+}
+
+void addVertical(int y, std::vector<MpvAssignment>& style) {
+    const int64_t position = kUsualPosition + std::lround(y / 10.0);
+    style.push_back({"sub-pos", std::clamp<int64_t>(position, 0, kMaxPosition)});
+}
+
+// Copies the record into its place, if it is one that the check takes.
+template <typename Record, typename Check>
+bool put(const void* record, std::optional<Record>& place, Check check) {
+    const Record& value = *static_cast<const Record*>(record);
+    if (!check(value)) return false;
+    place = value;
+    return true;
+}
+
+}  // namespace
+
+bool SubtitleStyle::stage(int type, const void* record) {
+    const auto anyColor = [](const Subtitle_Color&) { return true; };
+    const auto knownFont = [](const Subtitle_FontInfo& font) { return fontSize(font) != 0; };
+    if (record == nullptr) return false;
+    switch (type) {
+        case E_SUBTITLE_ATTR_TYPE_TIME_OFFSET:
+            return put(record, mTimeOffset, isTimeOffset);
+        case E_SUBTITLE_ATTR_TYPE_FONT_INFO:
+            return put(record, mFontInfo, knownFont);
+        case E_SUBTITLE_ATTR_TYPE_BG_COLOR:
+            return put(record, mBackColor, anyColor);
+        case E_SUBTITLE_ATTR_TYPE_TEXT_COLOR:
+            return put(record, mTextColor, anyColor);
+        case E_SUBTITLE_ATTR_TYPE_EDGE_COLOR:
+            return put(record, mEdgeColor, anyColor);
+        case E_SUBTITLE_ATTR_TYPE_DISPLAY_OFFSET:
+            return put(record, mDisplayOffset, isDisplayOffset);
+        default:
+            return false;
+    }
+}
+
+std::vector<MpvAssignment> SubtitleStyle::flush() {
+    std::vector<MpvAssignment> style;
+    if (mTimeOffset) style.push_back({"sub-delay", delaySeconds(*mTimeOffset)});
+    // Formats with a style of their own keep it otherwise.
+    if (mFontInfo || mBackColor || mTextColor || mEdgeColor) {
+        style.push_back({"sub-ass-override", std::string("force")});
+    }
+    if (mFontInfo) style.push_back({"sub-font-size", fontSize(*mFontInfo)});
+    if (mBackColor) style.push_back({"sub-back-color", colorText(*mBackColor)});
+    if (mTextColor) style.push_back({"sub-color", colorText(*mTextColor)});
+    if (mEdgeColor) style.push_back({"sub-border-color", colorText(*mEdgeColor)});
+    if (mDisplayOffset) {
+        addHorizontal(mDisplayOffset->mTimeOffsetType, style);
+        addVertical(mDisplayOffset->mOffsetValue, style);
+    }
+    clear();
+    return style;
+}
+
+void SubtitleStyle::clear() { *this = SubtitleStyle(); }
+
+std::vector<MpvAssignment> SubtitleStyle::defaults() {
+    return {{"sub-delay", 0.0},
+            {"sub-ass-override", std::string("yes")},
+            {"sub-font-size", kMediumFont},
+            {"sub-back-color", colorText({0, 0, 0, 0})},
+            {"sub-color", colorText({255, 255, 255, 255})},
+            {"sub-border-color", colorText({255, 0, 0, 0})},
+            {"sub-align-x", std::string("center")},
+            {"sub-margin-x", kUsualMargin},
+            {"sub-pos", kUsualPosition}};
+}
+
+}  // namespace orvtarn
