@@ -5,7 +5,6 @@
 #include <orvtarn/TrackRecords.h>
 #include <stdint.h>
 
-#include <string_view>
 #include <vector>
 
 #include "MediaFile.h"
@@ -36,9 +35,5 @@ TrackTables trackTables(const mpv_node& trackList);
 void addContainerDetails(const MediaFile& file, TrackTables& tables);
 // The descriptive texts of one audio track, for callers that ask for them.
 void addAudioTexts(const MediaFile& file, Track<AudioTrackInfo>& track);
-
-// The four-character code for a codec by libavcodec's name, such as "h264" or
-// "aac" ("mp4a"); 0 for an empty name. See orvtarn/TrackRecords.h.
-int32_t codecFourCC(std::string_view codecName);
 
 }  // namespace orvtarn
