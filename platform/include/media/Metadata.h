@@ -25,26 +25,26 @@ public:
     };
 
     // Keys of the platform's player metadata.
-    static const Type kAny = 0;
-    static const Type kTitle = 1;
-    static const Type kComment = 2;
-    static const Type kCopyright = 3;
-    static const Type kAlbum = 4;
-    static const Type kArtist = 5;
-    static const Type kAuthor = 6;
-    static const Type kComposer = 7;
-    static const Type kGenre = 8;
-    static const Type kDate = 9;
-    static const Type kDuration = 10;
-    static const Type kCdTrackNumber = 11;
-    static const Type kBitRate = 13;
-    static const Type kVideoHeight = 23;
-    static const Type kVideoWidth = 24;
-    static const Type kNumTracks = 25;
-    static const Type kPauseAvailable = 29;
-    static const Type kSeekBackwardAvailable = 30;
-    static const Type kSeekForwardAvailable = 31;
-    static const Type kSeekAvailable = 32;
+    static constexpr Type kAny = 0;
+    static constexpr Type kTitle = 1;
+    static constexpr Type kComment = 2;
+    static constexpr Type kCopyright = 3;
+    static constexpr Type kAlbum = 4;
+    static constexpr Type kArtist = 5;
+    static constexpr Type kAuthor = 6;
+    static constexpr Type kComposer = 7;
+    static constexpr Type kGenre = 8;
+    static constexpr Type kDate = 9;
+    static constexpr Type kDuration = 10;
+    static constexpr Type kCdTrackNumber = 11;
+    static constexpr Type kBitRate = 13;
+    static constexpr Type kVideoHeight = 23;
+    static constexpr Type kVideoWidth = 24;
+    static constexpr Type kNumTracks = 25;
+    static constexpr Type kPauseAvailable = 29;
+    static constexpr Type kSeekBackwardAvailable = 30;
+    static constexpr Type kSeekForwardAvailable = 31;
+    static constexpr Type kSeekAvailable = 32;
 
     // Starts at the parcel's current position; the parcel must outlive this.
     explicit Metadata(Parcel* parcel);
