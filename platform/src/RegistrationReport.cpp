@@ -73,7 +73,7 @@ void reportRow(JNIEnv* env, jclass clazz, const char* className, const JNINative
         if (declarations.find(text) == std::string::npos) {
             LOG_ERROR("%s: native method %s%s is only inherited: %s", className, row.name,
                       row.signature, text.c_str());
-        } else if (text.find(" native ") == std::string::npos) {
+        } else if ((" " + text).find(" native ") == std::string::npos) {
             LOG_ERROR("%s: method %s%s is not declared native: %s", className, row.name,
                       row.signature, text.c_str());
         }

@@ -208,6 +208,7 @@ public class ImageReader implements AutoCloseable {
     private final class FrameNotifier extends Thread {
         private final OnImageAvailableListener mListener;
         private final Executor mExecutor;
+        private long mSeen = nativeGetQueuedCount(mQueue);
         volatile boolean mStopped;
 
         FrameNotifier(OnImageAvailableListener listener, Executor executor) {
@@ -219,11 +220,10 @@ public class ImageReader implements AutoCloseable {
 
         @Override
         public void run() {
-            long seen = nativeGetQueuedCount(mQueue);
             while (!mStopped) {
-                long queued = nativeAwaitFrame(mQueue, seen, WAIT_SLICE_MS);
-                if (queued > seen) {
-                    seen = queued;
+                long queued = nativeAwaitFrame(mQueue, mSeen, WAIT_SLICE_MS);
+                if (queued > mSeen) {
+                    mSeen = queued;
                     mExecutor.execute(this::tell);
                 }
             }

@@ -96,22 +96,26 @@ public final class Parcel {
 
     /** Writes 4 bytes. */
     public void writeInt(int value) {
-        mData.putInt(advanceToWrite(Integer.BYTES), value);
+        int begin = advanceToWrite(Integer.BYTES);
+        mData.putInt(begin, value);
     }
 
     /** Writes 8 bytes. */
     public void writeLong(long value) {
-        mData.putLong(advanceToWrite(Long.BYTES), value);
+        int begin = advanceToWrite(Long.BYTES);
+        mData.putLong(begin, value);
     }
 
     /** Writes 4 bytes. */
     public void writeFloat(float value) {
-        mData.putFloat(advanceToWrite(Float.BYTES), value);
+        int begin = advanceToWrite(Float.BYTES);
+        mData.putFloat(begin, value);
     }
 
     /** Writes 8 bytes. */
     public void writeDouble(double value) {
-        mData.putDouble(advanceToWrite(Double.BYTES), value);
+        int begin = advanceToWrite(Double.BYTES);
+        mData.putDouble(begin, value);
     }
 
     /** Writes the length in UTF-16 units, the units and a zero unit; the length -1 for null. */
@@ -219,6 +223,7 @@ public final class Parcel {
         return begin;
     }
 
+    // May replace mData: take the position first, then write.
     private int advanceToWrite(int length) {
         int begin = mPosition;
         int end = Math.addExact(begin, padded(length));
