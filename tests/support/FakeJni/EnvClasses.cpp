@@ -93,6 +93,7 @@ jint registerNatives(JNIEnv* env, jclass handle, const JNINativeMethod* rows, ji
     if (type == nullptr) return JNI_ERR;
     const bool failed = entry.fails();
     for (jint i = 0; i < count; ++i) {
+        entry.vm.recordRegistration(rows[i]);
         Method* found = failed ? nullptr : findNative(*type, rows[i]);
         if (found == nullptr) {
             entry.raise("java/lang/NoSuchMethodError", rows[i].name);

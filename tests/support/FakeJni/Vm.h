@@ -115,6 +115,8 @@ public:
     // The details of the calls of one function, in order.
     std::vector<std::string> callsOf(const std::string& function);
     std::vector<JavaCall> javaCalls();
+    // Every row that RegisterNatives was given, in order, forgotten never.
+    std::vector<JNINativeMethod> registrations();
     std::vector<std::string> javaCallTexts();
     void forgetCalls();
     size_t globalReferences();
@@ -132,6 +134,7 @@ public:
     bool mustFail(const std::string& function);
     void record(const std::string& function, const std::string& detail);
     void recordJava(JavaCall call);
+    void recordRegistration(const JNINativeMethod& row) { mRegistrations.push_back(row); }
     void violation(const std::string& text);
     // Field and method IDs: only those that a lookup of this machine gave are good.
     void handOut(const void* id);
@@ -167,6 +170,7 @@ private:
     int mFailures = 0;
     std::vector<JniCall> mCalls;
     std::vector<JavaCall> mJavaCalls;
+    std::vector<JNINativeMethod> mRegistrations;
     std::map<const void*, Pin> mPins;
     std::set<const void*> mIds;
     std::vector<std::string> mViolations;

@@ -55,6 +55,11 @@ std::vector<JavaCall> Vm::javaCalls() {
     return mJavaCalls;
 }
 
+std::vector<JNINativeMethod> Vm::registrations() {
+    Lock lock(mMutex);
+    return mRegistrations;
+}
+
 std::vector<std::string> Vm::javaCallTexts() {
     std::vector<std::string> texts;
     for (const JavaCall& call : javaCalls()) texts.push_back(toString(call));
