@@ -1,0 +1,220 @@
+// SPDX-License-Identifier: Apache-2.0
+#include <errno.h>
+#include <gtest/gtest.h>
+#include <os/MemoryPool.h>
+#include <stdint.h>
+#include <string.h>
+#include <unistd.h>
+
+#include <atomic>
+#include <future>
+#include <thread>
+#include <vector>
+
+#include "PosixCalls.h"
+
+namespace orvtest {
+namespace {
+
+using testing::internal::CaptureStderr;
+using testing::internal::CaptureStdout;
+using testing::internal::GetCapturedStderr;
+using testing::internal::GetCapturedStdout;
+
+MemoryBlock* blockOf(void* memory) {
+    return reinterpret_cast<MemoryBlock*>(static_cast<char*>(memory) - MEMORY_HEADER_SIZE);
+}
+
+int semaphoreValue() {
+    int value = -1;
+    sem_getvalue(&sem, &value);
+    return value;
+}
+
+// The live blocks from the head on, seen to be linked both ways.
+std::vector<MemoryBlock*> liveBlocks() {
+    std::vector<MemoryBlock*> blocks;
+    for (MemoryBlock* block = memorys.head.next; block != &memorys.head; block = block->next) {
+        EXPECT_EQ(block->prev->next, block);
+        EXPECT_EQ(block->next->prev, block);
+        blocks.push_back(block);
+    }
+    return blocks;
+}
+
+class MemoryPoolTest : public testing::Test {
+protected:
+    void SetUp() override { ASSERT_EQ(mem_init(), 0); }
+    void TearDown() override {
+        EXPECT_TRUE(liveBlocks().empty());
+        EXPECT_EQ(semaphoreValue(), 1);
+        EXPECT_EQ(mem_uninit(), 0);
+    }
+};
+
+TEST_F(MemoryPoolTest, BlockHoldsItsSizeAndItsOwnAddress) {
+    void* memory = mem_alloc(100);
+    ASSERT_NE(memory, nullptr);
+    EXPECT_EQ(blockOf(memory)->size, 100);
+    EXPECT_EQ(blockOf(memory)->reserved, 0);
+    void* first = nullptr;
+    memcpy(&first, memory, sizeof(first));
+    EXPECT_EQ(first, memory);
+    const char* bytes = static_cast<char*>(memory);
+    for (int i = sizeof(first); i < 100; i++) ASSERT_EQ(bytes[i], 0) << "byte " << i;
+    mem_free(memory);
+}
+
+TEST_F(MemoryPoolTest, BlockBeginsWithItsMapping) {
+    size_t length = 0;
+    void* mapping = nullptr;
+    int protection = 0;
+    int flags = 0;
+    auto record = mmapCall.replace([&](void* a, size_t l, int p, int f, int fd, off_t o) {
+        EXPECT_EQ(a, nullptr);
+        EXPECT_EQ(fd, -1);
+        EXPECT_EQ(o, 0);
+        length = l;
+        protection = p;
+        flags = f;
+        return mapping = mmapCall.real(a, l, p, f, fd, o);
+    });
+    void* memory = mem_alloc(1000);
+    EXPECT_EQ(length, 1000 + MEMORY_HEADER_SIZE);
+    EXPECT_EQ(protection, PROT_READ | PROT_WRITE);
+    EXPECT_EQ(flags, MAP_PRIVATE | MAP_ANONYMOUS);
+    EXPECT_EQ(blockOf(memory), mapping);
+    mem_free(memory);
+}
+
+TEST_F(MemoryPoolTest, HeaderIsTheContractsOnA32BitTarget) {
+    EXPECT_EQ(offsetof(MemoryBlock, size), 0u);
+    EXPECT_EQ(offsetof(MemoryBlock, reserved), 4u);
+    EXPECT_EQ(offsetof(MemoryBlock, next), 8u);
+    EXPECT_EQ(offsetof(MemoryBlock, prev), 8u + sizeof(void*));
+    EXPECT_EQ(MEMORY_HEADER_SIZE, sizeof(void*) == 4 ? 16u : 32u);
+}
+
+TEST_F(MemoryPoolTest, BlocksStandInTheOrderOfTheirAllocation) {
+    void* first = mem_alloc(1);
+    void* second = mem_alloc(2);
+    void* third = mem_alloc(3);
+    EXPECT_EQ(liveBlocks(),
+              (std::vector<MemoryBlock*>{blockOf(first), blockOf(second), blockOf(third)}));
+    mem_free(second);
+    EXPECT_EQ(liveBlocks(), (std::vector<MemoryBlock*>{blockOf(first), blockOf(third)}));
+    mem_free(third);
+    mem_free(first);
+}
+
+TEST_F(MemoryPoolTest, FreeingTheFirstOfTwoLeavesTheSecondLinkedBothWays) {
+    void* first = mem_alloc(10);
+    void* second = mem_alloc(20);
+    mem_free(first);
+    EXPECT_EQ(memorys.head.next, blockOf(second));
+    EXPECT_EQ(memorys.head.prev, blockOf(second));
+    EXPECT_EQ(blockOf(second)->next, &memorys.head);
+    EXPECT_EQ(blockOf(second)->prev, &memorys.head);
+    mem_free(second);
+}
+
+TEST_F(MemoryPoolTest, FreeGivesTheMappingBack) {
+    char* memory = static_cast<char*>(mem_alloc(10));
+    const uintptr_t page = reinterpret_cast<uintptr_t>(blockOf(memory));
+    mem_free(memory);
+    EXPECT_EQ(msync(reinterpret_cast<void*>(page), 1, MS_ASYNC), -1);
+    EXPECT_EQ(errno, ENOMEM);
+}
+
+TEST_F(MemoryPoolTest, SizeZeroIsAMappingOfTheHeaderAlone) {
+    size_t length = 0;
+    auto record = mmapCall.replace([&](void* a, size_t l, int p, int f, int fd, off_t o) {
+        length = l;
+        return mmapCall.real(a, l, p, f, fd, o);
+    });
+    void* memory = mem_alloc(0);
+    ASSERT_NE(memory, nullptr);
+    EXPECT_EQ(length, MEMORY_HEADER_SIZE);
+    EXPECT_EQ(reinterpret_cast<uintptr_t>(memory) % sysconf(_SC_PAGESIZE), MEMORY_HEADER_SIZE);
+    mem_free(memory);
+}
+
+TEST_F(MemoryPoolTest, NegativeSizeWraps) {
+    size_t length = 0;
+    auto record = mmapCall.replace([&](void*, size_t l, int, int, int, off_t) {
+        length = l;
+        errno = ENOMEM;
+        return MAP_FAILED;
+    });
+    CaptureStderr();
+    EXPECT_EQ(mem_alloc(-8), nullptr);
+    GetCapturedStderr();
+    EXPECT_EQ(length, MEMORY_HEADER_SIZE - 8);
+}
+
+TEST_F(MemoryPoolTest, FailedMappingIsReportedAndLeavesTheListAsItWas) {
+    void* kept = mem_alloc(10);
+    CaptureStderr();
+    {
+        auto failure = mmapCall.replace([](void*, size_t, int, int, int, off_t) {
+            errno = ENOMEM;
+            return MAP_FAILED;
+        });
+        EXPECT_EQ(mem_alloc(4096), nullptr);
+    }
+    EXPECT_EQ(GetCapturedStderr(), std::string("mmap failed \n: ") + strerror(ENOMEM) + "\n");
+    EXPECT_EQ(liveBlocks(), std::vector<MemoryBlock*>{blockOf(kept)});
+    EXPECT_EQ(semaphoreValue(), 1);
+    mem_free(kept);
+}
+
+TEST_F(MemoryPoolTest, ManyThreadsAllocateAndFree) {
+    std::vector<std::thread> threads;
+    for (int t = 0; t < 4; t++) {
+        threads.emplace_back([] {
+            for (int i = 0; i < 200; i++) {
+                void* first = mem_alloc(i);
+                void* second = mem_alloc(i);
+                mem_free(first);
+                mem_free(second);
+            }
+        });
+    }
+    for (std::thread& thread : threads) thread.join();
+}
+
+TEST(MemoryPoolSemaphoreTest, FreeingNullDoesNotTouchTheSemaphore) {
+    sem_init(&sem, 0, 0);
+    mem_free(nullptr);
+    EXPECT_EQ(semaphoreValue(), 0);
+}
+
+TEST(MemoryPoolSemaphoreTest, AllocationWaitsForTheSemaphore) {
+    sem_init(&sem, 0, 0);
+    std::atomic<bool> opened{false};
+    auto record = mmapCall.replace([&](void* a, size_t l, int p, int f, int fd, off_t o) {
+        EXPECT_TRUE(opened);
+        return mmapCall.real(a, l, p, f, fd, o);
+    });
+    auto memory = std::async(std::launch::async, [] { return mem_alloc(1); });
+    opened = true;
+    sem_post(&sem);
+    mem_free(memory.get());
+    EXPECT_EQ(semaphoreValue(), 1);
+    mem_uninit();
+}
+
+TEST(MemoryPoolSemaphoreTest, FailedInitialisationIsPrintedAndGivesTheLinesLength) {
+    auto failure = semInitCall.replace([](sem_t*, int, unsigned) {
+        errno = ENOSYS;
+        return -1;
+    });
+    CaptureStdout();
+    const int result = mem_init();
+    const std::string line = GetCapturedStdout();
+    EXPECT_EQ(line, "semaphore init error " + std::to_string(ENOSYS) + "\n");
+    EXPECT_EQ(result, static_cast<int>(line.size()));
+}
+
+}  // namespace
+}  // namespace orvtest

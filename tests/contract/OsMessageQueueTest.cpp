@@ -1,0 +1,81 @@
+// SPDX-License-Identifier: Apache-2.0
+#include <gtest/gtest.h>
+#include <os/MessageQueue.h>
+
+#include <atomic>
+#include <future>
+#include <thread>
+#include <vector>
+
+#include "PosixCalls.h"
+
+namespace orvtest {
+namespace {
+
+TEST(OsMessageQueueTest, KeepsTheOrderAndPostsOnlyWhenItStopsBeingEmpty) {
+    os::MessageQueue<int> queue;
+    const std::thread::id self = std::this_thread::get_id();
+    int posts = 0;
+    auto record = semPostCall.replace([&](sem_t* sem) {
+        if (std::this_thread::get_id() == self) posts++;
+        return semPostCall.real(sem);
+    });
+    for (int item : {1, 2, 3}) queue.send(item);
+    EXPECT_EQ(posts, 1);
+    for (int item : {1, 2, 3}) EXPECT_EQ(queue.recv(), item);
+    queue.send(4);
+    EXPECT_EQ(posts, 2);
+    EXPECT_EQ(queue.recv(), 4);
+}
+
+// Items found without waiting leave their wake-up behind: the receiver must
+// see through it and wait for a real item.
+TEST(OsMessageQueueTest, ReceiverBlocksUntilTheNextSendInSpiteOfStaleWakeUps) {
+    os::MessageQueue<int> queue;
+    for (int round = 0; round < 3; round++) {
+        queue.send(round);
+        EXPECT_EQ(queue.recv(), round);
+    }
+    std::atomic<bool> sent{false};
+    auto received = std::async(std::launch::async, [&] {
+        const int item = queue.recv();
+        EXPECT_TRUE(sent);
+        return item;
+    });
+    sent = true;
+    queue.send(99);
+    ASSERT_EQ(received.wait_for(std::chrono::seconds(10)), std::future_status::ready);
+    EXPECT_EQ(received.get(), 99);
+}
+
+TEST(OsMessageQueueTest, ManySendersLoseNothingAndKeepTheirOwnOrder) {
+    const int kSenders = 4;
+    const int kItems = 2000;
+    os::MessageQueue<int> queue;
+    std::vector<std::thread> senders;
+    for (int sender = 0; sender < kSenders; sender++) {
+        senders.emplace_back([&queue, sender] {
+            for (int i = 0; i < kItems; i++) queue.send(sender * kItems + i);
+        });
+    }
+    std::vector<int> next(kSenders, 0);
+    for (int i = 0; i < kSenders * kItems; i++) {
+        const int item = queue.recv();
+        EXPECT_EQ(item % kItems, next[item / kItems]++);
+    }
+    for (std::thread& sender : senders) sender.join();
+    EXPECT_EQ(next, std::vector<int>(kSenders, kItems));
+}
+
+TEST(OsMessageQueueTest, DropsWhatIsStillQueuedWithoutFreeingIt) {
+    int item = 7;
+    {
+        os::MessageQueue<int*> queue;
+        queue.send(&item);
+        queue.send(nullptr);
+    }
+    EXPECT_EQ(item, 7);
+}
+
+}  // namespace
+}  // namespace orvtest

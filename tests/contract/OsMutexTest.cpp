@@ -1,0 +1,96 @@
+// SPDX-License-Identifier: Apache-2.0
+#include <errno.h>
+#include <gtest/gtest.h>
+#include <os/Mutex.h>
+#include <os/ScopedMutex.h>
+
+#include <string>
+#include <thread>
+
+#include "PrivateMember.h"
+
+namespace orvtest {
+
+struct NativeMutex {
+    friend auto memberOf(NativeMutex);
+};
+template struct PrivateMember<NativeMutex, &os::Mutex::mMutex>;
+
+namespace {
+
+// 0 when another thread could take the mutex at this moment, else EBUSY.
+int tryFromAnotherThread(os::Mutex& mutex) {
+    int result = -1;
+    std::thread([&] {
+        pthread_mutex_t* native = &(mutex.*memberOf(NativeMutex{}));
+        result = pthread_mutex_trylock(native);
+        if (result == 0) pthread_mutex_unlock(native);
+    }).join();
+    return result;
+}
+
+TEST(OsMutexTest, IsFreeOnlyAfterItsOwnerUnlockedItAsOftenAsItLockedIt) {
+    os::Mutex mutex;
+    EXPECT_EQ(mutex.lock(), 0);
+    EXPECT_EQ(mutex.lock(), 0);
+    EXPECT_EQ(tryFromAnotherThread(mutex), EBUSY);
+    EXPECT_EQ(mutex.unlock(), 0);
+    EXPECT_EQ(tryFromAnotherThread(mutex), EBUSY);
+    EXPECT_EQ(mutex.unlock(), 0);
+    EXPECT_EQ(tryFromAnotherThread(mutex), 0);
+}
+
+TEST(OsMutexTest, UnlockByAnotherThreadGivesThePosixError) {
+    os::Mutex mutex;
+    mutex.lock();
+    int result = 0;
+    std::thread([&] { result = mutex.unlock(); }).join();
+    EXPECT_EQ(result, EPERM);
+    EXPECT_EQ(tryFromAnotherThread(mutex), EBUSY);
+    mutex.unlock();
+}
+
+TEST(OsMutexTest, IsALockThroughItsInterface) {
+    os::Mutex mutex;
+    os::Lock& lock = mutex;
+    EXPECT_EQ(lock.lock(), 0);
+    EXPECT_EQ(tryFromAnotherThread(mutex), EBUSY);
+    EXPECT_EQ(lock.unlock(), 0);
+    EXPECT_EQ(tryFromAnotherThread(mutex), 0);
+}
+
+// Refuses both, to show that a scope guard looks at neither result.
+class RefusingLock : public os::Lock {
+public:
+    int lock() override {
+        calls += "lock ";
+        return EINVAL;
+    }
+    int unlock() override {
+        calls += "unlock ";
+        return EINVAL;
+    }
+    std::string calls;
+};
+
+TEST(ScopedMutexTest, LocksOnceAndUnlocksAtTheEndOfTheScope) {
+    RefusingLock lock;
+    {
+        os::ScopedMutex scope(lock);
+        EXPECT_EQ(lock.calls, "lock ");
+    }
+    EXPECT_EQ(lock.calls, "lock unlock ");
+}
+
+TEST(ScopedMutexTest, NestsOnOneThread) {
+    os::Mutex mutex;
+    {
+        os::ScopedMutex outer(mutex);
+        { os::ScopedMutex inner(mutex); }
+        EXPECT_EQ(tryFromAnotherThread(mutex), EBUSY);
+    }
+    EXPECT_EQ(tryFromAnotherThread(mutex), 0);
+}
+
+}  // namespace
+}  // namespace orvtest

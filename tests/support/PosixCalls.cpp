@@ -1,0 +1,57 @@
+// SPDX-License-Identifier: Apache-2.0
+#include "PosixCalls.h"
+
+// The linker sends the program's calls to the wrappers and resolves the real
+// names here.
+extern "C" {
+int __real_sem_init(sem_t*, int, unsigned);
+int __real_sem_post(sem_t*);
+int __real_sem_timedwait(sem_t*, const timespec*);
+int __real_nanosleep(const timespec*, timespec*);
+int __real_sigaction(int, const struct sigaction*, struct sigaction*);
+int __real_pthread_attr_init(pthread_attr_t*);
+int __real_pthread_create(pthread_t*, const pthread_attr_t*, void* (*)(void*), void*);
+void* __real_mmap(void*, size_t, int, int, int, off_t);
+}
+
+namespace orvtest {
+
+PosixCall<int(sem_t*, int, unsigned)> semInitCall(__real_sem_init);
+PosixCall<int(sem_t*)> semPostCall(__real_sem_post);
+PosixCall<int(sem_t*, const timespec*)> semTimedwaitCall(__real_sem_timedwait);
+PosixCall<int(const timespec*, timespec*)> nanosleepCall(__real_nanosleep);
+PosixCall<int(int, const struct sigaction*, struct sigaction*)> sigactionCall(__real_sigaction);
+PosixCall<int(pthread_attr_t*)> pthreadAttrInitCall(__real_pthread_attr_init);
+PosixCall<int(pthread_t*, const pthread_attr_t*, void* (*)(void*), void*)> pthreadCreateCall(
+    __real_pthread_create);
+PosixCall<void*(void*, size_t, int, int, int, off_t)> mmapCall(__real_mmap);
+
+}  // namespace orvtest
+
+extern "C" {
+
+int __wrap_sem_init(sem_t* sem, int shared, unsigned value) {
+    return orvtest::semInitCall(sem, shared, value);
+}
+int __wrap_sem_post(sem_t* sem) { return orvtest::semPostCall(sem); }
+int __wrap_sem_timedwait(sem_t* sem, const timespec* deadline) {
+    return orvtest::semTimedwaitCall(sem, deadline);
+}
+int __wrap_nanosleep(const timespec* duration, timespec* rest) {
+    return orvtest::nanosleepCall(duration, rest);
+}
+int __wrap_sigaction(int signal, const struct sigaction* action, struct sigaction* previous) {
+    return orvtest::sigactionCall(signal, action, previous);
+}
+int __wrap_pthread_attr_init(pthread_attr_t* attributes) {
+    return orvtest::pthreadAttrInitCall(attributes);
+}
+int __wrap_pthread_create(pthread_t* thread, const pthread_attr_t* attributes,
+                          void* (*entry)(void*), void* argument) {
+    return orvtest::pthreadCreateCall(thread, attributes, entry, argument);
+}
+void* __wrap_mmap(void* address, size_t length, int protection, int flags, int fd, off_t offset) {
+    return orvtest::mmapCall(address, length, protection, flags, fd, offset);
+}
+
+}  // extern "C"
