@@ -47,6 +47,7 @@ enum Glyph {
             }),
     FULL_SCREEN(g -> g.draw(corners(4, 9))),
     WINDOWED(g -> g.draw(corners(9, 4))),
+    CHECK(g -> g.draw(lines(5, 13, 10, 18, 10, 18, 20, 7))),
     ALERT(
             g -> {
                 g.draw(new Arc2D.Double(2.5, 2.5, 19, 19, 0, 360, Arc2D.OPEN));

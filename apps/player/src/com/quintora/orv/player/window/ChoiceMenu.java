@@ -1,0 +1,70 @@
+// SPDX-License-Identifier: Apache-2.0
+package com.quintora.orv.player.window;
+
+import java.awt.Component;
+import java.awt.Dimension;
+import java.awt.Graphics;
+import java.util.List;
+import javax.swing.BorderFactory;
+import javax.swing.JLabel;
+import javax.swing.JMenuItem;
+import javax.swing.JPopupMenu;
+
+/** A list of choices that opens above a button, with a tick at the present one. */
+final class ChoiceMenu {
+    /** A choice: what it says, whether it holds now, what it does. */
+    record Choice(String text, boolean chosen, Runnable action) {}
+
+    private static final int TICK = 16;
+
+    private ChoiceMenu() {}
+
+    static void open(Component above, String title, List<Choice> choices) {
+        JPopupMenu menu = new JPopupMenu(title);
+        menu.setBackground(Theme.RAISED);
+        menu.setBorder(BorderFactory.createEmptyBorder(6, 0, 6, 0));
+        JLabel heading = new JLabel(title);
+        heading.setFont(Theme.SMALL);
+        heading.setForeground(Theme.MUTED);
+        heading.setBorder(BorderFactory.createEmptyBorder(4, 14, 6, 14));
+        menu.add(heading);
+        choices.forEach(choice -> menu.add(new Item(choice)));
+        Dimension size = menu.getPreferredSize();
+        menu.show(above, above.getWidth() - size.width, -size.height - Theme.GAP);
+    }
+
+    private static final class Item extends JMenuItem {
+        private final Choice choice;
+
+        Item(Choice choice) {
+            super(choice.text);
+            this.choice = choice;
+            setFont(Theme.BODY);
+            addActionListener(event -> choice.action.run());
+        }
+
+        @Override
+        public Dimension getPreferredSize() {
+            int text = getFontMetrics(getFont()).stringWidth(getText());
+            return new Dimension(Math.max(200, text + 14 + TICK + 10 + 18), 30);
+        }
+
+        @Override
+        protected void paintComponent(Graphics graphics) {
+            var g = Theme.smooth(graphics);
+            g.setColor(isArmed() ? Theme.HOVER : Theme.RAISED);
+            g.fillRect(0, 0, getWidth(), getHeight());
+            if (choice.chosen) {
+                Glyph.CHECK.paint(g, 14, (getHeight() - TICK) / 2.0, TICK, Theme.ACCENT);
+            }
+            g.setFont(getFont());
+            g.setColor(Theme.TEXT);
+            var metrics = g.getFontMetrics();
+            g.drawString(
+                    getText(),
+                    14 + TICK + 10,
+                    (getHeight() - metrics.getHeight()) / 2 + metrics.getAscent());
+            g.dispose();
+        }
+    }
+}

@@ -1,0 +1,130 @@
+// SPDX-License-Identifier: Apache-2.0
+package com.quintora.orv.player.window;
+
+import com.quintora.orv.player.Snapshot;
+import com.quintora.orv.player.Times;
+import java.awt.BorderLayout;
+import java.awt.Component;
+import javax.swing.BorderFactory;
+import javax.swing.Box;
+import javax.swing.JLabel;
+import javax.swing.JPanel;
+
+/** The row of controls under the picture. */
+final class ControlBar extends JPanel {
+    private static final int SKIP_MS = 10_000;
+
+    private final JLabel elapsed = label();
+    private final JLabel total = label();
+    private final SeekBar seekBar;
+    private final FlatButton play;
+    private final FlatButton mute;
+    private final LevelBar volume;
+    private final FlatButton speed;
+    private final FlatButton audio;
+    private final FlatButton subtitles;
+    private final FlatButton fullScreen;
+
+    ControlBar(Controls controls) {
+        super(new BorderLayout(0, 4));
+        seekBar = new SeekBar(controls::seekTo);
+        play = new FlatButton(Glyph.PLAY, "Play (Space)", controls::togglePlaying);
+        mute = new FlatButton(Glyph.VOLUME, "Mute (M)", controls::toggleMuted);
+        volume = new LevelBar("Volume", 90, controls::setVolume);
+        speed = new FlatButton(null, "Speed", () -> controls.chooseSpeed(speedButton()));
+        audio = new FlatButton(Glyph.AUDIO, "Sound track (A)", () -> controls.chooseAudio(audioButton()));
+        subtitles =
+                new FlatButton(
+                        Glyph.SUBTITLES,
+                        "Subtitles (S)",
+                        () -> controls.chooseSubtitles(subtitlesButton()));
+        fullScreen =
+                new FlatButton(
+                        Glyph.FULL_SCREEN, "Full screen (F)", controls::toggleFullScreen);
+        setBackground(Theme.PANEL);
+        setBorder(BorderFactory.createEmptyBorder(8, 14, 10, 14));
+        add(timeRow(), BorderLayout.NORTH);
+        add(buttonRow(controls), BorderLayout.CENTER);
+    }
+
+    Component audioButton() {
+        return audio;
+    }
+
+    Component subtitlesButton() {
+        return subtitles;
+    }
+
+    Component speedButton() {
+        return speed;
+    }
+
+    SeekBar seekBar() {
+        return seekBar;
+    }
+
+    void show(Snapshot now) {
+        elapsed.setText(Times.clock(now.positionMs()));
+        total.setText(Times.clock(now.durationMs()));
+        seekBar.showPosition(now.positionMs(), now.durationMs(), now.bufferedPercent());
+        play.show(
+                now.playing() ? Glyph.PAUSE : Glyph.PLAY,
+                now.playing() ? "Pause (Space)" : "Play (Space)");
+        speed.setText(Speeds.label(now.speed()));
+    }
+
+    void showVolume(double level, boolean muted) {
+        volume.showLevel(muted ? 0 : level, 0);
+        mute.show(
+                muted || level == 0 ? Glyph.MUTED : Glyph.VOLUME,
+                muted ? "Sound on (M)" : "Mute (M)");
+    }
+
+    void showTracks(int audioTracks, int subtitleTracks) {
+        audio.setEnabled(audioTracks > 0);
+        subtitles.setEnabled(subtitleTracks > 0);
+    }
+
+    void showFullScreen(boolean on) {
+        fullScreen.show(
+                on ? Glyph.WINDOWED : Glyph.FULL_SCREEN,
+                on ? "Leave full screen (F)" : "Full screen (F)");
+    }
+
+    private JPanel timeRow() {
+        JPanel row = new JPanel(new BorderLayout(Theme.GAP, 0));
+        row.setOpaque(false);
+        row.add(elapsed, BorderLayout.WEST);
+        row.add(seekBar, BorderLayout.CENTER);
+        row.add(total, BorderLayout.EAST);
+        return row;
+    }
+
+    private Component buttonRow(Controls controls) {
+        Box row = Box.createHorizontalBox();
+        row.add(play);
+        row.add(
+                new FlatButton(
+                        Glyph.BACK, "Back 10 seconds (Left)", () -> controls.skip(-SKIP_MS)));
+        row.add(
+                new FlatButton(
+                        Glyph.FORWARD, "On 10 seconds (Right)", () -> controls.skip(SKIP_MS)));
+        row.add(Box.createHorizontalStrut(Theme.GAP));
+        row.add(mute);
+        volume.setMaximumSize(volume.getPreferredSize());
+        row.add(volume);
+        row.add(Box.createHorizontalGlue());
+        row.add(speed);
+        row.add(audio);
+        row.add(subtitles);
+        row.add(fullScreen);
+        return row;
+    }
+
+    private static JLabel label() {
+        JLabel label = new JLabel("0:00");
+        label.setFont(Theme.SMALL);
+        label.setForeground(Theme.MUTED);
+        return label;
+    }
+}
