@@ -20,18 +20,14 @@ bool writeLengthAt(Parcel* parcel, size_t begin) {
     return written;
 }
 
-// One record: the length word is known once the value is written. A record
-// that fails half-way leaves no trace.
+// One record: the length word is known once the value is written.
 template <typename WriteValue>
 bool appendRecord(Parcel* parcel, Metadata::Type key, Metadata::ValueType type,
                   const WriteValue& writeValue) {
     const size_t begin = parcel->dataPosition();
-    if (parcel->writeInt32(0) == NO_ERROR && parcel->writeInt32(key) == NO_ERROR &&
-        parcel->writeInt32(type) == NO_ERROR && writeValue() == NO_ERROR) {
-        return writeLengthAt(parcel, begin);
-    }
-    parcel->setDataSize(begin);
-    return false;
+    return parcel->writeInt32(0) == NO_ERROR && parcel->writeInt32(key) == NO_ERROR &&
+           parcel->writeInt32(type) == NO_ERROR && writeValue() == NO_ERROR &&
+           writeLengthAt(parcel, begin);
 }
 
 }  // namespace

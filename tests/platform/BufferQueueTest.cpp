@@ -1,7 +1,10 @@
 // SPDX-License-Identifier: Apache-2.0
 #include <gtest/gtest.h>
 
+#include <atomic>
+#include <chrono>
 #include <cstring>
+#include <future>
 #include <thread>
 
 #include "BufferQueue.h"
@@ -11,7 +14,9 @@ namespace {
 
 using PixelBuffer = IGraphicBufferProducer::PixelBuffer;
 
+// A wait that nothing ends is longer than what a test waits for its end.
 constexpr int kLongWaitMs = 20000;
+constexpr std::chrono::seconds kShortWait{10};
 
 class BufferQueueTest : public testing::Test {
 protected:
@@ -207,20 +212,23 @@ TEST_F(BufferQueueTest, WaitingReturnsAtOnceForAnUnseenFrameAndAfterTheTimeForNo
     EXPECT_EQ(mQueue->awaitFrame(1, 1), 1u);
 }
 
-TEST_F(BufferQueueTest, AFrameWakesAWaitingConsumer) {
-    uint64_t seen = 0;
-    std::thread consumer([&] { seen = mQueue->awaitFrame(0, kLongWaitMs); });
-    produce(1);
-    consumer.join();
-    EXPECT_EQ(seen, 1u);
-}
-
-TEST_F(BufferQueueTest, AbandoningWakesAWaitingConsumer) {
-    uint64_t seen = 1;
-    std::thread consumer([&] { seen = mQueue->awaitFrame(0, kLongWaitMs); });
+// Many rounds: in some the consumer is asleep when the event comes.
+TEST_F(BufferQueueTest, FramesAndAbandoningWakeAWaitingConsumer) {
+    constexpr uint64_t kRounds = 200;
+    std::atomic<uint64_t> seen{0};
+    std::future<void> consumer = std::async(std::launch::async, [&] {
+        while (!mQueue->isAbandoned()) seen = mQueue->awaitFrame(seen, kLongWaitMs);
+    });
+    for (uint64_t round = 1; round <= kRounds; ++round) {
+        produce(1);
+        const auto deadline = std::chrono::steady_clock::now() + kShortWait;
+        while (seen != round && std::chrono::steady_clock::now() < deadline) {
+            std::this_thread::yield();
+        }
+        ASSERT_EQ(seen, round);
+    }
     mQueue->abandon();
-    consumer.join();
-    EXPECT_EQ(seen, 0u);
+    ASSERT_EQ(consumer.wait_for(kShortWait), std::future_status::ready);
 }
 
 TEST_F(BufferQueueTest, AFastProducerNeverTearsASlowConsumersFrame) {

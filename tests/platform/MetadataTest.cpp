@@ -78,7 +78,7 @@ TEST(MetadataTest, ResetDropsWhatWasAppendedAndNothingBefore) {
     EXPECT_THAT(wordsOf(parcel), ElementsAre(-1));
 }
 
-TEST(MetadataTest, AParcelThatRefusesGetsNoHalfRecord) {
+TEST(MetadataTest, AParcelThatRefusesIsReported) {
     Parcel parcel;
     parcel.setDataPosition(SIZE_MAX / 2);
     Metadata metadata(&parcel);
