@@ -1,0 +1,104 @@
+// SPDX-License-Identifier: Apache-2.0
+package com.quintora.mmp;
+
+import java.io.IOException;
+import java.nio.file.Files;
+import java.nio.file.InvalidPathException;
+import java.nio.file.Path;
+import java.util.regex.Matcher;
+import java.util.regex.Pattern;
+
+/** Turns what the native half throws into sentences that name the cause. */
+final class Failures {
+    // How the native half ends a message: "Prepare failed.: status=0xFFFFFC14".
+    private static final Pattern STATUS = Pattern.compile("status=0x([0-9A-F]{1,8})$");
+
+    private Failures() {}
+
+    /**
+     * The failure of a source.
+     *
+     * @param source a path, a URL or words for another source
+     * @param root what the source itself threw, or null
+     */
+    static MediaException explain(String source, Exception thrown, Throwable root) {
+        int status = status(thrown);
+        if (root == null) {
+            return new MediaException(source + ": " + sentence(source, status), status, thrown);
+        }
+        MediaException told = new MediaException(
+                source + ": the source failed: " + root, MediaException.STATUS_IO, root);
+        told.addSuppressed(thrown);
+        return told;
+    }
+
+    /** A refusal for want of permission. */
+    static SecurityException denied(String source, SecurityException thrown) {
+        return new SecurityException(source + ": permission denied", thrown);
+    }
+
+    /** A refusal by the engine in its present state, for calls that have no other failure. */
+    static IllegalStateException refused(String call, Exception thrown) {
+        String why = thrown.getMessage() == null ? "" : ": " + thrown.getMessage();
+        return new IllegalStateException("the engine refused " + call + why, thrown);
+    }
+
+    static int status(Exception thrown) {
+        if (thrown.getMessage() == null) {
+            return MediaException.STATUS_UNKNOWN;
+        }
+        Matcher matcher = STATUS.matcher(thrown.getMessage());
+        return matcher.find()
+                ? Integer.parseUnsignedInt(matcher.group(1), 16)
+                : MediaException.STATUS_UNKNOWN;
+    }
+
+    private static String sentence(String source, int status) {
+        return switch (status) {
+            case MediaException.STATUS_NOT_FOUND -> "no such file";
+            case MediaException.STATUS_BAD_VALUE -> badValue(source);
+            case MediaException.STATUS_IO -> isUrl(source)
+                    ? "the server refused the connection, does not answer or has no such media"
+                    : "cannot be opened or read";
+            case MediaException.STATUS_MALFORMED -> malformed(source);
+            case MediaException.STATUS_UNSUPPORTED -> "has no track that can be played";
+            case MediaException.STATUS_TIMED_OUT -> "was not ready in time";
+            case MediaException.STATUS_UNKNOWN -> "the engine failed";
+            default -> "the engine failed with status " + status;
+        };
+    }
+
+    private static String badValue(String source) {
+        Path path = localPath(source);
+        if (source.isEmpty()) {
+            return "the path is empty";
+        }
+        return path != null && Files.isDirectory(path)
+                ? "is a directory"
+                : "is not open, or a value is out of range";
+    }
+
+    private static String malformed(String source) {
+        Path path = localPath(source);
+        try {
+            if (path != null && Files.isRegularFile(path) && Files.size(path) == 0) {
+                return "the file is empty";
+            }
+        } catch (IOException e) {
+            return "cannot be read";
+        }
+        return "is no media format that is known";
+    }
+
+    private static boolean isUrl(String source) {
+        return source.contains("://");
+    }
+
+    private static Path localPath(String source) {
+        try {
+            return isUrl(source) ? null : Path.of(source);
+        } catch (InvalidPathException e) {
+            return null;
+        }
+    }
+}

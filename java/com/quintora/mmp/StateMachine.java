@@ -1,0 +1,78 @@
+// SPDX-License-Identifier: Apache-2.0
+package com.quintora.mmp;
+
+import java.util.EnumSet;
+import java.util.Set;
+
+/**
+ * A player's state. Each data source begins an epoch: what was begun in one epoch must not act in a
+ * later one, so every move names the epoch that it belongs to. Thread-safe.
+ */
+final class StateMachine {
+    static final Set<PlayerState> WITH_MEDIA = EnumSet.of(
+            PlayerState.PREPARED, PlayerState.STARTED, PlayerState.PAUSED, PlayerState.COMPLETED);
+
+    private PlayerState state = PlayerState.IDLE;
+    private int epoch;
+
+    synchronized PlayerState state() {
+        return state;
+    }
+
+    synchronized int epoch() {
+        return epoch;
+    }
+
+    synchronized boolean isCurrent(int epoch) {
+        return this.epoch == epoch;
+    }
+
+    /** Moves if the epoch still runs and the state is one of those; tells whether it did. */
+    synchronized boolean move(int epoch, Set<PlayerState> from, PlayerState to) {
+        if (this.epoch != epoch || !from.contains(state)) {
+            return false;
+        }
+        state = to;
+        return true;
+    }
+
+    /** Ends the epoch, whatever the state; tells which state it was. */
+    synchronized PlayerState endEpoch(PlayerState to) {
+        PlayerState was = state;
+        if (was != PlayerState.RELEASED) {
+            epoch++;
+            state = to;
+        }
+        return was;
+    }
+
+    /** The running epoch, or an exception when the state is none of those. */
+    synchronized int require(String call, Set<PlayerState> allowed) {
+        if (!allowed.contains(state)) {
+            throw new IllegalStateException(refusal(call, allowed));
+        }
+        return epoch;
+    }
+
+    /** As require, and moves on. */
+    synchronized int enter(String call, Set<PlayerState> allowed, PlayerState to) {
+        require(call, allowed);
+        state = to;
+        return epoch;
+    }
+
+    /** An exception once the player is released. */
+    synchronized int requireAlive(String call) {
+        if (state == PlayerState.RELEASED) {
+            throw new IllegalStateException(refusal(call, Set.of()));
+        }
+        return epoch;
+    }
+
+    private String refusal(String call, Set<PlayerState> allowed) {
+        if (state == PlayerState.RELEASED) {
+            return call + " was called after the player was released";
+        }
+        return call + " was called in the state " + state + "; it is for " + allowed;
+    }
+}
