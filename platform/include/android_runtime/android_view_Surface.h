@@ -2,7 +2,7 @@
 #pragma once
 
 #include <jni.h>
-#include <utils/StrongPointer.h>
+#include <utils/RefBase.h>
 
 namespace android {
 

@@ -3,7 +3,6 @@
 
 #include <gui/IGraphicBufferProducer.h>
 #include <utils/RefBase.h>
-#include <utils/StrongPointer.h>
 
 namespace android {
 

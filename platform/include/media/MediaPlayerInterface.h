@@ -6,7 +6,6 @@
 #include <utils/Mutex.h>
 #include <utils/RefBase.h>
 #include <utils/SortedVector.h>
-#include <utils/StrongPointer.h>
 
 namespace android {
 
