@@ -6,6 +6,8 @@
 
 #include <new>
 
+#include "LibavValues.h"
+
 extern "C" {
 #include <libavformat/avformat.h>
 }
@@ -15,8 +17,7 @@ namespace {
 
 // The demuxers name an embedded picture's purpose in this tag.
 bool isFrontCover(const AVStream& stream) {
-    const AVDictionaryEntry* purpose = av_dict_get(stream.metadata, "comment", nullptr, 0);
-    return purpose != nullptr && strcmp(purpose->value, "Cover (front)") == 0;
+    return strcmp(tagOf(stream.metadata, "comment"), "Cover (front)") == 0;
 }
 
 const AVPacket* coverOf(const AVFormatContext& media) {

@@ -2,11 +2,13 @@
 #include "ContainerInfo.h"
 
 #include <ctype.h>
+#include <string.h>
 
 #include <algorithm>
 #include <cstdlib>
 #include <initializer_list>
 
+#include "LibavValues.h"
 #include "RecordText.h"
 
 extern "C" {
@@ -16,17 +18,8 @@ extern "C" {
 namespace orvtarn {
 namespace {
 
-int32_t toInt32(int64_t value) {
-    return static_cast<int32_t>(std::clamp<int64_t>(value, INT32_MIN, INT32_MAX));
-}
-
 int32_t toMilliseconds(int64_t time, AVRational base) {
     return toInt32(av_rescale_q(time, base, {1, 1000}));
-}
-
-const char* tagIn(const AVDictionary* tags, const char* name) {
-    const AVDictionaryEntry* entry = av_dict_get(tags, name, nullptr, 0);
-    return entry == nullptr || entry->value[0] == '\0' ? nullptr : entry->value;
 }
 
 bool isMedia(const AVStream& stream) {
@@ -35,45 +28,45 @@ bool isMedia(const AVStream& stream) {
            (stream.disposition & AV_DISPOSITION_ATTACHED_PIC) == 0;
 }
 
-// The first of the names that the container has, or one of its streams.
-const char* tag(const AVFormatContext& media, std::initializer_list<const char*> names) {
+const char* firstTag(const AVDictionary* tags, std::initializer_list<const char*> names) {
     for (const char* name : names) {
-        if (const char* value = tagIn(media.metadata, name)) return value;
+        const char* value = tagOf(tags, name);
+        if (*value != '\0') return value;
     }
-    // Where a container has tags, those of its streams are about the tracks.
-    if (media.metadata != nullptr) return nullptr;
+    return "";
+}
+
+// The first of the names that has a value. Where a container has tags, those of
+// its streams are about the tracks.
+const char* tag(const AVFormatContext& media, std::initializer_list<const char*> names) {
+    if (media.metadata != nullptr) return firstTag(media.metadata, names);
     for (unsigned i = 0; i < media.nb_streams; i++) {
         if (!isMedia(*media.streams[i])) continue;
-        for (const char* name : names) {
-            if (const char* value = tagIn(media.streams[i]->metadata, name)) return value;
-        }
+        const char* value = firstTag(media.streams[i]->metadata, names);
+        if (*value != '\0') return value;
     }
-    return nullptr;
+    return "";
 }
 
 // The number that the text begins with, at least 0.
 int32_t leadingNumber(const char* text) {
-    return text == nullptr ? 0 : toInt32(std::max(0LL, strtoll(text, nullptr, 10)));
+    return toInt32(std::max(0LL, strtoll(text, nullptr, 10)));
 }
 
 // The second number of "3/12".
 int32_t numberBehindSlash(const char* text) {
-    const char* slash = text == nullptr ? nullptr : strchr(text, '/');
+    const char* slash = strchr(text, '/');
     return slash == nullptr ? 0 : leadingNumber(slash + 1);
 }
 
 // The first four digits in a row, as in "2021", "2021-03-04" and "4.3.2021".
 int32_t yearOf(const char* date) {
     int digits = 0;
-    for (const char* at = date; at != nullptr && *at != '\0'; at++) {
+    for (const char* at = date; *at != '\0'; at++) {
         digits = isdigit(static_cast<unsigned char>(*at)) ? digits + 1 : 0;
         if (digits == 4) return static_cast<int32_t>(strtol(at - 3, nullptr, 10));
     }
     return 0;
-}
-
-void setWideTag(OrvWideText& text, const char* value) {
-    setWideText(text, value == nullptr ? "" : value);
 }
 
 void setNumbers(const AVFormatContext& media, MetaDataInfo& info) {
@@ -95,13 +88,13 @@ MetaDataInfo metaDataInfo(const MediaFile& file) {
     const AVFormatContext& media = *file.context();
     MetaDataInfo info;
     setNumbers(media, info);
-    setWideTag(info.mTitle, tag(media, {"title"}));
-    setWideTag(info.mArtist, tag(media, {"artist", "album_artist"}));
-    setWideTag(info.mAlbum, tag(media, {"album"}));
-    setWideTag(info.mGenre, tag(media, {"genre"}));
-    setWideTag(info.mComposer, tag(media, {"composer"}));
-    setWideTag(info.mComment, tag(media, {"comment", "description"}));
-    setWideTag(info.mContainer, media.iformat->long_name);
+    setWideText(info.mTitle, tag(media, {"title"}));
+    setWideText(info.mArtist, tag(media, {"artist", "album_artist"}));
+    setWideText(info.mAlbum, tag(media, {"album"}));
+    setWideText(info.mGenre, tag(media, {"genre"}));
+    setWideText(info.mComposer, tag(media, {"composer"}));
+    setWideText(info.mComment, tag(media, {"comment", "description"}));
+    setWideText(info.mContainer, media.iformat->long_name);
     info.mChapterCount = chapterCount(file);
     return info;
 }
@@ -115,8 +108,7 @@ bool chapterRecord(const MediaFile& file, int chapter, SubtitleTrackInfo& info) 
     info.mCodec = ORV_CHAPTER_CODEC;
     info.mTrackId = toMilliseconds(mark.start, mark.time_base);
     info.mFlags = mark.end == AV_NOPTS_VALUE ? -1 : toMilliseconds(mark.end, mark.time_base);
-    const char* title = tagIn(mark.metadata, "title");
-    setText(info.mText, title == nullptr ? "" : title);
+    setText(info.mText, tagOf(mark.metadata, "title"));
     return true;
 }
 

@@ -9,6 +9,7 @@
 #include <string>
 
 #include "CodecFourCC.h"
+#include "LibavValues.h"
 #include "RecordText.h"
 
 extern "C" {
@@ -18,10 +19,6 @@ extern "C" {
 
 namespace orvtarn {
 namespace {
-
-int32_t toInt32(int64_t value) {
-    return static_cast<int32_t>(std::clamp<int64_t>(value, INT32_MIN, INT32_MAX));
-}
 
 // Reads one entry of the track list. Members that are missing or of another
 // type read as the empty value.
@@ -134,21 +131,14 @@ const AVStream* streamOf(const MediaFile& file, int index, AVMediaType type) {
     return stream != nullptr && stream->codecpar->codec_type == type ? stream : nullptr;
 }
 
-const char* tagOf(const AVStream& stream, const char* name) {
-    const AVDictionaryEntry* entry = av_dict_get(stream.metadata, name, nullptr, 0);
-    return entry == nullptr ? "" : entry->value;
-}
-
 // Matroska keeps the bit rate in a statistics tag.
 int32_t bitRateOf(const AVStream& stream) {
     if (stream.codecpar->bit_rate > 0) return toInt32(stream.codecpar->bit_rate);
-    return toInt32(std::max(0LL, strtoll(tagOf(stream, "BPS"), nullptr, 10)));
+    return toInt32(std::max(0LL, strtoll(tagOf(stream.metadata, "BPS"), nullptr, 10)));
 }
 
-// Only codecs that keep every bit have a sample width.
+// 0 for codecs that have no samples of a fixed width.
 int32_t sampleBits(const AVCodecParameters& codec) {
-    const AVCodecDescriptor* description = avcodec_descriptor_get(codec.codec_id);
-    if (description == nullptr || (description->props & AV_CODEC_PROP_LOSSLESS) == 0) return 0;
     if (codec.bits_per_raw_sample > 0) return codec.bits_per_raw_sample;
     return av_get_exact_bits_per_sample(codec.codec_id);
 }
@@ -192,9 +182,9 @@ void addAudioTexts(const MediaFile& file, Track<AudioTrackInfo>& track) {
     const char* profile = avcodec_profile_name(codec.codec_id, codec.profile);
     setWideText(track.record.mProfile, profile == nullptr ? "" : profile);
     setChannelLayout(track.record.mChannelLayout, codec.ch_layout);
-    setWideText(track.record.mComment, tagOf(*stream, "comment"));
-    setWideText(track.record.mEncoder, tagOf(*stream, "encoder"));
-    setWideText(track.record.mHandler, tagOf(*stream, "handler_name"));
+    setWideText(track.record.mComment, tagOf(stream->metadata, "comment"));
+    setWideText(track.record.mEncoder, tagOf(stream->metadata, "encoder"));
+    setWideText(track.record.mHandler, tagOf(stream->metadata, "handler_name"));
 }
 
 }  // namespace orvtarn
