@@ -1,0 +1,193 @@
+#!/bin/bash
+# SPDX-License-Identifier: Apache-2.0
+#
+# Makes the media of the tests: make-media.sh FOLDER [FILE...]
+#
+# Without names, all of them. A file that is there already is kept. Each file
+# has a function of its own; it appears whole or not at all, so that several
+# tests may ask for the same file at the same time.
+set -eu
+
+FILES="video.mp4 video.mkv video.ts video.avi slides.mkv rotated.mp4 hd.mp4 hd709.mp4 odd.mkv
+       alpha.mov still.png silent.mkv tracks.mkv tracks.mp4 tagged.mp3 tagged.ogg broken-tags.mp4
+       cover.jpg back.png covered.mp3 covered.flac covered.m4a covered.mkv garbage.bin
+       truncated.mp4 truncated.mkv"
+
+quiet_ffmpeg() { ffmpeg -nostdin -v error -y "$@"; }
+
+# A moving picture whose frames all differ: size, seconds.
+moving() { echo "testsrc2=size=$1:rate=25:duration=$2"; }
+
+# H.264 with a key frame every two seconds.
+h264() { echo "-c:v libx264 -preset veryfast -crf 16 -g 50 -keyint_min 50 -sc_threshold 0 -pix_fmt yuv420p"; }
+
+moving_with_sound() {
+    # shellcheck disable=SC2046
+    quiet_ffmpeg -f lavfi -i "$(moving 320x180 10)" -f lavfi -i "sine=440:duration=10" \
+        $(h264) -c:a "$1" -ac 2 -ar 48000 "$2"
+}
+
+make_video_mp4() { moving_with_sound aac "$1"; }
+make_video_mkv() { moving_with_sound libvorbis "$1"; }
+make_video_ts() { moving_with_sound mp2 "$1"; }
+
+make_video_avi() {
+    quiet_ffmpeg -f lavfi -i "$(moving 320x180 5)" -c:v mpeg4 -q:v 2 -g 50 "$1"
+}
+
+# One picture a second.
+make_slides_mkv() {
+    # shellcheck disable=SC2046
+    quiet_ffmpeg -f lavfi -i "testsrc2=size=320x180:rate=1:duration=8" $(h264) "$1"
+}
+
+# Stored lying, to be shown upright.
+make_rotated_mp4() {
+    need video.mp4
+    quiet_ffmpeg -i "$folder/video.mp4" -c copy -an -metadata:s:v:0 rotate=90 "$1"
+}
+
+# Without a word about its colours, and with.
+make_hd_mp4() {
+    # shellcheck disable=SC2046
+    quiet_ffmpeg -f lavfi -i "$(moving 1280x720 1),scale=out_color_matrix=bt709" $(h264) "$1"
+}
+
+make_hd709_mp4() {
+    # shellcheck disable=SC2046
+    quiet_ffmpeg -f lavfi -i "$(moving 1280x720 1),scale=out_color_matrix=bt709" $(h264) \
+        -colorspace bt709 -color_primaries bt709 -color_trc bt709 "$1"
+}
+
+make_odd_mkv() {
+    quiet_ffmpeg -f lavfi -i "$(moving 161x91 1)" -c:v ffv1 -pix_fmt yuv444p "$1"
+}
+
+# Left half transparent, right half opaque.
+make_alpha_mov() {
+    quiet_ffmpeg -f lavfi -i "color=red:size=64x64:rate=25:duration=1,format=argb,geq=r=255:g=0:b=0:a=255*gte(X\,32)" \
+        -c:v qtrle "$1"
+}
+
+make_still_png() { quiet_ffmpeg -f lavfi -i "$(moving 320x180 1)" -frames:v 1 "$1"; }
+
+make_silent_mkv() {
+    # shellcheck disable=SC2046
+    quiet_ffmpeg -f lavfi -i "$(moving 320x180 2)" $(h264) "$1"
+}
+
+subtitle() { printf '1\n00:00:00,000 --> 00:00:09,000\n%s\n' "$2" >"$1"; }
+
+# The marks of three chapters in ffmpeg's own text format.
+chapters() {
+    printf ';FFMETADATA1\n'
+    printf '[CHAPTER]\nTIMEBASE=1/1000\nSTART=%s\nEND=%s\ntitle=%s\n' \
+        0 2500 "Opening" 2500 6000 "Глава вторая" 6000 10000 "終章"
+}
+
+# Two audio and two subtitle tracks with languages and titles, and chapters.
+# The arguments: the codec of the subtitles, the file.
+several_tracks() {
+    need video.mp4
+    local parts
+    parts=$(mktemp -d)
+    subtitle "$parts/1.srt" "Good evening"
+    subtitle "$parts/2.srt" "Guten Abend"
+    chapters >"$parts/chapters.txt"
+    quiet_ffmpeg -i "$folder/video.mp4" -f lavfi -i "sine=880:duration=10:sample_rate=44100" \
+        -i "$parts/1.srt" -i "$parts/2.srt" -i "$parts/chapters.txt" \
+        -map 0:v -map 0:a -map 1:a -map 2 -map 3 -map_metadata -1 -map_chapters 4 \
+        -c:v copy -c:a:0 copy -c:a:1 "$1" -c:s "$2" \
+        -metadata:s:a:0 language=eng -metadata:s:a:0 title="Main mix" \
+        -metadata:s:a:1 language=deu -metadata:s:a:1 title="Kommentar (größer)" \
+        -metadata:s:a:1 comment="Nur für Fans" \
+        -metadata:s:s:0 language=eng -metadata:s:s:0 title="Full" \
+        -metadata:s:s:1 language=jpn -metadata:s:s:1 title="字幕" \
+        -disposition:a:0 0 -disposition:a:1 default -disposition:s:0 forced "$3"
+    rm -r "$parts"
+}
+
+make_tracks_mkv() { several_tracks flac subrip "$1"; }
+make_tracks_mp4() { several_tracks aac mov_text "$1"; }
+
+# Texts in several scripts; a comment of 130 units that ends in pairs of them.
+tags() {
+    local clef=$'\xF0\x9D\x84\x9E' comment
+    comment=$(printf 'c%.0s' {1..126})$clef$clef
+    tag_options=(-metadata title="Ode an die Freude – К радости" -metadata artist="東京交響楽団"
+        -metadata album="$(printf 'Α%.0s' {1..128})" -metadata genre="موسيقى"
+        -metadata composer="Ludwig van Beethoven" -metadata comment="$comment"
+        -metadata track=3/12 -metadata disc=2/4 -metadata date=1824-05-07)
+}
+
+make_tagged_mp3() {
+    tags
+    quiet_ffmpeg -f lavfi -i "sine=440:duration=4" -c:a libmp3lame -b:a 128k "${tag_options[@]}" "$1"
+}
+
+make_tagged_ogg() {
+    tags
+    quiet_ffmpeg -f lavfi -i "sine=440:duration=4" -c:a libvorbis "${tag_options[@]}" "$1"
+}
+
+# Latin-1 where UTF-8 belongs, and numbers that are none.
+make_broken_tags_mp4() {
+    need video.mp4
+    quiet_ffmpeg -i "$folder/video.mp4" -c copy -movflags use_metadata_tags \
+        -metadata title=$'caf\xE9 au lait' -metadata artist=$'\xFF\xFE' -metadata track=many \
+        -metadata date=unknown "$1"
+}
+
+make_cover_jpg() { quiet_ffmpeg -f lavfi -i "testsrc=size=96x64:duration=1:rate=1" -frames:v 1 "$1"; }
+make_back_png() { quiet_ffmpeg -f lavfi -i "color=blue:size=32x32:duration=1:rate=1" -frames:v 1 "$1"; }
+
+# The back of the sleeve comes first, to be told from the front. The arguments:
+# the codec and the file.
+covered() {
+    need cover.jpg back.png
+    quiet_ffmpeg -f lavfi -i "sine=440:duration=2" -i "$folder/back.png" -i "$folder/cover.jpg" \
+        -map 0 -map 1 -map 2 -c:a "$1" -c:v copy -disposition:v attached_pic \
+        -metadata:s:v:0 comment="Cover (back)" -metadata:s:v:1 comment="Cover (front)" "$2"
+}
+
+make_covered_mp3() { covered libmp3lame "$1"; }
+make_covered_flac() { covered flac "$1"; }
+
+make_covered_m4a() {
+    need cover.jpg
+    quiet_ffmpeg -f lavfi -i "sine=440:duration=2" -i "$folder/cover.jpg" -map 0 -map 1 \
+        -c:a aac -c:v copy -disposition:v attached_pic "$1"
+}
+
+make_covered_mkv() {
+    need cover.jpg silent.mkv
+    quiet_ffmpeg -i "$folder/silent.mkv" -attach "$folder/cover.jpg" -c copy \
+        -metadata:s:t mimetype=image/jpeg "$1"
+}
+
+make_garbage_bin() { yes 'neither sound nor picture' | head -c 65536 >"$1"; }
+make_truncated_mp4() { need video.mp4 && head -c 20000 "$folder/video.mp4" >"$1"; }
+make_truncated_mkv() { need video.mkv && head -c 40000 "$folder/video.mkv" >"$1"; }
+
+# Makes each file that is not there yet, under another name until it is whole.
+need() {
+    local file unfinished
+    for file in "$@"; do
+        [ -e "$folder/$file" ] && continue
+        unfinished=$(mktemp -d "$folder/.making-XXXXXX")
+        "make_$(tr '.-' '__' <<<"$file")" "$unfinished/$file"
+        mv "$unfinished/$file" "$folder/$file"
+        rmdir "$unfinished"
+    done
+}
+
+[ $# -ge 1 ] || { echo "usage: make-media.sh FOLDER [FILE...]" >&2; exit 2; }
+folder=$1
+shift
+mkdir -p "$folder"
+for file in ${*:-$FILES}; do
+    case " $(echo $FILES) " in
+    *" $file "*) need "$file" ;;
+    *) echo "make-media.sh: no such file is made: $file" >&2; exit 2 ;;
+    esac
+done
