@@ -33,7 +33,7 @@ public:
     virtual status_t cancelBuffer(int slot) = 0;
 
 protected:
-    virtual ~IGraphicBufferProducer() {}
+    virtual ~IGraphicBufferProducer() = default;
 };
 
 }  // namespace android

@@ -15,24 +15,24 @@ namespace android {
 namespace {
 
 template <bool kMatches>
-constexpr void* checkedFunction(void* function) {
+constexpr const char* checked(const char* signature) {
     static_assert(kMatches, "the JNI signature is not that of the function");
-    return function;
+    return signature;
 }
 
-#define ROW(javaName, signature, function)                                                   \
-    {                                                                                        \
-        javaName, signature,                                                                 \
-            checkedFunction<NativeMethodSignature<decltype(&function)>::matches(signature)>( \
-                reinterpret_cast<void*>(function))                                           \
+#define ROW(javaName, signature, function)                                                        \
+    {                                                                                             \
+        javaName,                                                                                 \
+            checked<NativeMethodSignature<decltype(&(function))>::matches(signature)>(signature), \
+            reinterpret_cast<void*>(&(function))                                                  \
     }
 
-// clang-format off: one row a line, however long.
+// One row a line, however long.
+// clang-format off
 const JNINativeMethod kNativeMethods[] = {
     // PlaybackCommands.cpp
     ROW("native_setDataSource", "(Ljava/lang/String;)V", OrvMediaClient_setDataSource),
-    ROW("native_setDataSource", "(Ljava/lang/String;[Ljava/lang/String;[Ljava/lang/String;)V",
-        OrvMediaClient_setDataSourceAndHeaders),
+    ROW("native_setDataSource", "(Ljava/lang/String;[Ljava/lang/String;[Ljava/lang/String;)V", OrvMediaClient_setDataSourceAndHeaders),
     ROW("native_setDataSource", "(Ljava/io/FileDescriptor;JJ)V", OrvMediaClient_setDataSourceFD),
     // VideoSurface.cpp
     ROW("native_setVideoSurface", "(Landroid/view/Surface;)V", OrvMediaClient_setVideoSurface),
@@ -89,23 +89,19 @@ const JNINativeMethod kNativeMethods[] = {
     ROW("native_getAllAudioTrackInfo", "(Z)I", OrvMediaClient_getAllAudioTrackInfo),
     ROW("native_getAllVideoTrackInfo", "()I", OrvMediaClient_getAllVideoTrackInfo),
     // SubtitleSources.cpp
-    ROW("native_setSubtitleDataSource", "(Ljava/lang/String;)V",
-        OrvMediaClient_setSubtitleDataSource),
-    ROW("native_setSubtitleDataSourceEx", "(Ljava/lang/String;Ljava/lang/String;)V",
-        OrvMediaClient_setSubtitleDataSourceEx),
+    ROW("native_setSubtitleDataSource", "(Ljava/lang/String;)V", OrvMediaClient_setSubtitleDataSource),
+    ROW("native_setSubtitleDataSourceEx", "(Ljava/lang/String;Ljava/lang/String;)V", OrvMediaClient_setSubtitleDataSourceEx),
     ROW("native_addTimedTextSource", "(Ljava/lang/String;)I", OrvMediaClient_addTimedTextSource),
     // SubtitleAttr.cpp
     ROW("native_setSubtitleAttr", "(Lcom/quintora/SubtitleAttr;)V", OrvMediaClient_setSubtitleAttr),
     // Pictures.cpp
-    ROW("native_getThumbnailInfo", "(Lcom/quintora/mmp/util/ThumbnailInfo;)[B",
-        OrvMediaClient_getThumbnailInfo),
+    ROW("native_getThumbnailInfo", "(Lcom/quintora/mmp/util/ThumbnailInfo;)[B", OrvMediaClient_getThumbnailInfo),
     // ExtensionCommands.cpp
     ROW("native_step", "(I)V", OrvMediaClient_step),
     // Pictures.cpp
     ROW("native_getEmbeddedPicture", "(I)[B", OrvMediaClient_getEmbeddedPicture),
     // PcmMediaInfo.cpp
-    ROW("native_setPcmMediaInfo", "(Lcom/quintora/mmp/util/PcmMediaInfo;)V",
-        OrvMediaClient_setPcmMediaInfo),
+    ROW("native_setPcmMediaInfo", "(Lcom/quintora/mmp/util/PcmMediaInfo;)V", OrvMediaClient_setPcmMediaInfo),
     ROW("native_setPcmFlag", "()V", OrvMediaClient_setPcmFlag),
     // StreamSource.cpp
     ROW("native_setDataSourceByInputStream", "()V", OrvMediaClient_setDataSourceByInputStream),
@@ -120,16 +116,14 @@ const JNINativeMethod kNativeMethods[] = {
     ROW("native_getMetaDataInfo", "()Z", OrvMediaClient_getMetaDataInfo),
     // ExtensionCommands.cpp
     ROW("native_setABRepeat", "(I)I", OrvMediaClient_setABRepeat),
-    ROW("native_QTVDECSendCliCommand", "(Ljava/lang/String;I)I",
-        OrvMediaClient_QTVDEC_SendCliCommand),
+    ROW("native_QTVDECSendCliCommand", "(Ljava/lang/String;I)I", OrvMediaClient_QTVDEC_SendCliCommand),
     // DivxNavigation.cpp
     ROW("native_getDivxTitleInfo", "(I)Z", OrvMediaClient_getDivxTitleInfo),
     ROW("native_getDivxChapInfo", "(III)Z", OrvMediaClient_getDivxChapInfo),
     ROW("native_getDivxPlayListInfo", "(II)Z", OrvMediaClient_getDivxPlayListInfo),
     ROW("native_getDivxPositionInfo", "()Z", OrvMediaClient_getDivxPositionInfo),
     ROW("native_getDivxDisplayInfo", "(IIIII)Z", OrvMediaClient_getDivxDisplayInfo),
-    ROW("native_getDivxLastMemoryFilePosition", "()Z",
-        OrvMediaClient_getDivxLastMemoryFilePosition),
+    ROW("native_getDivxLastMemoryFilePosition", "()Z", OrvMediaClient_getDivxLastMemoryFilePosition),
     ROW("native_getDivxTitleNum", "()I", OrvMediaClient_getDivxTitleNum),
     ROW("native_getDivxLastMemoryFileID", "()I", OrvMediaClient_getDivxLastMemoryFileID),
     ROW("native_setDivxTitleInfo", "(III)I", OrvMediaClient_setDivxTitleInfo),
@@ -137,9 +131,7 @@ const JNINativeMethod kNativeMethods[] = {
     ROW("native_setDivxPlayListInfo", "(IIII)I", OrvMediaClient_setDivxPlayListInfo),
     ROW("native_setDivxBtnInfo", "(II)I", OrvMediaClient_setDivxBtnInfo),
     // DivxLastMemory.cpp
-    ROW("native_setDivxLastMemoryFilePosition",
-        "(Lcom/quintora/mmp/util/DivxLastMemoryFilePosition;)I",
-        OrvMediaClient_setDivxLastMemoryFilePosition),
+    ROW("native_setDivxLastMemoryFilePosition", "(Lcom/quintora/mmp/util/DivxLastMemoryFilePosition;)I", OrvMediaClient_setDivxLastMemoryFilePosition),
     // DivxNavigation.cpp
     ROW("native_setDivxFilePosition", "(II)I", OrvMediaClient_setDivxFilePosition),
     // ExtensionCommands.cpp

@@ -50,16 +50,18 @@ bool readSize(JNIEnv* env, jobject info, const char* field, int32_t& out) {
 
 // Moves the padded rows together, front to back.
 void packRows(uint8_t* buffer, int32_t height, uint32_t rowBytes, uint32_t paddedRowBytes) {
-    // An 8-bit counter: callers ask for at most 255 rows.
+    // An 8-bit counter, on purpose: callers ask for at most 255 rows.
+    // NOLINTNEXTLINE(bugprone-too-small-loop-variable)
     for (uint8_t row = 1; row < height; ++row) {
         memmove(buffer + row * rowBytes, buffer + row * paddedRowBytes, rowBytes);
     }
 }
 
 jbyteArray newByteArray(JNIEnv* env, const uint8_t* bytes, uint32_t size) {
-    jbyteArray array = env->NewByteArray(size);
+    const jsize length = static_cast<jsize>(size);
+    jbyteArray array = env->NewByteArray(length);
     if (array != nullptr) {
-        env->SetByteArrayRegion(array, 0, size, reinterpret_cast<const jbyte*>(bytes));
+        env->SetByteArrayRegion(array, 0, length, reinterpret_cast<const jbyte*>(bytes));
     }
     return array;
 }
@@ -131,7 +133,7 @@ jbyteArray OrvMediaClient_getEmbeddedPicture(JNIEnv* env, jobject thiz, jint) {
         ALOGI("getEmbeddedPicture(): return NULL, leave\n");
         return nullptr;
     }
-    jbyteArray array = env->NewByteArray(art->size());
+    jbyteArray array = env->NewByteArray(static_cast<jsize>(art->size()));
     if (array != nullptr) {
         fillByteArray(env, array, *art);
     } else {

@@ -8,7 +8,7 @@ namespace os {
 // What ScopedMutex can hold. Results are those of the POSIX call.
 class ORV_EXPORT Lock {
 public:
-    virtual ~Lock() {}
+    virtual ~Lock() = default;
     virtual int lock() = 0;
     virtual int unlock() = 0;
 };

@@ -13,9 +13,9 @@ public:
     constexpr Relaxed(T value = T()) : mValue(value) {}
 
     operator T() const { return mValue.load(std::memory_order_relaxed); }
-    T operator=(T value) {
+    Relaxed& operator=(T value) {
         mValue.store(value, std::memory_order_relaxed);
-        return value;
+        return *this;
     }
 
 private:

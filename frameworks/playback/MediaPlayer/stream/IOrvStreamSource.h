@@ -9,7 +9,7 @@
 // blocks is the source's affair: read and the seeks may, the rest should not.
 class IOrvStreamSource {
 public:
-    virtual ~IOrvStreamSource() {}
+    virtual ~IOrvStreamSource() = default;
 
     // Reads up to len bytes. 0 with the count in readLen (a source may report
     // more than len, but never writes more), or ORV_STREAM_ERROR_CODE_NOT_OK,

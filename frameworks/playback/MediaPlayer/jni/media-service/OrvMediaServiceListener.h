@@ -14,7 +14,7 @@ class Parcel;
 class ORV_EXPORT OrvMediaServiceListener : public virtual RefBase {
 public:
     virtual void notify(int msg, int ext1, int ext2, const Parcel* obj) = 0;
-    virtual ~OrvMediaServiceListener() {}
+    virtual ~OrvMediaServiceListener() = default;
 };
 
 }  // namespace android
