@@ -34,11 +34,11 @@ struct JavaFields {
         return field;
     }
 
-    template <typename Enum>
-    bool readEnum(const char* name, Enum& out) const {
+    template <typename Int>
+    bool readInt(const char* name, Int& out) const {
         jfieldID field = find(name, "I");
         if (field == nullptr) return false;
-        out = static_cast<Enum>(env->GetIntField(object, field));
+        out = static_cast<Int>(env->GetIntField(object, field));
         return true;
     }
 
@@ -74,20 +74,20 @@ struct JavaFields {
 
 bool readMediaInfo(const JavaFields& fields, IORV_PB_CTRL_SET_MEDIA_INFO_T& info,
                    jobject& pcmInfo) {
-    return fields.readEnum("mediaType", info.eMediaType) &&
-           fields.readEnum("totalDuration", info.u4TotalDuration) &&
+    return fields.readInt("mediaType", info.eMediaType) &&
+           fields.readInt("totalDuration", info.u4TotalDuration) &&
            fields.readSize("size", info.u8Size) &&
            fields.readFlag("fgSynchronized", info.fgSynchronized) &&
-           fields.readEnum("audioCodec", info.uFormatInfo.tAudioEsInfo.tAudInfo.eAudEnc) &&
+           fields.readInt("audioCodec", info.uFormatInfo.tAudioEsInfo.tAudInfo.eAudEnc) &&
            fields.readObject("audioPcmInfo", kPcmInfoType, pcmInfo);
 }
 
 bool readPcmInfo(const JavaFields& fields, ORV_AUD_PCM_INFO_T& info) {
-    return fields.readEnum("pcm_type", info.e_pcm_type) &&
-           fields.readEnum("channelNumber", info.eNumCh) &&
-           fields.readEnum("sampleRate", info.eSampleRate) &&
+    return fields.readInt("pcm_type", info.e_pcm_type) &&
+           fields.readInt("channelNumber", info.eNumCh) &&
+           fields.readInt("sampleRate", info.eSampleRate) &&
            fields.readShort("blockAlign", info.u2BlockAlign) &&
-           fields.readEnum("bitsPerSample", info.eBitsPerSample) &&
+           fields.readInt("bitsPerSample", info.eBitsPerSample) &&
            fields.readFlag("bigEndian", info.fgBigEndian);
 }
 
