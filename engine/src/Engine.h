@@ -1,0 +1,61 @@
+// SPDX-License-Identifier: Apache-2.0
+#pragma once
+
+#include <orvtarn/TarnPlayer.h>
+
+#include "EngineLog.h"
+#include "EventLoop.h"
+#include "Gate.h"
+#include "Loader.h"
+#include "MpvHandle.h"
+#include "Notifier.h"
+#include "PlayerState.h"
+#include "Seeker.h"
+#include "StreamProtocol.h"
+#include "Transport.h"
+#include "VideoOutput.h"
+
+namespace android {
+
+// The units of one player and the order in which they come and go.
+class TarnPlayer::Engine {
+public:
+    Engine(int decoder, orvtarn::Notifier::Deliver deliver);
+    ~Engine() { release(); }
+
+    // Runs one operation, unless the player is released: then answers closed.
+    template <class Result, class Operation>
+    Result call(const char* name, Result closed, Operation operation) {
+        orvtarn::Gate::Pass pass(gate);
+        if (pass) return operation();
+        orvtarn::refused(name, "the player is released");
+        return closed;
+    }
+
+    // Ends the operations under way and takes the units apart. Once.
+    void release();
+
+private:
+    orvtarn::Gate gate;
+    orvtarn::Notifier notifier;
+    orvtarn::StreamProtocol protocol;
+
+public:
+    orvtarn::MpvHandle mpv;
+    orvtarn::PlayerState state;
+    orvtarn::VideoOutput video;
+
+private:
+    orvtarn::EventLoop events;
+
+public:
+    orvtarn::Loader loader;
+    orvtarn::Seeker seeker;
+    orvtarn::Transport transport;
+
+private:
+    bool create(bool hardwareDecoder);
+    void beforeLoad();
+};
+
+}  // namespace android

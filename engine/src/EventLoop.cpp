@@ -1,0 +1,246 @@
+// SPDX-License-Identifier: Apache-2.0
+#include "EventLoop.h"
+
+#include <media/MediaPlayerInterface.h>
+#include <orvtarn/PlayerTypes.h>
+#include <string.h>
+
+#include <algorithm>
+#include <string>
+#include <utility>
+
+#include "EngineLog.h"
+#include "MpvError.h"
+#include "ThreadName.h"
+
+namespace orvtarn {
+namespace {
+
+enum ObservedProperty : uint64_t {
+    kTime = 1,
+    kDuration,
+    kEndReached,
+    kSeekable,
+    kBuffering,
+    kBufferedUntil,
+};
+
+struct Observed {
+    ObservedProperty id;
+    const char* name;
+    mpv_format format;
+};
+
+const Observed kObserved[] = {
+    {kTime, "time-pos", MPV_FORMAT_DOUBLE},
+    {kDuration, "duration", MPV_FORMAT_DOUBLE},
+    {kEndReached, "eof-reached", MPV_FORMAT_FLAG},
+    {kSeekable, "seekable", MPV_FORMAT_FLAG},
+    {kBuffering, "paused-for-cache", MPV_FORMAT_FLAG},
+    {kBufferedUntil, "demuxer-cache-time", MPV_FORMAT_DOUBLE},
+};
+
+double numberOf(const mpv_event_property& property) {
+    return *static_cast<const double*>(property.data);
+}
+
+bool flagOf(const mpv_event_property& property) {
+    return *static_cast<const int*>(property.data) != 0;
+}
+
+}  // namespace
+
+bool EventLoop::start() {
+    for (const Observed& property : kObserved) {
+        const int error =
+            mpv_observe_property(mMpv.get(), property.id, property.name, property.format);
+        if (error < 0) return refused("observe", mpv_error_string(error));
+    }
+    mpv_request_log_messages(mMpv.get(), "error");
+    mThread = std::thread(&EventLoop::run, this);
+    return true;
+}
+
+void EventLoop::stop() {
+    if (!mThread.joinable()) return;
+    mQuit = true;
+    mpv_wakeup(mMpv.get());
+    mThread.join();
+}
+
+void EventLoop::setSource(std::shared_ptr<MediaSource> source) {
+    std::lock_guard<std::mutex> lock(mSourceMutex);
+    mSource = std::move(source);
+}
+
+void EventLoop::run() {
+    nameThisThread("orv-events");
+    while (!mQuit) handle(*mpv_wait_event(mMpv.get(), -1));
+}
+
+void EventLoop::handle(const mpv_event& event) {
+    switch (event.event_id) {
+        case MPV_EVENT_START_FILE:
+            mState.update([](PlayerState::Values& v) { v.fileStarted = true; });
+            break;
+        case MPV_EVENT_END_FILE:
+            onEndFile(*static_cast<const mpv_event_end_file*>(event.data));
+            break;
+        case MPV_EVENT_SEEK:
+            mState.update([](PlayerState::Values& v) { v.seeks++; });
+            break;
+        case MPV_EVENT_PLAYBACK_RESTART:
+            onRestart();
+            break;
+        case MPV_EVENT_VIDEO_RECONFIG:
+            onVideoSize();
+            break;
+        case MPV_EVENT_PROPERTY_CHANGE:
+            onProperty(*static_cast<const mpv_event_property*>(event.data));
+            break;
+        case MPV_EVENT_LOG_MESSAGE: {
+            const auto* message = static_cast<const mpv_event_log_message*>(event.data);
+            const std::string text(message->text, strcspn(message->text, "\n"));
+            ALOGW("%s: %s", message->prefix, text.c_str());
+            break;
+        }
+        default:
+            break;
+    }
+}
+
+void EventLoop::onEndFile(const mpv_event_end_file& end) {
+    if (end.reason == MPV_END_FILE_REASON_REDIRECT) return;
+    if (end.reason == MPV_END_FILE_REASON_ERROR) {
+        failWith(sourceFailed() ? ORV_ERROR_IO : statusOfMpvError(end.error));
+    } else if (end.reason == MPV_END_FILE_REASON_EOF) {
+        failWith(sourceFailed() ? ORV_ERROR_IO : ORV_ERROR_MALFORMED);
+    }
+    mState.update([](PlayerState::Values& v) { v.fileOpen = false; });
+}
+
+void EventLoop::onRestart() {
+    onVideoSize();
+    const bool hasVideo = mMpv.getInt("vid").value_or(0) > 0;
+    const double duration = mMpv.getDouble("duration").value_or(0);
+    const bool seekable = mMpv.getFlag("seekable").value_or(false);
+    mState.update([&](PlayerState::Values& v) {
+        v.restarts++;
+        if (v.phase != Phase::Preparing) return;
+        v.restarted = true;
+        v.hasVideo = hasVideo;
+        v.duration = std::max(duration, v.duration);
+        v.seekable = seekable;
+    });
+    becomePreparedIfReady();
+}
+
+void EventLoop::onFrame() {
+    const bool first = mState.update([](PlayerState::Values& v) {
+        const bool news = !v.framed && v.fileOpen;
+        v.framed = v.framed || news;
+        return news;
+    });
+    if (!first) return;
+    mNotifier.post(android::MEDIA_INFO, android::MEDIA_INFO_RENDERING_START);
+    becomePreparedIfReady();
+}
+
+void EventLoop::becomePreparedIfReady() {
+    const bool prepared = mState.update([](PlayerState::Values& v) {
+        const bool ready = v.phase == Phase::Preparing && v.restarted && (v.framed || !v.hasVideo);
+        if (ready) v.phase = Phase::Prepared;
+        return ready;
+    });
+    if (prepared) mNotifier.post(android::MEDIA_PREPARED);
+}
+
+void EventLoop::onProperty(const mpv_event_property& property) {
+    if (property.format == MPV_FORMAT_NONE) return;  // not available now: keep the last
+    for (const Observed& observed : kObserved) {
+        if (strcmp(observed.name, property.name) != 0) continue;
+        switch (observed.id) {
+            case kTime:
+                return onTime(numberOf(property));
+            case kDuration:
+                return mState.update(
+                    [&](PlayerState::Values& v) { v.duration = numberOf(property); });
+            case kEndReached:
+                return flagOf(property) ? onEndReached() : void();
+            case kSeekable:
+                return mState.update(
+                    [&](PlayerState::Values& v) { v.seekable = flagOf(property); });
+            case kBuffering:
+                return onBuffering(flagOf(property));
+            case kBufferedUntil:
+                return onBuffered(numberOf(property));
+        }
+    }
+}
+
+void EventLoop::onTime(double seconds) {
+    mVideo.setPosition(static_cast<int64_t>(std::max(seconds, 0.0) * 1e6));
+    mState.update([&](PlayerState::Values& v) { v.position = std::max(seconds, 0.0); });
+}
+
+void EventLoop::onBuffering(bool buffering) {
+    const bool changed = mState.update(
+        [&](PlayerState::Values& v) { return std::exchange(v.buffering, buffering) != buffering; });
+    if (!changed) return;
+    mNotifier.post(android::MEDIA_INFO, buffering ? android::MEDIA_INFO_BUFFERING_START
+                                                  : android::MEDIA_INFO_BUFFERING_END);
+}
+
+void EventLoop::onBuffered(double seconds) {
+    const int percent = mState.update([&](PlayerState::Values& v) {
+        const int now =
+            v.duration > 0 ? std::clamp(static_cast<int>(100 * seconds / v.duration), 0, 100) : 0;
+        return std::exchange(v.bufferPercent, now) == now ? -1 : now;
+    });
+    if (percent >= 0) mNotifier.post(android::MEDIA_BUFFERING_UPDATE, percent);
+}
+
+// The core keeps the media open at its end, still playing if it could: it is
+// paused, so that a later seek does not start it again.
+void EventLoop::onEndReached() {
+    // The word may be older than a seek away from the end.
+    if (!mMpv.getFlag("eof-reached").value_or(false)) return;
+    if (!sourceFailed() && mEndHandler && mEndHandler()) return;
+    mMpv.set("pause", true);
+    if (sourceFailed()) return failWith(ORV_ERROR_IO);
+    const bool completed = mState.update([](PlayerState::Values& v) {
+        if (v.phase != Phase::Started) return false;
+        v.phase = Phase::Completed;
+        if (v.duration <= 0) v.duration = v.position;
+        return true;
+    });
+    if (completed) mNotifier.post(android::MEDIA_PLAYBACK_COMPLETE);
+}
+
+void EventLoop::onVideoSize() {
+    const int width = static_cast<int>(mMpv.getInt("dwidth").value_or(0));
+    const int height = static_cast<int>(mMpv.getInt("dheight").value_or(0));
+    if (width <= 0 || height <= 0) return;
+    const bool changed = mState.update([&](PlayerState::Values& v) {
+        const bool news = v.width != width || v.height != height;
+        v.width = width;
+        v.height = height;
+        return news;
+    });
+    mVideo.setVideoSize(width, height);
+    if (changed) mNotifier.post(android::MEDIA_SET_VIDEO_SIZE, width, height);
+}
+
+void EventLoop::failWith(android::status_t status) {
+    const bool news = mState.update([&](PlayerState::Values& v) { return v.fail(status); });
+    if (!news) return;
+    ALOGE("playback: ended by an error (status %d)", status);
+    mNotifier.post(android::MEDIA_ERROR, android::MEDIA_ERROR_UNKNOWN, status);
+}
+
+bool EventLoop::sourceFailed() {
+    std::lock_guard<std::mutex> lock(mSourceMutex);
+    return mSource != nullptr && mSource->readFailed();
+}
+
+}  // namespace orvtarn

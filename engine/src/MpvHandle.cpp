@@ -1,0 +1,168 @@
+// SPDX-License-Identifier: Apache-2.0
+#include "MpvHandle.h"
+
+#include <glob.h>
+#include <locale.h>
+
+#include <mutex>
+
+#include "EngineLog.h"
+
+namespace orvtarn {
+namespace {
+
+struct Option {
+    const char* name;
+    const char* value;
+};
+
+// Nothing comes from configuration files or from beside the media, nothing is
+// drawn but video and subtitles, and the core stays when a file ends.
+const Option kOptions[] = {
+    {"vo", "libmpv"},
+    {"audio-client-name", "orvtarn"},
+    {"idle", "yes"},
+    {"keep-open", "yes"},
+    {"keep-open-pause", "no"},
+    {"config", "no"},
+    {"terminal", "no"},
+    {"osc", "no"},
+    {"load-scripts", "no"},
+    {"ytdl", "no"},
+    {"osd-level", "0"},
+    {"audio-display", "no"},
+    {"input-default-bindings", "no"},
+    {"sub-auto", "no"},
+    {"audio-file-auto", "no"},
+    {"cover-art-auto", "no"},
+    // Rendering waits for a frame's time; the callback comes in time already.
+    {"video-timing-offset", "0"},
+    {"sws-allow-zimg", "no"},
+    {"sws-scaler", "fast-bilinear"},
+    {"sws-fast", "yes"},
+    // Brings back the line on screen when a subtitle track is turned on.
+    {"demuxer-mkv-subtitle-preroll-secs-index", "60"},
+    {"network-timeout", "20"},
+    {"pause", "yes"},
+    {"sid", "no"},
+};
+
+// "null" keeps time where no device is: without it, media without video fail
+// there. ALSA is only asked where it has cards; it complains at length.
+const char* audioOutputs() {
+    glob_t cards;
+    const bool hasCards = glob("/dev/snd/pcm*p", GLOB_NOSORT, nullptr, &cards) == 0;
+    globfree(&cards);
+    return hasCards ? "pulse,alsa,null" : "pulse,null";
+}
+
+// The core refuses to start while numbers are written with a decimal comma,
+// and looks at the process's locale, not at the thread's.
+void usePointInNumbers() {
+    static std::once_flag once;
+    std::call_once(once, [] { setlocale(LC_NUMERIC, "C"); });
+}
+
+}  // namespace
+
+bool MpvHandle::create(bool hardwareDecoder) {
+    usePointInNumbers();
+    mHandle = mpv_create();
+    if (mHandle == nullptr) return refused(__func__, "no playback core");
+    int error = mpv_set_option_string(mHandle, "hwdec", hardwareDecoder ? "auto-copy-safe" : "no");
+    if (error == 0) error = mpv_set_option_string(mHandle, "ao", audioOutputs());
+    for (const Option& option : kOptions) {
+        if (error == 0) error = mpv_set_option_string(mHandle, option.name, option.value);
+    }
+    if (error == 0) error = mpv_initialize(mHandle);
+    if (error == 0) return true;
+    destroy();
+    return refused(__func__, mpv_error_string(error));
+}
+
+void MpvHandle::destroy() {
+    if (mHandle != nullptr) mpv_terminate_destroy(mHandle);
+    mHandle = nullptr;
+}
+
+int MpvHandle::set(const char* property, bool value) {
+    int flag = value;
+    return mpv_set_property(mHandle, property, MPV_FORMAT_FLAG, &flag);
+}
+
+int MpvHandle::set(const char* property, int64_t value) {
+    return mpv_set_property(mHandle, property, MPV_FORMAT_INT64, &value);
+}
+
+int MpvHandle::set(const char* property, double value) {
+    return mpv_set_property(mHandle, property, MPV_FORMAT_DOUBLE, &value);
+}
+
+int MpvHandle::set(const char* property, const char* value) {
+    return mpv_set_property_string(mHandle, property, value);
+}
+
+int MpvHandle::set(const char* property, const std::vector<std::string>& values) {
+    std::vector<mpv_node> nodes(values.size());
+    for (size_t i = 0; i < values.size(); i++) {
+        nodes[i].format = MPV_FORMAT_STRING;
+        nodes[i].u.string = const_cast<char*>(values[i].c_str());
+    }
+    mpv_node_list list = {static_cast<int>(nodes.size()), nodes.data(), nullptr};
+    mpv_node node;
+    node.format = MPV_FORMAT_NODE_ARRAY;
+    node.u.list = &list;
+    return mpv_set_property(mHandle, property, MPV_FORMAT_NODE, &node);
+}
+
+std::optional<bool> MpvHandle::getFlag(const char* property) const {
+    int flag = 0;
+    if (mpv_get_property(mHandle, property, MPV_FORMAT_FLAG, &flag) < 0) return {};
+    return flag != 0;
+}
+
+std::optional<int64_t> MpvHandle::getInt(const char* property) const {
+    int64_t value = 0;
+    if (mpv_get_property(mHandle, property, MPV_FORMAT_INT64, &value) < 0) return {};
+    return value;
+}
+
+std::optional<double> MpvHandle::getDouble(const char* property) const {
+    double value = 0;
+    if (mpv_get_property(mHandle, property, MPV_FORMAT_DOUBLE, &value) < 0) return {};
+    return value;
+}
+
+std::optional<std::string> MpvHandle::getString(const char* property) const {
+    char* value = mpv_get_property_string(mHandle, property);
+    if (value == nullptr) return {};
+    std::string copy(value);
+    mpv_free(value);
+    return copy;
+}
+
+bool MpvHandle::getNode(const char* property, MpvNode& node) const {
+    return mpv_get_property(mHandle, property, MPV_FORMAT_NODE, node.get()) >= 0;
+}
+
+int MpvHandle::command(std::initializer_list<const char*> arguments) {
+    std::vector<const char*> list(arguments);
+    list.push_back(nullptr);
+    return mpv_command(mHandle, list.data());
+}
+
+int MpvHandle::seek(double seconds, const char* flags) {
+    mpv_node arguments[3];
+    arguments[0].format = arguments[2].format = MPV_FORMAT_STRING;
+    arguments[0].u.string = const_cast<char*>("seek");
+    arguments[1].format = MPV_FORMAT_DOUBLE;
+    arguments[1].u.double_ = seconds;
+    arguments[2].u.string = const_cast<char*>(flags);
+    mpv_node_list list = {3, arguments, nullptr};
+    mpv_node command;
+    command.format = MPV_FORMAT_NODE_ARRAY;
+    command.u.list = &list;
+    return mpv_command_node(mHandle, &command, nullptr);
+}
+
+}  // namespace orvtarn

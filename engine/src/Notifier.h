@@ -1,0 +1,35 @@
+// SPDX-License-Identifier: Apache-2.0
+#pragma once
+
+#include <functional>
+#include <memory>
+#include <thread>
+
+namespace orvtarn {
+
+// Tells the listener of events, in order, on a thread of its own, so that a
+// listener may call the player and may take its time.
+class Notifier {
+public:
+    using Deliver = std::function<void(int msg, int ext1, int ext2)>;
+
+    explicit Notifier(Deliver deliver);
+    ~Notifier() { stop(); }
+
+    // Any thread; never blocks.
+    void post(int msg, int ext1 = 0, int ext2 = 0);
+    // Forgets what was not told yet. Waits for a delivery under way, unless it
+    // is called from that delivery.
+    void stop();
+
+private:
+    // Outlives the notifier while a delivery that stopped it returns.
+    struct Queue;
+
+    static void run(std::shared_ptr<Queue> queue);
+
+    std::shared_ptr<Queue> mQueue;
+    std::thread mThread;
+};
+
+}  // namespace orvtarn

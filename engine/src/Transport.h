@@ -1,0 +1,43 @@
+// SPDX-License-Identifier: Apache-2.0
+#pragma once
+
+#include <utils/Errors.h>
+
+#include <functional>
+#include <mutex>
+
+#include "MpvHandle.h"
+#include "PlayerState.h"
+
+namespace orvtarn {
+
+// Playing and pausing of prepared media, and what can be asked about it.
+class Transport {
+public:
+    Transport(MpvHandle& mpv, PlayerState& state) : mMpv(mpv), mState(state) {}
+
+    // After the end of the media plays it again.
+    android::status_t start();
+    android::status_t pause();
+    bool isPlaying() const;
+    android::status_t getCurrentPosition(int* msec) const;
+    android::status_t getDuration(int* msec) const;
+    android::status_t getVideoWidth(int* width) const;
+    android::status_t getVideoHeight(int* height) const;
+    android::status_t setLooping(bool looping);
+    int bufferPercent() const;
+
+    // Pauses as an effect of another operation.
+    void becomePaused();
+
+private:
+    android::status_t getSize(const char* operation, int PlayerState::Values::*member,
+                              int* pixels) const;
+
+    MpvHandle& mMpv;
+    PlayerState& mState;
+    // The phase and the core's own pause change together.
+    std::mutex mMutex;
+};
+
+}  // namespace orvtarn

@@ -1,0 +1,89 @@
+// SPDX-License-Identifier: Apache-2.0
+#pragma once
+
+#include <gui/IGraphicBufferProducer.h>
+#include <mpv/render.h>
+#include <stdint.h>
+#include <utils/StrongPointer.h>
+
+#include <atomic>
+#include <condition_variable>
+#include <functional>
+#include <mutex>
+#include <thread>
+
+namespace orvtarn {
+
+// Draws the core's video frames into the surface's buffers, on a thread of its
+// own, the only one that renders. Never holds up playback: a surface without a
+// free buffer misses a frame, and gets the newest one when it has.
+class VideoOutput {
+public:
+    struct Counters {
+        uint64_t delivered;  // frames handed to the surface
+        uint64_t missed;     // frames that found no free buffer
+    };
+
+    // onFrame: after each picture that was drawn or had no surface to go to.
+    explicit VideoOutput(std::function<void()> onFrame) : mOnFrame(std::move(onFrame)) {}
+    ~VideoOutput() { destroy(); }
+
+    bool create(mpv_handle* mpv);
+    // Before the core goes, and quicker when no media is open.
+    void destroy();
+
+    // Null for none. No frame goes to an earlier surface afterwards; the new
+    // one gets the picture at once, paused or not.
+    void setProducer(const android::sp<android::IGraphicBufferProducer>& producer);
+    // Whether frames go to the surface at all.
+    void setVisible(bool visible);
+    void setVideoSize(int width, int height) { mVideoSize = {width, height}; }
+    // The time that frames are marked with.
+    void setPosition(int64_t microseconds) { mPositionUs = microseconds; }
+    // The media is closed: nothing is drawn again before the next frame.
+    void forgetPicture() { mHasPicture = false; }
+
+    Counters counters() const { return {mDelivered, mMissed}; }
+
+private:
+    struct Size {
+        int width = 0;
+        int height = 0;
+        bool operator==(Size other) const { return width == other.width && height == other.height; }
+    };
+
+    static void onUpdate(void* self);
+    void wake(bool redraw);
+    void run();
+    bool takeFrame();
+    bool render(bool newFrame);
+    Size wantedSize() const;
+    bool sizeChanged();
+    android::status_t draw();
+    android::status_t drawInto(const android::IGraphicBufferProducer::PixelBuffer& buffer);
+    void skip();
+
+    const std::function<void()> mOnFrame;
+    mpv_render_context* mContext = nullptr;
+    std::thread mThread;
+
+    std::mutex mWakeMutex;
+    std::condition_variable mWakeUp;
+    bool mWoken = false;
+    bool mRedraw = false;
+    bool mQuit = false;
+
+    // Held while a frame is drawn. No thread that holds it calls the core.
+    std::mutex mSurfaceMutex;
+    android::sp<android::IGraphicBufferProducer> mProducer;
+    bool mVisible = true;
+    Size mDrawnSize;
+
+    std::atomic<Size> mVideoSize{Size()};
+    std::atomic<int64_t> mPositionUs{0};
+    std::atomic<bool> mHasPicture{false};
+    std::atomic<uint64_t> mDelivered{0};
+    std::atomic<uint64_t> mMissed{0};
+};
+
+}  // namespace orvtarn

@@ -1,0 +1,64 @@
+// SPDX-License-Identifier: Apache-2.0
+#include "PlayerTest.h"
+
+#include <chrono>
+#include <thread>
+
+namespace orvtest {
+
+std::string media(const std::string& name) { return std::string(ORV_TEST_MEDIA "/") + name; }
+
+bool eventually(const std::function<bool()>& condition, int seconds) {
+    const auto deadline = std::chrono::steady_clock::now() + std::chrono::seconds(seconds);
+    while (!condition()) {
+        if (std::chrono::steady_clock::now() > deadline) return false;
+        std::this_thread::sleep_for(std::chrono::milliseconds(2));
+    }
+    return true;
+}
+
+bool remains(const std::function<bool()>& condition) {
+    const auto end = std::chrono::steady_clock::now() + std::chrono::milliseconds(500);
+    while (std::chrono::steady_clock::now() < end) {
+        if (!condition()) return false;
+        std::this_thread::sleep_for(std::chrono::milliseconds(5));
+    }
+    return true;
+}
+
+PlayerTest::PlayerTest() {
+    player->setNotifyCallback(events);
+    player->setVideoSurfaceTexture(sink);
+}
+
+PlayerTest::~PlayerTest() { player->release(); }
+
+void PlayerTest::open(const std::string& name) {
+    ASSERT_EQ(android::NO_ERROR, player->setDataSource(media(name).c_str(), nullptr));
+    ASSERT_EQ(android::NO_ERROR, player->prepare());
+}
+
+void PlayerTest::playToEnd() {
+    ASSERT_EQ(android::NO_ERROR, player->start());
+    ASSERT_TRUE(events->waitFor(android::MEDIA_PLAYBACK_COMPLETE));
+}
+
+int PlayerTest::position() const {
+    int msec = -1;
+    EXPECT_EQ(android::NO_ERROR, player->getCurrentPosition(&msec));
+    return msec;
+}
+
+int PlayerTest::duration() const {
+    int msec = -1;
+    EXPECT_EQ(android::NO_ERROR, player->getDuration(&msec));
+    return msec;
+}
+
+int PlayerTest::speed() const {
+    int speed = -1;
+    EXPECT_TRUE(player->getSpeed(speed));
+    return speed;
+}
+
+}  // namespace orvtest

@@ -1,0 +1,44 @@
+// SPDX-License-Identifier: Apache-2.0
+#pragma once
+
+#include <gtest/gtest.h>
+#include <orvtarn/TarnPlayer.h>
+
+#include <functional>
+#include <string>
+
+#include "EventRecorder.h"
+#include "FrameSink.h"
+
+namespace orvtest {
+
+// The path of a file of tests/media.
+std::string media(const std::string& name);
+
+// Waits for a condition, asking again and again; false after the seconds.
+bool eventually(const std::function<bool()>& condition, int seconds = 15);
+
+// Whether a condition goes on to hold for half a second.
+bool remains(const std::function<bool()>& condition);
+
+// A player with a surface and a listener, released at the end.
+class PlayerTest : public testing::Test {
+protected:
+    PlayerTest();
+    ~PlayerTest() override;
+
+    // From a file of tests/media to the prepared state.
+    void open(const std::string& name);
+    // Starts and waits for the end of the media.
+    void playToEnd();
+
+    int position() const;
+    int duration() const;
+    int speed() const;
+
+    android::sp<FrameSink> sink = new FrameSink;
+    android::sp<EventRecorder> events = new EventRecorder;
+    android::sp<android::TarnPlayer> player = new android::TarnPlayer(-1);
+};
+
+}  // namespace orvtest
