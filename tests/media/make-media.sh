@@ -10,8 +10,8 @@ set -eu
 
 FILES="video.mp4 video.mkv video.ts video.avi slides.mkv rotated.mp4 hd.mp4 hd709.mp4 odd.mkv
        alpha.mov still.png silent.mkv tracks.mkv tracks.mp4 tagged.mp3 tagged.ogg broken-tags.mp4
-       cover.jpg back.png covered.mp3 covered.flac covered.m4a covered.mkv garbage.bin
-       truncated.mp4 truncated.mkv"
+       front.jpg back.png covered.mp3 covered.flac covered.m4a covered.mkv noise.bin
+       cut.mp4 cut.mkv"
 
 quiet_ffmpeg() { ffmpeg -nostdin -v error -y "$@"; }
 
@@ -138,14 +138,14 @@ make_broken_tags_mp4() {
         -metadata date=unknown "$1"
 }
 
-make_cover_jpg() { quiet_ffmpeg -f lavfi -i "testsrc=size=96x64:duration=1:rate=1" -frames:v 1 "$1"; }
+make_front_jpg() { quiet_ffmpeg -f lavfi -i "testsrc=size=96x64:duration=1:rate=1" -frames:v 1 "$1"; }
 make_back_png() { quiet_ffmpeg -f lavfi -i "color=blue:size=32x32:duration=1:rate=1" -frames:v 1 "$1"; }
 
 # The back of the sleeve comes first, to be told from the front. The arguments:
 # the codec and the file.
 covered() {
-    need cover.jpg back.png
-    quiet_ffmpeg -f lavfi -i "sine=440:duration=2" -i "$folder/back.png" -i "$folder/cover.jpg" \
+    need front.jpg back.png
+    quiet_ffmpeg -f lavfi -i "sine=440:duration=2" -i "$folder/back.png" -i "$folder/front.jpg" \
         -map 0 -map 1 -map 2 -c:a "$1" -c:v copy -disposition:v attached_pic \
         -metadata:s:v:0 comment="Cover (back)" -metadata:s:v:1 comment="Cover (front)" "$2"
 }
@@ -154,20 +154,20 @@ make_covered_mp3() { covered libmp3lame "$1"; }
 make_covered_flac() { covered flac "$1"; }
 
 make_covered_m4a() {
-    need cover.jpg
-    quiet_ffmpeg -f lavfi -i "sine=440:duration=2" -i "$folder/cover.jpg" -map 0 -map 1 \
+    need front.jpg
+    quiet_ffmpeg -f lavfi -i "sine=440:duration=2" -i "$folder/front.jpg" -map 0 -map 1 \
         -c:a aac -c:v copy -disposition:v attached_pic "$1"
 }
 
 make_covered_mkv() {
-    need cover.jpg silent.mkv
-    quiet_ffmpeg -i "$folder/silent.mkv" -attach "$folder/cover.jpg" -c copy \
+    need front.jpg silent.mkv
+    quiet_ffmpeg -i "$folder/silent.mkv" -attach "$folder/front.jpg" -c copy \
         -metadata:s:t mimetype=image/jpeg "$1"
 }
 
-make_garbage_bin() { yes 'neither sound nor picture' | head -c 65536 >"$1"; }
-make_truncated_mp4() { need video.mp4 && head -c 20000 "$folder/video.mp4" >"$1"; }
-make_truncated_mkv() { need video.mkv && head -c 40000 "$folder/video.mkv" >"$1"; }
+make_noise_bin() { yes 'neither sound nor picture' | head -c 65536 >"$1"; }
+make_cut_mp4() { need video.mp4 && head -c 20000 "$folder/video.mp4" >"$1"; }
+make_cut_mkv() { need video.mkv && head -c 40000 "$folder/video.mkv" >"$1"; }
 
 # Makes each file that is not there yet, under another name until it is whole.
 need() {
