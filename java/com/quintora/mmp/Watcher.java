@@ -19,7 +19,10 @@ final class Watcher {
     private static final int PREPARING_LATER = 100;
     private static final int PLAYING = 50;
     private static final int RESTING = 500;
+    private static final int RESTING_LONG = 5000;
     private static final int NO_MORE = -1;
+
+    private static final int FULL = 100;
 
     // Every how many looks at a playing player the slow values are asked for.
     private static final int SLOW_EVERY = 10;
@@ -34,6 +37,7 @@ final class Watcher {
     // Used on the watching thread only.
     private int looks;
     private int lastPosition;
+    private int lastPercent;
 
     Watcher(WeakReference<OrvMediaPlayer> watched) {
         this.watched = watched;
@@ -171,15 +175,18 @@ final class Watcher {
     }
 
     private int observeResting(OrvMediaPlayer player, int epoch) {
-        int percent = observeSlow(player, epoch);
-        return percent < 100 ? RESTING : NO_MORE;
+        int before = lastPercent;
+        observeSlow(player, epoch);
+        if (lastPercent >= FULL) {
+            return NO_MORE;
+        }
+        return lastPercent == before ? RESTING_LONG : RESTING;
     }
 
-    private static int observeSlow(OrvMediaPlayer player, int epoch) {
-        int percent = player.native_getBufferPercent();
-        player.events().buffering(epoch, percent);
+    private void observeSlow(OrvMediaPlayer player, int epoch) {
+        lastPercent = player.native_getBufferPercent();
+        player.events().buffering(epoch, lastPercent);
         player.events().videoSize(
                 epoch, player.native_getVideoWidth(), player.native_getVideoHeight());
-        return percent;
     }
 }
