@@ -1,15 +1,29 @@
 // SPDX-License-Identifier: Apache-2.0
 package com.quintora.orv.player;
 
+import java.io.IOException;
+import java.nio.file.AccessDeniedException;
+import java.nio.file.NoSuchFileException;
+import java.nio.file.Path;
+
 /** Something the user can be told in one sentence; the message is that sentence. */
 public final class Failure extends Exception {
-    private static final long serialVersionUID = 1;
-
     public Failure(String message) {
         super(message);
     }
 
     public Failure(String message, Throwable cause) {
         super(message, cause);
+    }
+
+    /** A file that cannot be written. */
+    static Failure writing(Path file, IOException cause) {
+        String reason = cause.getMessage();
+        if (cause instanceof NoSuchFileException) {
+            reason = "its folder does not exist";
+        } else if (cause instanceof AccessDeniedException) {
+            reason = "that is not allowed";
+        }
+        return new Failure("cannot write '" + file + "': " + reason, cause);
     }
 }

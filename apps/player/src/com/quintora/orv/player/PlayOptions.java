@@ -2,6 +2,7 @@
 package com.quintora.orv.player;
 
 import com.quintora.mmp.util.PcmMediaInfo;
+import java.nio.file.Path;
 import picocli.CommandLine.Option;
 import picocli.CommandLine.Parameters;
 
@@ -81,4 +82,18 @@ public final class PlayOptions {
 
     @Option(names = "--log", description = "Show the native library's log.")
     boolean log;
+
+    /** What stands in a window's title bar: the file's name, or the whole URL. */
+    public String title() {
+        return source.contains("://") ? source : String.valueOf(Path.of(source).getFileName());
+    }
+
+    /** 0 to 100. */
+    public int volume() {
+        return volume;
+    }
+
+    public boolean reportsStats() {
+        return stats;
+    }
 }

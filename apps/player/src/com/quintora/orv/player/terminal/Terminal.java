@@ -12,6 +12,7 @@ public final class Terminal {
     private final PrintStream out;
     private final int columns;
     private boolean drawing;
+    private boolean closed;
 
     Terminal(PrintStream out, int columns) {
         this.out = out;
@@ -33,6 +34,9 @@ public final class Terminal {
 
     /** Draws over the line that was drawn before. */
     synchronized void draw(String line) {
+        if (closed) {
+            return;
+        }
         out.print((drawing ? "" : HIDE_CURSOR) + CLEAR_LINE + line);
         out.flush();
         drawing = true;
@@ -41,7 +45,9 @@ public final class Terminal {
     /** Ends the drawn line, and writes one of its own. */
     public synchronized void line(String line) {
         restore();
-        out.println(line);
+        if (!closed) {
+            out.println(line);
+        }
     }
 
     /** Leaves the terminal as it was found; may be called at any time. */
@@ -51,5 +57,11 @@ public final class Terminal {
             out.flush();
             drawing = false;
         }
+    }
+
+    /** Restores the terminal, and writes nothing more. */
+    public synchronized void close() {
+        restore();
+        closed = true;
     }
 }

@@ -6,6 +6,8 @@ import java.awt.Font;
 import java.awt.Graphics;
 import java.awt.Graphics2D;
 import java.awt.RenderingHints;
+import javax.swing.BorderFactory;
+import javax.swing.UIManager;
 
 /** The window's colours, letters and measures (pixels). */
 final class Theme {
@@ -29,6 +31,14 @@ final class Theme {
     static final int CORNER = 10;
 
     private Theme() {}
+
+    /** Gives what Swing draws itself the same look. Call before the first component is made. */
+    static void install() {
+        UIManager.put("ToolTip.background", RAISED);
+        UIManager.put("ToolTip.foreground", TEXT);
+        UIManager.put("ToolTip.font", SMALL);
+        UIManager.put("ToolTip.border", BorderFactory.createEmptyBorder(4, 8, 4, 8));
+    }
 
     static Graphics2D smooth(Graphics g) {
         Graphics2D g2 = (Graphics2D) g.create();

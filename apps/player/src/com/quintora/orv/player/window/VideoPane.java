@@ -1,26 +1,71 @@
 // SPDX-License-Identifier: Apache-2.0
 package com.quintora.orv.player.window;
 
+import java.awt.Color;
 import java.awt.Dimension;
 import java.awt.Graphics;
 import java.awt.Graphics2D;
 import java.awt.Rectangle;
 import java.awt.RenderingHints;
 import java.awt.image.BufferedImage;
+import java.awt.image.DataBufferInt;
+import java.nio.ByteBuffer;
 import javax.swing.JComponent;
+import javax.swing.Timer;
 
-/** Shows the newest frame, as large as fits with its proportions kept. */
+/** Shows the newest frame, as large as fits with its proportions kept, and short notices on it. */
 final class VideoPane extends JComponent {
-    private BufferedImage frame;
+    private static final int NOTICE_MS = 1_200;
+
+    // The one that is painted and the one that is filled; they change places under the lock.
+    private final Object lock = new Object();
+    private BufferedImage front;
+    private BufferedImage back;
+
+    private String notice = "";
+    private final Timer noticeEnd = new Timer(NOTICE_MS, event -> setNotice(""));
 
     VideoPane() {
         setOpaque(true);
+        noticeEnd.setRepeats(false);
         getAccessibleContext().setAccessibleName("Video");
     }
 
-    /** Call on the window's thread; the image must not change while it is shown. */
-    void show(BufferedImage frame) {
-        this.frame = frame;
+    /**
+     * Shows a frame from now on; may be called on any one thread.
+     *
+     * @param pixels rows of 32-bit pixels that read 0xXXRRGGBB
+     * @param stride bytes from row to row
+     */
+    void draw(ByteBuffer pixels, int width, int height, int stride) {
+        if (back == null || back.getWidth() != width || back.getHeight() != height) {
+            back = new BufferedImage(width, height, BufferedImage.TYPE_INT_RGB);
+        }
+        int[] target = ((DataBufferInt) back.getRaster().getDataBuffer()).getData();
+        var source = pixels.asIntBuffer();
+        for (int y = 0; y < height; y++) {
+            source.get(y * (stride / 4), target, y * width, width);
+        }
+        draw(back);
+    }
+
+    /** Shows a still picture, which must not change any more. */
+    void draw(BufferedImage picture) {
+        synchronized (lock) {
+            back = front;
+            front = picture;
+        }
+        repaint();
+    }
+
+    /** Writes a few words onto the picture for a moment. Call on the window's thread. */
+    void tell(String words) {
+        setNotice(words);
+        noticeEnd.restart();
+    }
+
+    private void setNotice(String words) {
+        notice = words;
         repaint();
     }
 
@@ -31,17 +76,37 @@ final class VideoPane extends JComponent {
 
     @Override
     protected void paintComponent(Graphics graphics) {
-        graphics.setColor(Theme.STAGE);
-        graphics.fillRect(0, 0, getWidth(), getHeight());
-        if (frame == null) {
+        synchronized (lock) {
+            paintFrame((Graphics2D) graphics);
+        }
+        if (!notice.isEmpty()) {
+            paintNotice(graphics);
+        }
+    }
+
+    private void paintFrame(Graphics2D g) {
+        g.setColor(Theme.STAGE);
+        g.fillRect(0, 0, getWidth(), getHeight());
+        if (front == null) {
             return;
         }
-        Rectangle place = fit(frame.getWidth(), frame.getHeight(), getWidth(), getHeight());
-        ((Graphics2D) graphics)
-                .setRenderingHint(
-                        RenderingHints.KEY_INTERPOLATION,
-                        RenderingHints.VALUE_INTERPOLATION_BILINEAR);
-        graphics.drawImage(frame, place.x, place.y, place.width, place.height, null);
+        Rectangle place = fit(front.getWidth(), front.getHeight(), getWidth(), getHeight());
+        g.setRenderingHint(
+                RenderingHints.KEY_INTERPOLATION, RenderingHints.VALUE_INTERPOLATION_BILINEAR);
+        g.drawImage(front, place.x, place.y, place.width, place.height, null);
+    }
+
+    private void paintNotice(Graphics graphics) {
+        Graphics2D g = Theme.smooth(graphics);
+        g.setFont(Theme.BODY.deriveFont(16f));
+        var metrics = g.getFontMetrics();
+        int width = metrics.stringWidth(notice) + 28;
+        int height = metrics.getHeight() + 16;
+        g.setColor(new Color(0, 0, 0, 170));
+        g.fillRoundRect(20, 20, width, height, Theme.CORNER * 2, Theme.CORNER * 2);
+        g.setColor(Theme.TEXT);
+        g.drawString(notice, 34, 28 + metrics.getAscent());
+        g.dispose();
     }
 
     /** The largest centred place of those proportions in a room. */

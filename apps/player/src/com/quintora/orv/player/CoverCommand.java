@@ -1,0 +1,42 @@
+// SPDX-License-Identifier: Apache-2.0
+package com.quintora.orv.player;
+
+import com.quintora.mmp.OrvMediaPlayer;
+import java.io.IOException;
+import java.nio.file.Files;
+import java.nio.file.Path;
+import java.util.concurrent.Callable;
+import picocli.CommandLine.Command;
+import picocli.CommandLine.Option;
+import picocli.CommandLine.Parameters;
+
+/** Writes the picture inside a media file. */
+@Command(
+        name = "cover",
+        mixinStandardHelpOptions = true,
+        description = "Writes the picture inside a file, such as an album's cover, byte for byte.")
+final class CoverCommand implements Callable<Integer> {
+    @Parameters(paramLabel = "FILE", description = "A media file or URL.")
+    private String source;
+
+    @Parameters(paramLabel = "OUT", description = "Where to write the picture.")
+    private Path out;
+
+    @Option(names = "--log", description = "Show the native library's log.")
+    private boolean log;
+
+    @Override
+    public Integer call() throws Failure {
+        try (OrvMediaPlayer player = Media.open(source)) {
+            byte[] picture =
+                    player.pictures()
+                            .embedded()
+                            .orElseThrow(
+                                    () -> new Failure("there is no picture inside '" + source + "'"));
+            Files.write(out, picture);
+        } catch (IOException e) {
+            throw Failure.writing(out, e);
+        }
+        return 0;
+    }
+}

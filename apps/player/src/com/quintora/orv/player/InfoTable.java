@@ -1,0 +1,97 @@
+// SPDX-License-Identifier: Apache-2.0
+package com.quintora.orv.player;
+
+import java.util.ArrayList;
+import java.util.List;
+import java.util.Locale;
+
+/** What is known of media, as lines for people. */
+final class InfoTable {
+    private final List<String> lines = new ArrayList<>();
+
+    private InfoTable() {}
+
+    static List<String> of(MediaInfo info) {
+        InfoTable table = new InfoTable();
+        table.addGeneral(info);
+        info.video().forEach(table::addVideo);
+        info.audio().forEach(table::addAudio);
+        info.subtitles().forEach(table::addSubtitle);
+        info.chapters().forEach(table::addChapter);
+        return table.lines;
+    }
+
+    private void addGeneral(MediaInfo info) {
+        add("source", info.source());
+        add("container", info.container());
+        add("duration", info.durationMs() > 0 ? precise(info.durationMs()) : "unknown");
+        add("bit rate", bitRate(info.bitRate()));
+        info.metadata().forEach((name, value) -> add(name, value.toString()));
+    }
+
+    private void addVideo(MediaInfo.Video track) {
+        add(
+                "video " + track.index(),
+                join(
+                        track.codec(),
+                        track.width() + "x" + track.height(),
+                        track.frameRate() > 0 ? number(track.frameRate()) + " fps" : "",
+                        bitRate(track.bitRate()),
+                        String.join(", ", track.flags())));
+    }
+
+    private void addAudio(MediaInfo.Audio track) {
+        add(
+                "audio " + track.index(),
+                join(
+                        track.codec(),
+                        named(track.language(), track.title()),
+                        track.channelLayout().isEmpty()
+                                ? track.channels() + " channels"
+                                : track.channelLayout(),
+                        track.sampleRate() + " Hz",
+                        bitRate(track.bitRate()),
+                        String.join(", ", track.flags())));
+    }
+
+    private void addSubtitle(MediaInfo.Subtitle track) {
+        add(
+                "subtitles " + track.index(),
+                join(
+                        track.codec(),
+                        named(track.language(), track.title()),
+                        String.join(", ", track.flags())));
+    }
+
+    private void addChapter(MediaInfo.Mark mark) {
+        add("chapter " + mark.index(), join(precise(mark.startMs()), mark.title()));
+    }
+
+    private void add(String name, String value) {
+        if (!value.isEmpty()) {
+            lines.add(String.format("%-12s  %s", name, value));
+        }
+    }
+
+    private static String named(String language, String title) {
+        String name = language.isEmpty() ? "" : TrackNames.language(language);
+        return title.isEmpty() ? name : (name.isEmpty() ? "" : name + " ") + "\"" + title + "\"";
+    }
+
+    private static String join(String... parts) {
+        return String.join("  ", List.of(parts).stream().filter(part -> !part.isEmpty()).toList());
+    }
+
+    private static String bitRate(int bitsPerSecond) {
+        return bitsPerSecond > 0 ? Math.round(bitsPerSecond / 1000.0) + " kbit/s" : "";
+    }
+
+    private static String precise(int millis) {
+        return String.format(Locale.ROOT, "%s.%03d", Times.clock(millis), millis % 1000);
+    }
+
+    private static String number(double value) {
+        String text = String.format(Locale.ROOT, "%.3f", value);
+        return text.replaceAll("\\.?0+$", "");
+    }
+}

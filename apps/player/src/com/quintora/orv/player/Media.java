@@ -1,0 +1,23 @@
+// SPDX-License-Identifier: Apache-2.0
+package com.quintora.orv.player;
+
+import com.quintora.mmp.OrvMediaPlayer;
+import java.io.IOException;
+
+/** Opens media to look into, not to play. */
+final class Media {
+    private Media() {}
+
+    /** Gives a prepared player, which the caller closes. Blocks until the media is open. */
+    static OrvMediaPlayer open(String source) throws Failure {
+        OrvMediaPlayer player = new OrvMediaPlayer();
+        try {
+            player.setDataSource(source);
+            player.prepare();
+            return player;
+        } catch (IOException | SecurityException e) {
+            player.close();
+            throw new Failure(e.getMessage(), e);
+        }
+    }
+}

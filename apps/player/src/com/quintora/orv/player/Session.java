@@ -1,0 +1,202 @@
+// SPDX-License-Identifier: Apache-2.0
+package com.quintora.orv.player;
+
+import android.media.Image;
+import com.quintora.mmp.ChannelStreamSource;
+import com.quintora.mmp.MediaException;
+import com.quintora.mmp.OrvMediaPlayer;
+import com.quintora.mmp.PlayerListener;
+import com.quintora.mmp.VideoTrack;
+import java.io.IOException;
+import java.nio.file.Path;
+import java.util.Locale;
+import java.util.concurrent.CountDownLatch;
+import java.util.function.Consumer;
+
+/**
+ * One playback: a player, its frames, and how it went. Any thread may call any method; those that
+ * name a failure block while the player works. Closing it ends a call that blocks elsewhere.
+ */
+public final class Session implements AutoCloseable {
+    private final PlayOptions options;
+    private final OrvMediaPlayer player = new OrvMediaPlayer();
+    private final FramePump frames;
+    private final CountDownLatch ended = new CountDownLatch(1);
+    private final Stopwatch stopwatch = new Stopwatch();
+    private volatile Failure failure;
+
+    /** The screen is called with each frame, on a thread of its own, and must not keep it. */
+    public Session(PlayOptions options, Consumer<Image> screen) {
+        this.options = options;
+        frames = new FramePump(screen);
+        player.addListener(new Ending());
+    }
+
+    public OrvMediaPlayer player() {
+        return player;
+    }
+
+    /** Asks for frames of that size from now on; 0 x 0 for the video's own. */
+    public void requestFrameSize(int width, int height) {
+        frames.reader().setDefaultSize(width, height);
+    }
+
+    /** Opens the media and brings it to where it shall begin. */
+    public void open() throws Failure {
+        try {
+            setSource();
+            player.setSurface(frames.reader().getSurface());
+            frames.start();
+            player.prepare();
+            if (options.start > 0) {
+                player.seekTo(options.start);
+            }
+            frames.expect(player.tracks().currentVideo().map(VideoTrack::frameRate).orElse(0.0));
+            applyOptions();
+        } catch (IOException | SecurityException e) {
+            throw new Failure(e.getMessage(), e);
+        }
+    }
+
+    public void start() {
+        if (options.section != null) {
+            new SectionRepeater(player, options.section).start();
+        }
+        stopwatch.start(player.getCurrentPosition());
+        player.start();
+    }
+
+    public void seekTo(int millis) {
+        frames.expectJump();
+        player.seekTo(millis);
+        frames.expectJump();
+    }
+
+    public void setSpeed(double speed) throws Failure {
+        try {
+            frames.expectJump();
+            player.trickPlay().setSpeed(speed);
+            if (speed != 1) {
+                frames.expect(0);
+            }
+        } catch (IllegalArgumentException e) {
+            throw new Failure(e.getMessage(), e);
+        }
+    }
+
+    /** From 0 to 1. */
+    public void setVolume(double level) {
+        player.audio().setVolume((float) level, (float) level);
+    }
+
+    public void selectAudio(int index) throws Failure {
+        if (!player.tracks().selectAudio(index)) {
+            throw new Failure(noTrack("sound", index, player.tracks().audio().size()));
+        }
+    }
+
+    /** Shows a subtitle track; a negative index is for none. */
+    public void selectSubtitle(int index) throws Failure {
+        if (index < 0) {
+            player.subtitles().hide();
+            return;
+        }
+        int count = player.tracks().subtitles().size();
+        if (index >= count) {
+            throw new Failure(noTrack("subtitle", index, count));
+        }
+        player.subtitles().show(index);
+    }
+
+    public void addSubtitles(String path) throws Failure {
+        int before = player.tracks().subtitles().size();
+        if (path.toLowerCase(Locale.ROOT).endsWith(".idx")) {
+            player.subtitles().add(path.substring(0, path.length() - 3) + "sub", path);
+        } else {
+            player.subtitles().add(path);
+        }
+        if (player.tracks().subtitles().size() == before) {
+            throw new Failure("cannot read subtitles from '" + path + "'");
+        }
+    }
+
+    public Snapshot snapshot() {
+        return new Snapshot(
+                player.getCurrentPosition(),
+                player.getDuration(),
+                player.isPlaying(),
+                player.trickPlay().getSpeed(),
+                player.trickPlay().getBufferedPercent(),
+                frames.shown(),
+                frames.dropped());
+    }
+
+    /** Reaches zero when the media has come to its end or has failed. */
+    public CountDownLatch ended() {
+        return ended;
+    }
+
+    /** What ended the playback, or null when that was the end of the media. */
+    public Failure failure() {
+        return failure;
+    }
+
+    /** How quickly and how smoothly it went, in a line. */
+    public String report() {
+        return stopwatch.report(frames);
+    }
+
+    @Override
+    public void close() {
+        frames.close();
+        player.release();
+    }
+
+    private void setSource() throws IOException {
+        if (options.pcm != null) {
+            player.setPcmFormat(options.pcm);
+        }
+        if (options.stream) {
+            player.setDataSource(ChannelStreamSource.open(Path.of(options.source)));
+        } else {
+            player.setDataSource(options.source);
+        }
+    }
+
+    private void applyOptions() throws Failure {
+        player.setLooping(options.loop);
+        setVolume(options.volume / 100.0);
+        if (options.audioTrack != null) {
+            selectAudio(options.audioTrack);
+        }
+        if (options.subtitle != null) {
+            addSubtitles(options.subtitle);
+        }
+        if (options.subtitleTrack != null) {
+            selectSubtitle(options.subtitleTrack);
+        }
+        if (options.speed != 1) {
+            setSpeed(options.speed);
+        }
+    }
+
+    private static String noTrack(String kind, int index, int count) {
+        return count == 0
+                ? "the media has no " + kind + " track"
+                : "there is no " + kind + " track " + index + "; they are 0 to " + (count - 1);
+    }
+
+    private final class Ending implements PlayerListener {
+        @Override
+        public void onCompletion(OrvMediaPlayer player) {
+            stopwatch.stop(player.getCurrentPosition());
+            ended.countDown();
+        }
+
+        @Override
+        public void onError(OrvMediaPlayer player, MediaException error) {
+            failure = new Failure(error.getMessage(), error);
+            ended.countDown();
+        }
+    }
+}

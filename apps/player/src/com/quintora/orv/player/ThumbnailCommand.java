@@ -1,0 +1,131 @@
+// SPDX-License-Identifier: Apache-2.0
+package com.quintora.orv.player;
+
+import com.quintora.mmp.ColorMode;
+import com.quintora.mmp.OrvMediaPlayer;
+import com.quintora.mmp.Pictures;
+import com.quintora.mmp.Thumbnail;
+import java.awt.image.BufferedImage;
+import java.awt.image.DataBufferInt;
+import java.io.IOException;
+import java.nio.ByteBuffer;
+import java.nio.ByteOrder;
+import java.nio.file.Files;
+import java.nio.file.Path;
+import java.util.concurrent.Callable;
+import javax.imageio.ImageIO;
+import picocli.CommandLine.Command;
+import picocli.CommandLine.Model.CommandSpec;
+import picocli.CommandLine.Option;
+import picocli.CommandLine.ParameterException;
+import picocli.CommandLine.Parameters;
+import picocli.CommandLine.Spec;
+
+/** Writes one picture of a video. */
+@Command(
+        name = "thumbnail",
+        mixinStandardHelpOptions = true,
+        description = "Writes one picture of a video as a PNG file.")
+final class ThumbnailCommand implements Callable<Integer> {
+    private static final int USUAL_HEIGHT = 180;
+
+    @Parameters(paramLabel = "FILE", description = "A media file or URL.")
+    private String source;
+
+    @Parameters(paramLabel = "OUT.png", description = "Where to write the picture.")
+    private Path out;
+
+    @Option(
+            names = "--at",
+            paramLabel = "TIME",
+            defaultValue = "0",
+            converter = Times.Converter.class,
+            description = "Of which moment: seconds, or h:mm:ss.")
+    private int at;
+
+    @Option(
+            names = "--size",
+            paramLabel = "WxH",
+            converter = Size.Converter.class,
+            description = "How large, at most 8192x255; without it, 180 rows in the video's shape.")
+    private Size size;
+
+    @Option(names = "--log", description = "Show the native library's log.")
+    private boolean log;
+
+    @Spec private CommandSpec spec;
+
+    @Override
+    public Integer call() throws Failure {
+        check();
+        try (OrvMediaPlayer player = Media.open(source)) {
+            seek(player);
+            write(draw(player));
+        }
+        return 0;
+    }
+
+    private void check() {
+        if (!out.toString().toLowerCase().endsWith(".png")) {
+            throw new ParameterException(
+                    spec.commandLine(), "a thumbnail is a PNG file; '" + out + "' is not named so");
+        }
+        if (size != null && size.height() > Pictures.MAX_THUMBNAIL_HEIGHT) {
+            throw new ParameterException(
+                    spec.commandLine(),
+                    "a thumbnail has at most "
+                            + Pictures.MAX_THUMBNAIL_HEIGHT
+                            + " rows, not "
+                            + size.height());
+        }
+        if (size != null && size.width() > Pictures.MAX_THUMBNAIL_WIDTH) {
+            throw new ParameterException(
+                    spec.commandLine(),
+                    "a thumbnail has at most "
+                            + Pictures.MAX_THUMBNAIL_WIDTH
+                            + " columns, not "
+                            + size.width());
+        }
+    }
+
+    private void seek(OrvMediaPlayer player) throws Failure {
+        if (player.getVideoWidth() == 0) {
+            throw new Failure("there is no video in '" + source + "'");
+        }
+        int duration = player.getDuration();
+        if (duration > 0 && at > duration) {
+            throw new Failure(
+                    "'" + source + "' ends at " + Times.clock(duration) + ", before that moment");
+        }
+        player.seekTo(at);
+    }
+
+    private Thumbnail draw(OrvMediaPlayer player) throws Failure {
+        Size wanted = size != null ? size : shapeOf(player);
+        return player.pictures()
+                .thumbnail(wanted.width(), wanted.height(), ColorMode.XRGB8888)
+                .orElseThrow(() -> new Failure("no picture could be made of '" + source + "'"));
+    }
+
+    private static Size shapeOf(OrvMediaPlayer player) {
+        double ratio = (double) player.getVideoWidth() / player.getVideoHeight();
+        int width = (int) Math.round(USUAL_HEIGHT * ratio);
+        return new Size(
+                Math.max(1, Math.min(Pictures.MAX_THUMBNAIL_WIDTH, width)), USUAL_HEIGHT);
+    }
+
+    private void write(Thumbnail picture) throws Failure {
+        BufferedImage image =
+                new BufferedImage(picture.width(), picture.height(), BufferedImage.TYPE_INT_RGB);
+        int[] pixels = ((DataBufferInt) image.getRaster().getDataBuffer()).getData();
+        ByteBuffer.wrap(picture.pixels())
+                .order(ByteOrder.LITTLE_ENDIAN)
+                .asIntBuffer()
+                .get(pixels);
+        try (var file = Files.newOutputStream(out)) {
+            ImageIO.write(image, "png", file);
+        } catch (IOException e) {
+            throw Failure.writing(out, e);
+        }
+    }
+}

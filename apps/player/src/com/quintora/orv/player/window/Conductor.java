@@ -1,0 +1,265 @@
+// SPDX-License-Identifier: Apache-2.0
+package com.quintora.orv.player.window;
+
+import com.quintora.mmp.MediaException;
+import com.quintora.mmp.OrvMediaPlayer;
+import com.quintora.mmp.PlayerListener;
+import com.quintora.orv.player.Failure;
+import com.quintora.orv.player.PlayOptions;
+import com.quintora.orv.player.Session;
+import com.quintora.orv.player.Snapshot;
+import java.awt.Component;
+import java.awt.EventQueue;
+import java.util.ArrayList;
+import java.util.List;
+import java.util.concurrent.Executors;
+import java.util.concurrent.RejectedExecutionException;
+import java.util.concurrent.ScheduledExecutorService;
+import java.util.concurrent.TimeUnit;
+import java.util.concurrent.atomic.AtomicInteger;
+
+/**
+ * Carries out what the window's controls ask, on a thread of its own, because the player's calls
+ * may take their time; and tells the window how things stand.
+ */
+final class Conductor implements Controls {
+    private static final int POLL_MS = 80;
+    private static final int NO_SEEK = -1;
+
+    /** A call of the player's. */
+    private interface Command {
+        void run() throws Failure;
+    }
+
+    private final Session session;
+    private final OrvMediaPlayer player;
+    private final Stage stage;
+    private final MediaDetails details;
+    private final ScheduledExecutorService worker =
+            Executors.newSingleThreadScheduledExecutor(
+                    task -> {
+                        Thread thread = new Thread(task, "conductor");
+                        thread.setDaemon(true);
+                        return thread;
+                    });
+    private final AtomicInteger pendingSeek = new AtomicInteger(NO_SEEK);
+    private volatile Failure failure;
+
+    // On the window's thread.
+    private double volume;
+    private boolean muted;
+
+    Conductor(Session session, Stage stage, PlayOptions options) {
+        this.session = session;
+        this.stage = stage;
+        player = session.player();
+        details = new MediaDetails(player);
+        volume = options.volume() / 100.0;
+        player.addListener(new Events());
+    }
+
+    /** Opens the media and plays it; the window tells what becomes of it. */
+    void begin() {
+        worker.execute(
+                () -> {
+                    try {
+                        session.open();
+                        details.read();
+                        EventQueue.invokeLater(() -> stage.showMedia(details, volume));
+                        session.start();
+                        worker.scheduleWithFixedDelay(this::poll, 0, POLL_MS, TimeUnit.MILLISECONDS);
+                    } catch (Failure e) {
+                        fail(e);
+                    } catch (IllegalStateException e) {
+                        // The window was closed meanwhile.
+                    }
+                });
+    }
+
+    void end() {
+        worker.shutdownNow();
+    }
+
+    Failure failure() {
+        return failure;
+    }
+
+    @Override
+    public void togglePlaying() {
+        later(
+                () -> {
+                    if (player.isPlaying()) {
+                        player.pause();
+                    } else {
+                        player.start();
+                    }
+                });
+    }
+
+    @Override
+    public void skip(int millis) {
+        stage.tell((millis < 0 ? "− " : "+ ") + Math.abs(millis) / 1000 + " s");
+        later(
+                () -> {
+                    int to = player.getCurrentPosition() + millis;
+                    session.seekTo(Math.max(0, Math.min(to, player.getDuration())));
+                });
+    }
+
+    // While the knob is dragged only its latest place counts.
+    @Override
+    public void seekTo(int millis) {
+        if (pendingSeek.getAndSet(millis) == NO_SEEK) {
+            later(() -> session.seekTo(pendingSeek.getAndSet(NO_SEEK)));
+        }
+    }
+
+    @Override
+    public void step(int frames) {
+        later(() -> player.trickPlay().step(frames));
+    }
+
+    @Override
+    public void setVolume(double level) {
+        volume = level;
+        muted = false;
+        applyVolume();
+    }
+
+    @Override
+    public void changeVolume(double by) {
+        setVolume(Math.max(0, Math.min(1, volume + by)));
+        stage.tell("Volume " + Math.round(volume * 100) + " %");
+    }
+
+    @Override
+    public void toggleMuted() {
+        muted = !muted;
+        stage.tell(muted ? "Sound off" : "Sound on");
+        applyVolume();
+    }
+
+    private void applyVolume() {
+        stage.showVolume(volume, muted);
+        double level = muted ? 0 : volume;
+        later(() -> session.setVolume(level));
+    }
+
+    @Override
+    public void changeSpeed(int steps) {
+        later(() -> applySpeed(Speeds.from(player.trickPlay().getSpeed(), steps)));
+    }
+
+    private void applySpeed(double speed) throws Failure {
+        session.setSpeed(speed);
+        EventQueue.invokeLater(() -> stage.tell(Speeds.label(speed)));
+    }
+
+    @Override
+    public void chooseSpeed(Component above) {
+        later(
+                () -> {
+                    double now = player.trickPlay().getSpeed();
+                    List<ChoiceMenu.Choice> choices = new ArrayList<>();
+                    for (double speed : Speeds.offered()) {
+                        choices.add(
+                                new ChoiceMenu.Choice(
+                                        Speeds.label(speed),
+                                        speed == now,
+                                        () -> later(() -> applySpeed(speed))));
+                    }
+                    openMenu(above, "Speed", choices);
+                });
+    }
+
+    @Override
+    public void chooseAudio(Component above) {
+        later(
+                () ->
+                        openMenu(
+                                above,
+                                "Sound track",
+                                details.audioChoices(
+                                        index -> later(() -> session.selectAudio(index)))));
+    }
+
+    @Override
+    public void chooseSubtitles(Component above) {
+        later(
+                () ->
+                        openMenu(
+                                above,
+                                "Subtitles",
+                                details.subtitleChoices(
+                                        index -> later(() -> session.selectSubtitle(index)))));
+    }
+
+    private static void openMenu(Component above, String title, List<ChoiceMenu.Choice> choices) {
+        EventQueue.invokeLater(() -> ChoiceMenu.open(above, title, choices));
+    }
+
+    @Override
+    public void toggleFullScreen() {
+        stage.toggleFullScreen();
+    }
+
+    @Override
+    public void leaveFullScreen() {
+        stage.leaveFullScreen();
+    }
+
+    @Override
+    public void quit() {
+        stage.close();
+    }
+
+    void requestFrameSize(int width, int height) {
+        session.requestFrameSize(width, height);
+    }
+
+    private void later(Command command) {
+        try {
+            worker.execute(() -> carryOut(command));
+        } catch (RejectedExecutionException e) {
+            // The window is closing.
+        }
+    }
+
+    // What the player refuses, such as a seek in a live stream, is worth a notice, no more.
+    private void carryOut(Command command) {
+        try {
+            command.run();
+        } catch (Failure | IllegalStateException | IllegalArgumentException e) {
+            if (failure == null) {
+                EventQueue.invokeLater(() -> stage.tell(e.getMessage()));
+            }
+        }
+    }
+
+    private void poll() {
+        try {
+            Snapshot now = session.snapshot();
+            EventQueue.invokeLater(() -> stage.show(now));
+        } catch (IllegalStateException e) {
+            worker.shutdown();
+        }
+    }
+
+    private void fail(Failure problem) {
+        failure = problem;
+        System.err.println("orv: " + problem.getMessage());
+        EventQueue.invokeLater(() -> stage.showFailure(problem.getMessage()));
+    }
+
+    private final class Events implements PlayerListener {
+        @Override
+        public void onError(OrvMediaPlayer player, MediaException error) {
+            fail(new Failure(error.getMessage(), error));
+        }
+
+        @Override
+        public void onVideoSizeChanged(OrvMediaPlayer player, int width, int height) {
+            EventQueue.invokeLater(() -> stage.showVideoSize(width, height));
+        }
+    }
+}

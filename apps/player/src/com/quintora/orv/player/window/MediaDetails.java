@@ -1,0 +1,115 @@
+// SPDX-License-Identifier: Apache-2.0
+package com.quintora.orv.player.window;
+
+import com.quintora.mmp.AudioTrack;
+import com.quintora.mmp.MediaMetadata;
+import com.quintora.mmp.OrvMediaPlayer;
+import com.quintora.mmp.SubtitleTrack;
+import com.quintora.orv.player.TrackNames;
+import java.awt.image.BufferedImage;
+import java.io.ByteArrayInputStream;
+import java.io.IOException;
+import java.util.ArrayList;
+import java.util.List;
+import java.util.OptionalInt;
+import java.util.function.IntConsumer;
+import javax.imageio.ImageIO;
+
+/** What the window needs to know of the media besides its picture. Not for the window's thread. */
+final class MediaDetails {
+    private final OrvMediaPlayer player;
+    private int videoTracks;
+    private int audioTracks;
+    private int subtitleTracks;
+    private List<SeekBar.Mark> chapters = List.of();
+    private String title = "";
+    private String artist = "";
+    private BufferedImage cover;
+
+    MediaDetails(OrvMediaPlayer player) {
+        this.player = player;
+    }
+
+    /** Call once, when the media is prepared. */
+    void read() {
+        videoTracks = player.tracks().video().size();
+        audioTracks = player.tracks().audio().size();
+        subtitleTracks = player.tracks().subtitles().size();
+        chapters =
+                player.tracks().chapters().stream()
+                        .map(chapter -> new SeekBar.Mark(chapter.startMillis(), chapter.title()))
+                        .toList();
+        title = player.tracks().metadata().map(MediaMetadata::title).orElse("");
+        artist = player.tracks().metadata().map(MediaMetadata::artist).orElse("");
+        if (videoTracks == 0) {
+            cover = player.pictures().embedded().map(MediaDetails::decode).orElse(null);
+        }
+    }
+
+    boolean hasVideo() {
+        return videoTracks > 0;
+    }
+
+    int audioTracks() {
+        return audioTracks;
+    }
+
+    int subtitleTracks() {
+        return subtitleTracks;
+    }
+
+    List<SeekBar.Mark> chapters() {
+        return chapters;
+    }
+
+    String title() {
+        return title;
+    }
+
+    String artist() {
+        return artist;
+    }
+
+    /** The picture inside a sound file, or null. */
+    BufferedImage cover() {
+        return cover;
+    }
+
+    List<ChoiceMenu.Choice> audioChoices(IntConsumer select) {
+        OptionalInt current = player.tracks().currentAudio();
+        List<ChoiceMenu.Choice> choices = new ArrayList<>();
+        for (AudioTrack track : player.tracks().audio()) {
+            choices.add(
+                    choice(TrackNames.of(track), isAt(current, track.index()), track.index(), select));
+        }
+        return choices;
+    }
+
+    List<ChoiceMenu.Choice> subtitleChoices(IntConsumer select) {
+        OptionalInt current = player.tracks().currentSubtitle();
+        List<ChoiceMenu.Choice> choices = new ArrayList<>();
+        choices.add(choice("Off", current.isEmpty(), -1, select));
+        for (SubtitleTrack track : player.tracks().subtitles()) {
+            choices.add(
+                    choice(TrackNames.of(track), isAt(current, track.index()), track.index(), select));
+        }
+        return choices;
+    }
+
+    private static ChoiceMenu.Choice choice(
+            String text, boolean chosen, int index, IntConsumer select) {
+        return new ChoiceMenu.Choice(text, chosen, () -> select.accept(index));
+    }
+
+    private static boolean isAt(OptionalInt current, int index) {
+        return current.isPresent() && current.getAsInt() == index;
+    }
+
+    private static BufferedImage decode(byte[] bytes) {
+        try {
+            return ImageIO.read(new ByteArrayInputStream(bytes));
+        } catch (IOException e) {
+            return null; // A picture that cannot be shown is not worth a word.
+        }
+    }
+}

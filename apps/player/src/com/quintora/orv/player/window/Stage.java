@@ -1,0 +1,195 @@
+// SPDX-License-Identifier: Apache-2.0
+package com.quintora.orv.player.window;
+
+import android.media.Image;
+import com.quintora.orv.player.Snapshot;
+import java.awt.BorderLayout;
+import java.awt.CardLayout;
+import java.awt.Color;
+import java.awt.Dimension;
+import java.awt.GraphicsEnvironment;
+import java.awt.Rectangle;
+import java.awt.event.ComponentAdapter;
+import java.awt.event.ComponentEvent;
+import java.awt.event.MouseAdapter;
+import java.awt.event.MouseEvent;
+import java.awt.event.WindowAdapter;
+import java.awt.event.WindowEvent;
+import javax.swing.JFrame;
+import javax.swing.JPanel;
+import javax.swing.SwingUtilities;
+import javax.swing.WindowConstants;
+
+/** The window: the picture or a message, and the controls. On the window's thread but for draw. */
+final class Stage {
+    private static final String VIDEO = "video";
+    private static final String MESSAGE = "message";
+    private static final double LARGEST_PART_OF_SCREEN = 0.8;
+
+    private final String name;
+    private final VideoPane video = new VideoPane();
+    private final CardLayout cards = new CardLayout();
+    private final JPanel room = new JPanel(cards);
+    private JFrame frame;
+    private ControlBar bar;
+    private FullScreen fullScreen;
+    private MessagePanel message;
+    private Conductor conductor;
+    private Dimension videoSize;
+    private Runnable onClosed;
+
+    /** The name stands in the title bar. */
+    Stage(String name) {
+        this.name = name;
+    }
+
+    void open(Conductor conductor, Runnable onClosed) {
+        this.conductor = conductor;
+        this.onClosed = onClosed;
+        Theme.install();
+        frame = new JFrame(name);
+        bar = new ControlBar(conductor);
+        message = new MessagePanel();
+        room.add(video, VIDEO);
+        room.add(message, MESSAGE);
+        frame.add(room, BorderLayout.CENTER);
+        frame.add(bar, BorderLayout.SOUTH);
+        fullScreen = new FullScreen(frame, bar);
+        Keys.bind(frame.getRootPane(), conductor, bar);
+        listen();
+        room.setPreferredSize(new Dimension(854, 480));
+        frame.setMinimumSize(new Dimension(480, 300));
+        frame.pack();
+        frame.setLocationRelativeTo(null);
+        frame.setVisible(true);
+    }
+
+    /** Called with each frame, on the frames' thread. */
+    void draw(Image image) {
+        Image.Plane plane = image.getPlanes()[0];
+        video.draw(plane.getBuffer(), image.getWidth(), image.getHeight(), plane.getRowStride());
+    }
+
+    void showMedia(MediaDetails details, double volume) {
+        bar.showTracks(details.audioTracks(), details.subtitleTracks());
+        bar.seekBar().showMarks(details.chapters());
+        bar.showVolume(volume, false);
+        if (!details.title().isEmpty()) {
+            frame.setTitle(details.title());
+        }
+        if (details.cover() != null) {
+            video.draw(details.cover());
+        } else if (!details.hasVideo()) {
+            String title = details.title().isEmpty() ? name : details.title();
+            tellInstead(Glyph.AUDIO, Theme.ACCENT, title, details.artist());
+        }
+    }
+
+    void showVideoSize(int width, int height) {
+        boolean first = videoSize == null;
+        videoSize = new Dimension(width, height);
+        if (first && !fullScreen.isOn()) {
+            fitWindow();
+        }
+        requestFrames();
+    }
+
+    void show(Snapshot now) {
+        bar.show(now);
+        fullScreen.showPlaying(now.playing());
+    }
+
+    void showVolume(double level, boolean muted) {
+        bar.showVolume(level, muted);
+    }
+
+    void showFailure(String sentence) {
+        tellInstead(Glyph.ALERT, Theme.ALERT, "This cannot be played", sentence);
+    }
+
+    /** A few words on the picture. */
+    void tell(String words) {
+        video.tell(words);
+    }
+
+    void toggleFullScreen() {
+        fullScreen.set(!fullScreen.isOn());
+        bar.showFullScreen(fullScreen.isOn());
+    }
+
+    void leaveFullScreen() {
+        if (fullScreen.isOn()) {
+            toggleFullScreen();
+        }
+    }
+
+    void close() {
+        frame.dispose();
+        onClosed.run();
+    }
+
+    private void tellInstead(Glyph glyph, Color color, String title, String text) {
+        message.tell(glyph, color, title, text);
+        cards.show(room, MESSAGE);
+    }
+
+    /** As large as the video, within a part of the screen. */
+    private void fitWindow() {
+        Rectangle screen =
+                GraphicsEnvironment.getLocalGraphicsEnvironment().getMaximumWindowBounds();
+        int mostWidth = (int) (screen.width * LARGEST_PART_OF_SCREEN);
+        int mostHeight =
+                (int) (screen.height * LARGEST_PART_OF_SCREEN) - bar.getPreferredSize().height;
+        int width = Math.min(videoSize.width, mostWidth);
+        int height = Math.min(videoSize.height, mostHeight);
+        Rectangle place = VideoPane.fit(videoSize.width, videoSize.height, width, height);
+        room.setPreferredSize(place.getSize());
+        frame.pack();
+        frame.setLocationRelativeTo(null);
+    }
+
+    /** Lets the player draw in the size that is shown, so that nothing is scaled twice. */
+    private void requestFrames() {
+        if (videoSize == null || video.getWidth() == 0) {
+            return;
+        }
+        Rectangle place =
+                VideoPane.fit(
+                        videoSize.width, videoSize.height, video.getWidth(), video.getHeight());
+        conductor.requestFrameSize(place.width, place.height);
+    }
+
+    private void listen() {
+        frame.setDefaultCloseOperation(WindowConstants.DO_NOTHING_ON_CLOSE);
+        frame.addWindowListener(
+                new WindowAdapter() {
+                    @Override
+                    public void windowClosing(WindowEvent event) {
+                        close();
+                    }
+                });
+        video.addComponentListener(
+                new ComponentAdapter() {
+                    @Override
+                    public void componentResized(ComponentEvent event) {
+                        requestFrames();
+                    }
+                });
+        room.addMouseListener(
+                new MouseAdapter() {
+                    @Override
+                    public void mouseClicked(MouseEvent event) {
+                        if (SwingUtilities.isLeftMouseButton(event)) {
+                            onClick(event.getClickCount());
+                        }
+                    }
+                });
+    }
+
+    private void onClick(int clicks) {
+        conductor.togglePlaying();
+        if (clicks == 2) {
+            toggleFullScreen();
+        }
+    }
+}
