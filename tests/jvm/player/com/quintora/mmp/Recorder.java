@@ -1,0 +1,74 @@
+// SPDX-License-Identifier: Apache-2.0
+package com.quintora.mmp;
+
+import java.util.ArrayList;
+import java.util.List;
+import java.util.concurrent.CopyOnWriteArrayList;
+
+/** Writes down what a player tells. */
+class Recorder implements PlayerListener {
+    final List<String> told = new CopyOnWriteArrayList<>();
+    final List<Thread> threads = new CopyOnWriteArrayList<>();
+    volatile MediaException error;
+
+    @Override
+    public void onPrepared(OrvMediaPlayer player) {
+        note("prepared");
+    }
+
+    @Override
+    public void onCompletion(OrvMediaPlayer player) {
+        note("completion");
+    }
+
+    @Override
+    public void onSeekComplete(OrvMediaPlayer player) {
+        note("seek");
+    }
+
+    @Override
+    public void onVideoSizeChanged(OrvMediaPlayer player, int width, int height) {
+        note("size " + width + "x" + height);
+    }
+
+    @Override
+    public void onBufferingUpdate(OrvMediaPlayer player, int percent) {
+        note("buffering " + percent);
+    }
+
+    @Override
+    public void onError(OrvMediaPlayer player, MediaException failure) {
+        error = failure;
+        note("error");
+    }
+
+    @Override
+    public void onInfo(OrvMediaPlayer player, int what, int extra) {
+        note("info " + what + " " + extra);
+    }
+
+    @Override
+    public void onTimedText(OrvMediaPlayer player, byte[] payload) {
+        note("text " + (payload == null ? "null" : new String(payload)));
+    }
+
+    void await(String what) throws Exception {
+        Wait.until(what + " was told; it was " + told, () -> told.contains(what));
+    }
+
+    long count(String what) {
+        return told.stream().filter(what::equals).count();
+    }
+
+    /** What was told, without the amounts of buffered media, which vary. */
+    List<String> withoutBuffering() {
+        List<String> rest = new ArrayList<>(told);
+        rest.removeIf(what -> what.startsWith("buffering"));
+        return rest;
+    }
+
+    private void note(String what) {
+        threads.add(Thread.currentThread());
+        told.add(what);
+    }
+}

@@ -1,0 +1,217 @@
+// SPDX-License-Identifier: Apache-2.0
+package com.quintora.mmp;
+
+import static org.junit.jupiter.api.Assertions.assertArrayEquals;
+import static org.junit.jupiter.api.Assertions.assertEquals;
+import static org.junit.jupiter.api.Assertions.assertFalse;
+import static org.junit.jupiter.api.Assertions.assertNull;
+import static org.junit.jupiter.api.Assertions.assertSame;
+import static org.junit.jupiter.api.Assertions.assertThrows;
+import static org.junit.jupiter.api.Assertions.assertTrue;
+
+import java.io.IOException;
+import java.util.Arrays;
+import org.junit.jupiter.api.AfterEach;
+import org.junit.jupiter.api.BeforeEach;
+import org.junit.jupiter.api.Test;
+import org.junit.jupiter.params.ParameterizedTest;
+import org.junit.jupiter.params.provider.CsvSource;
+import org.junit.jupiter.params.provider.ValueSource;
+
+/** A source as the native half calls it. */
+class StreamAdapterTest {
+    private final OrvMediaPlayer player = new OrvMediaPlayer();
+    private final ScriptedSource source = new ScriptedSource(new byte[1000]);
+    private final StreamAdapter adapter = new StreamAdapter(source);
+
+    @BeforeEach
+    void describe() throws IOException {
+        for (int i = 0; i < source.bytes.length; i++) {
+            source.bytes[i] = (byte) i;
+        }
+        adapter.describeTo(player);
+    }
+
+    @AfterEach
+    void release() {
+        player.release();
+    }
+
+    @Test
+    void theDescriptionStandsInThePlayersFields() throws IOException {
+        MediaStreamSource described = new ScriptedSource(new byte[7]) {
+            @Override
+            public long durationMillis() {
+                return 1234;
+            }
+
+            @Override
+            public boolean mayStall() {
+                return true;
+            }
+        };
+        new StreamAdapter(described).describeTo(player);
+        assertEquals(7, player.mStreamSize);
+        assertEquals(1234, player.mStreamDuration);
+        assertTrue(player.mStallingSupport);
+        assertTrue(player.mStreamSeekable);
+        assertEquals(0, player.mDataSourceType);
+        source.seekable = false;
+        adapter.describeTo(player);
+        assertFalse(player.mStreamSeekable);
+        assertFalse(player.mStallingSupport);
+    }
+
+    @ParameterizedTest
+    @CsvSource({"-1, 0", "0, 0", "4294967294, 4294967294", "4294967295, 0", "5000000000, 0"})
+    void aSizeThatTheNativeHalfCannotCarryIsUnknown(long size, long field) throws IOException {
+        new StreamAdapter(new ScriptedSource(new byte[0]) {
+            @Override
+            public long size() {
+                return size;
+            }
+        }).describeTo(player);
+        assertEquals(field, player.mStreamSize);
+    }
+
+    @Test
+    void readsFillThePlayersBufferAndMoveItsPosition() {
+        assertEquals(300, adapter.read(300));
+        assertArrayEquals(
+                Arrays.copyOf(source.bytes, 300), Arrays.copyOf(player.mStreamReadBuffer, 300));
+        assertEquals(300, player.mStreamCurPos);
+        assertEquals(700, adapter.read(4096), "what is left");
+        assertEquals(4096, player.mStreamReadBuffer.length, "grown to what was asked");
+        assertEquals(0, adapter.read(1), "the end");
+        assertEquals(1000, player.mStreamCurPos);
+        assertNull(adapter.failure());
+    }
+
+    @ParameterizedTest
+    @ValueSource(ints = {-2, -5, Integer.MIN_VALUE, 101, Integer.MAX_VALUE})
+    void countsThatCannotBeAreFailures(int count) {
+        source.misreading(0, (buffer, length) -> count);
+        assertEquals(-1, adapter.read(100));
+        assertEquals(0, player.mStreamCurPos);
+        assertEquals("the source read " + count + " bytes of 100",
+                adapter.failure().getMessage());
+    }
+
+    @ParameterizedTest
+    @ValueSource(ints = {0, -1})
+    void zeroAndMinusOneAreTheEnd(int count) {
+        source.misreading(0, (buffer, length) -> count);
+        assertEquals(0, adapter.read(100));
+        assertNull(adapter.failure());
+    }
+
+    @Test
+    void nothingThatASourceThrowsGetsThrough() {
+        Error first = new StackOverflowError("deep");
+        source.misreading(0, (buffer, length) -> {
+            throw first;
+        });
+        assertEquals(-1, adapter.read(100));
+        source.failsToSeek = true;
+        assertEquals(-1, adapter.seek(0, 5));
+        assertSame(first, adapter.failure(), "the first is remembered");
+    }
+
+    @ParameterizedTest
+    @CsvSource({
+        "0, 0, 0", "0, 999, 999", "0, 1000, 1000", "0, -1, -1",
+        "1, 0, 100", "1, 5, 105", "1, -100, 0", "1, -101, -1",
+        "2, 0, 1000", "2, -1000, 0", "2, -1001, -1",
+        "3, 0, -1", "-1, 0, -1"
+    })
+    void offsetsCountFromTheStartThePositionOrTheEnd(int type, long offset, long target) {
+        assertEquals(100, adapter.read(100));
+        assertEquals(target, adapter.seek(type, offset));
+        assertEquals(target < 0 ? 100 : target, player.mStreamCurPos);
+        int next = adapter.read(1);
+        assertEquals(target == 1000 ? 0 : 1, next);
+    }
+
+    @Test
+    void theEndOfASourceOfUnknownSizeCannotBeSought() throws IOException {
+        source.sizeKnown = false;
+        adapter.describeTo(player);
+        assertEquals(-1, adapter.seek(2, 0));
+    }
+
+    @Test
+    void aSourceThatCannotSeekStaysWhereItIs() {
+        source.seekable = false;
+        assertEquals(10, adapter.read(10));
+        assertEquals(10, adapter.seek(1, 0), "asking where it is moves nothing");
+        assertEquals(-1, adapter.seek(0, 0));
+        assertEquals(10, player.mStreamCurPos);
+    }
+
+    @Test
+    void aFailedSeekLeavesThePosition() {
+        assertEquals(10, adapter.read(10));
+        source.failsToSeek = true;
+        assertEquals(-1, adapter.seek(0, 500));
+        assertEquals(10, player.mStreamCurPos);
+        assertEquals("the reel is stuck", adapter.failure().getMessage());
+    }
+
+    @Test
+    void whatACancelledReadThrowsIsNoFailure() throws Exception {
+        source.misreading(0, source::block);
+        Thread reader = new Thread(() -> adapter.read(10));
+        reader.start();
+        Wait.until("the read began", () -> source.reads.get() == 1);
+        adapter.cancel();
+        reader.join(Wait.LIMIT.toMillis());
+        assertFalse(reader.isAlive());
+        assertNull(adapter.failure());
+        source.misread = (buffer, length) -> {
+            throw new IOException("a real one");
+        };
+        assertEquals(-1, adapter.read(10));
+        assertEquals("a real one", adapter.failure().getMessage());
+    }
+
+    @Test
+    void closingHappensOnceAndEndsTheMedia() {
+        adapter.close();
+        adapter.close();
+        assertEquals(1, source.closes.get());
+        assertEquals(0, adapter.read(10));
+        assertEquals(-1, adapter.seek(0, 5));
+        assertEquals(-1, adapter.seekTime(1, 2));
+    }
+
+    @Test
+    void timeSeeksArePassedOn() throws IOException {
+        assertEquals(-1, adapter.seekTime(1, 2), "sources cannot by default");
+        StreamAdapter timed = new StreamAdapter(new ScriptedSource(new byte[0]) {
+            @Override
+            public long seekTime(long first, long second) {
+                return first * 10 + second;
+            }
+
+            @Override
+            public int seekType() {
+                return 42;
+            }
+        });
+        timed.describeTo(player);
+        assertEquals(12, timed.seekTime(1, 2));
+        assertEquals(12, player.mStreamCurPos);
+        assertEquals(42, timed.seekType());
+    }
+
+    @Test
+    void aSourceThatCannotTellItsSizeIsRefused() {
+        StreamAdapter mute = new StreamAdapter(new ScriptedSource(new byte[0]) {
+            @Override
+            public long size() {
+                throw new IllegalStateException("mute");
+            }
+        });
+        assertThrows(IllegalStateException.class, () -> mute.describeTo(player));
+    }
+}

@@ -1,0 +1,26 @@
+// SPDX-License-Identifier: Apache-2.0
+package com.quintora.mmp;
+
+import static org.junit.jupiter.api.Assertions.fail;
+
+import java.time.Duration;
+import java.util.concurrent.Callable;
+
+/** Waits for conditions, with a bound that slow machines can stretch. */
+final class Wait {
+    /** The bound, generous: only broken code ever waits so long. */
+    static final Duration LIMIT =
+            Duration.ofSeconds(20L * Integer.getInteger("orv.test.patience", 1));
+
+    private Wait() {}
+
+    static void until(String what, Callable<Boolean> condition) throws Exception {
+        long end = System.nanoTime() + LIMIT.toNanos();
+        while (!condition.call()) {
+            if (System.nanoTime() > end) {
+                fail("waited in vain until " + what);
+            }
+            Thread.sleep(5);
+        }
+    }
+}
