@@ -4,6 +4,7 @@
 #include <utils/String16.h>
 
 #include <algorithm>
+#include <new>
 
 namespace android {
 
@@ -13,6 +14,15 @@ namespace {
 constexpr size_t kMaxSize = INT32_MAX;
 
 constexpr size_t padded(size_t len) { return (len + 3) & ~size_t{3}; }
+
+bool resize(std::vector<uint8_t>* bytes, size_t size) {
+    try {
+        bytes->resize(size);
+        return true;
+    } catch (const std::bad_alloc&) {
+        return false;
+    }
+}
 
 // The length word of a string against the bytes behind it, which hold one
 // zero unit more than the text. A length of -1 stands for a null string.
@@ -42,7 +52,7 @@ void Parcel::setDataPosition(size_t pos) const { mPos = pos; }
 
 status_t Parcel::setDataSize(size_t size) {
     if (size > kMaxSize) return BAD_VALUE;
-    mData.resize(size);
+    if (!resize(&mData, size)) return NO_MEMORY;
     mPos = std::min(mPos, size);
     return NO_ERROR;
 }
@@ -50,18 +60,19 @@ status_t Parcel::setDataSize(size_t size) {
 status_t Parcel::setData(const uint8_t* buffer, size_t len) {
     if ((buffer == nullptr && len > 0) || len > kMaxSize) return BAD_VALUE;
     // By way of a copy: the buffer may lie inside this parcel.
-    std::vector<uint8_t> content(buffer, buffer + len);
+    std::vector<uint8_t> content;
+    if (!resize(&content, len)) return NO_MEMORY;
+    std::copy(buffer, buffer + len, content.begin());
     mData.swap(content);
     mPos = 0;
     return NO_ERROR;
 }
 
 status_t Parcel::write(const void* data, size_t len) {
-    if ((data == nullptr && len > 0) || mPos > kMaxSize || len > kMaxSize - 3 - mPos) {
-        return BAD_VALUE;
-    }
+    if ((data == nullptr && len > 0) || len > kMaxSize) return BAD_VALUE;
+    if (mPos > kMaxSize || padded(len) > kMaxSize - mPos) return BAD_VALUE;
     const size_t end = mPos + padded(len);
-    if (end > mData.size()) mData.resize(end);
+    if (end > mData.size() && !resize(&mData, end)) return NO_MEMORY;
     if (len > 0) memcpy(&mData[mPos], data, len);
     std::fill(mData.begin() + mPos + len, mData.begin() + end, uint8_t{0});
     mPos = end;

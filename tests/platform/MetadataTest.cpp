@@ -80,7 +80,7 @@ TEST(MetadataTest, ResetDropsWhatWasAppendedAndNothingBefore) {
 
 TEST(MetadataTest, AParcelThatRefusesIsReported) {
     Parcel parcel;
-    parcel.setDataPosition(SIZE_MAX / 2);
+    parcel.setDataPosition(INT32_MAX);
     Metadata metadata(&parcel);
     EXPECT_FALSE(metadata.appendHeader());
     EXPECT_FALSE(metadata.appendInt32(Metadata::kNumTracks, 3));

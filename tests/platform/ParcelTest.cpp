@@ -6,6 +6,7 @@
 
 #include <cstring>
 #include <limits>
+#include <string>
 #include <vector>
 
 namespace android {
@@ -204,15 +205,31 @@ TEST(ParcelTest, ImpossibleSizesAreRefusedAndChangeNothing) {
     EXPECT_EQ(parcel.write(parcel.data(), kTooMuch), BAD_VALUE);
     EXPECT_EQ(parcel.write(nullptr, 1), BAD_VALUE);
     EXPECT_EQ(parcel.dataPosition(), 0u);
-    parcel.setDataPosition(kTooMuch);
-    EXPECT_EQ(parcel.writeInt32(1), BAD_VALUE);
+    for (const size_t position : {kTooMuch, kTooMuch - 1, kTooMuch - 4}) {
+        parcel.setDataPosition(position);
+        EXPECT_EQ(parcel.writeInt32(1), BAD_VALUE);
+    }
+    EXPECT_THAT(bytesOf(parcel), ElementsAre(1, 2, 3, 4));
+}
+
+TEST(ParcelTest, MemoryThatCannotBeHadIsReportedAndNothingLost) {
+    // The test program has no block that large: see BlockLimit.cpp.
+    Parcel parcel = parcelOf({1, 2, 3, 4});
+    constexpr size_t kHuge = std::numeric_limits<int32_t>::max() - size_t{3};
+    EXPECT_EQ(parcel.setDataSize(kHuge), NO_MEMORY);
+    EXPECT_EQ(parcel.setData(parcel.data(), kHuge), NO_MEMORY);
+    parcel.setDataPosition(kHuge - 8);
+    EXPECT_EQ(parcel.writeInt32(1), NO_MEMORY);
     EXPECT_THAT(bytesOf(parcel), ElementsAre(1, 2, 3, 4));
 }
 
 struct BrokenString {
+    std::string name;
     int32_t length;
     status_t expected;
 };
+
+void PrintTo(const BrokenString& param, std::ostream* out) { *out << param.name; }
 
 class ParcelStringTest : public testing::TestWithParam<BrokenString> {};
 
@@ -226,9 +243,11 @@ TEST_P(ParcelStringTest, ABrokenStringLeavesThePosition) {
 
 INSTANTIATE_TEST_SUITE_P(
     Lengths, ParcelStringTest,
-    testing::Values(BrokenString{-1, UNEXPECTED_NULL}, BrokenString{-2, BAD_VALUE},
-                    BrokenString{2, NOT_ENOUGH_DATA},
-                    BrokenString{std::numeric_limits<int32_t>::max(), NOT_ENOUGH_DATA}));
+    testing::Values(BrokenString{"Null", -1, UNEXPECTED_NULL},
+                    BrokenString{"Negative", -2, BAD_VALUE},
+                    BrokenString{"OneTooLong", 2, NOT_ENOUGH_DATA},
+                    BrokenString{"Largest", std::numeric_limits<int32_t>::max(), NOT_ENOUGH_DATA}),
+    [](const auto& info) { return info.param.name; });
 
 }  // namespace
 }  // namespace android
