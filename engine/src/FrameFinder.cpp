@@ -133,9 +133,15 @@ bool FrameFinder::search(int64_t positionUs, AVDiscard skip) {
 }
 
 void FrameFinder::seek(int64_t positionUs) {
+    AVFormatContext* media = mFile.context();
+    // Broadcast formats are searched by decoding times, which misses the first
+    // key frame.
+    const bool isToFirstByte = positionUs == 0 && (media->iformat->flags & AVFMT_TS_DISCONT) != 0;
     const int64_t time =
         av_rescale_q(positionUs + startTimeUs(), AV_TIME_BASE_Q, mStream->time_base);
-    const int error = av_seek_frame(mFile.context(), mStream->index, time, AVSEEK_FLAG_BACKWARD);
+    const int error = isToFirstByte
+                          ? av_seek_frame(media, -1, 0, AVSEEK_FLAG_BYTE)
+                          : av_seek_frame(media, mStream->index, time, AVSEEK_FLAG_BACKWARD);
     if (error >= 0) avcodec_flush_buffers(mCodec);
 }
 

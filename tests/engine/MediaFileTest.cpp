@@ -1,0 +1,167 @@
+// SPDX-License-Identifier: Apache-2.0
+#include <fcntl.h>
+#include <gtest/gtest.h>
+#include <orvtarn/PlayerTypes.h>
+#include <unistd.h>
+
+#include <random>
+
+#include "AlbumArt.h"
+#include "ContainerInfo.h"
+#include "MediaFile.h"
+#include "TestMedia.h"
+#include "Thumbnailer.h"
+
+extern "C" {
+#include <libavformat/avformat.h>
+}
+
+namespace orvtarn {
+namespace {
+
+using orvtest::bytesOf;
+using orvtest::mediaPath;
+using orvtest::MemorySource;
+
+android::status_t statusOf(const std::string& url, const MediaOpenOptions& options = {}) {
+    std::unique_ptr<MediaFile> file;
+    const android::status_t status = MediaFile::open(url, options, file);
+    EXPECT_EQ(file != nullptr, status == 0);
+    return status;
+}
+
+android::status_t statusOf(std::unique_ptr<ByteSource> source) {
+    std::unique_ptr<MediaFile> file;
+    const android::status_t status = MediaFile::open(std::move(source), {}, file);
+    EXPECT_EQ(file != nullptr, status == 0);
+    return status;
+}
+
+TEST(MediaFile, OpensPathsAndFileUrls) {
+    const std::string path = mediaPath("video.mp4");
+    EXPECT_EQ(statusOf(path), 0);
+    EXPECT_EQ(statusOf("file://" + path), 0);
+    EXPECT_EQ(statusOf("file://" + path.substr(0, path.size() - 3) + "%6d%70%34"), 0);
+}
+
+TEST(MediaFile, TakesColonsAndPercentsInPathsAsTheyAre) {
+    const std::string odd = testing::TempDir() + "/a:b%41.mp4";
+    unlink(odd.c_str());
+    ASSERT_EQ(symlink(mediaPath("video.mp4").c_str(), odd.c_str()), 0);
+    EXPECT_EQ(statusOf(odd), 0);
+    unlink(odd.c_str());
+}
+
+TEST(MediaFile, TellsWhyItCannotOpen) {
+    EXPECT_EQ(statusOf("/no/such/file.mp4"), android::NAME_NOT_FOUND);
+    EXPECT_EQ(statusOf(""), android::NAME_NOT_FOUND);
+    EXPECT_EQ(statusOf(mediaPath("noise.bin")), ORV_ERROR_MALFORMED);
+    EXPECT_EQ(statusOf(mediaPath("cut.mp4")), ORV_ERROR_MALFORMED);
+    EXPECT_EQ(statusOf("/dev/null"), ORV_ERROR_MALFORMED);
+    EXPECT_EQ(statusOf("http://127.0.0.1:1/none.mp4"), ORV_ERROR_IO);
+    EXPECT_EQ(statusOf("nosuchscheme://host/file"), ORV_ERROR_IO);
+    EXPECT_EQ(statusOf(std::unique_ptr<ByteSource>()), android::BAD_VALUE);
+}
+
+TEST(MediaFile, OpensWhatIsThereOfACutFile) { EXPECT_EQ(statusOf(mediaPath("cut.mkv")), 0); }
+
+TEST(MediaFile, ReadsARangeOfADescriptor) {
+    const std::string path = testing::TempDir() + "/ranges.bin";
+    const std::vector<uint8_t> media = bytesOf(mediaPath("video.mp4"));
+    FILE* stream = fopen(path.c_str(), "wb");
+    ASSERT_NE(stream, nullptr);
+    fputs("before", stream);
+    ASSERT_EQ(fwrite(media.data(), 1, media.size(), stream), media.size());
+    fputs("behind", stream);
+    fclose(stream);
+    const int fd = open(path.c_str(), O_RDONLY);
+    EXPECT_EQ(statusOf(std::make_unique<FdByteSource>(fd, 6, media.size())), 0);
+    EXPECT_EQ(statusOf(std::make_unique<FdByteSource>(fd, 6, INT64_MAX)), 0);
+    EXPECT_EQ(statusOf(std::make_unique<FdByteSource>(fd, 6, 20000)), ORV_ERROR_MALFORMED);
+    EXPECT_EQ(statusOf(std::make_unique<FdByteSource>(fd, 1 << 30, 100)), ORV_ERROR_MALFORMED);
+    EXPECT_EQ(lseek(fd, 0, SEEK_CUR), 0) << "the descriptor's own position moved";
+    close(fd);
+    EXPECT_EQ(statusOf(std::make_unique<FdByteSource>(fd, 0, 100)), ORV_ERROR_IO);
+    unlink(path.c_str());
+}
+
+TEST(MediaFile, KeepsToItsRange) {
+    const int fd = open(mediaPath("video.mp4").c_str(), O_RDONLY);
+    FdByteSource source(fd, 100, 10);
+    uint8_t buffer[64];
+    EXPECT_EQ(source.size(), 10);
+    EXPECT_EQ(source.read(buffer, sizeof(buffer)), 10);
+    EXPECT_EQ(source.read(buffer, sizeof(buffer)), 0);
+    EXPECT_FALSE(source.seek(-1));
+    EXPECT_FALSE(source.seek(11));
+    EXPECT_TRUE(source.seek(8));
+    EXPECT_EQ(source.read(buffer, sizeof(buffer)), 2);
+    close(fd);
+}
+
+TEST(MediaFile, ReportsASourceThatFails) {
+    auto source = std::make_unique<MemorySource>(bytesOf(mediaPath("video.mp4")));
+    source->mFailsAt = 0;
+    EXPECT_EQ(statusOf(std::move(source)), ORV_ERROR_IO);
+    EXPECT_EQ(statusOf(std::make_unique<MemorySource>(std::vector<uint8_t>())),
+              ORV_ERROR_MALFORMED);
+}
+
+TEST(MediaFile, EndsWhenCancelledOrLate) {
+    const std::atomic<bool> cancel{true};
+    MediaOpenOptions options;
+    options.cancel = &cancel;
+    EXPECT_EQ(statusOf(mediaPath("video.mp4"), options), ORV_ERROR_IO);
+    MediaOpenOptions late;
+    late.timeLimit = std::chrono::milliseconds(0);
+    EXPECT_EQ(statusOf(mediaPath("video.mp4"), late), ORV_ERROR_IO);
+}
+
+TEST(MediaFile, KnowsItsStreams) {
+    const auto file = orvtest::openMedia("video.mp4");
+    ASSERT_NE(file, nullptr);
+    EXPECT_EQ(file->stream(0), file->context()->streams[0]);
+    EXPECT_EQ(file->stream(-1), nullptr);
+    EXPECT_EQ(file->stream(2), nullptr);
+}
+
+// Everything that the engine reads from a file, whatever the bytes. Nothing is
+// expected but the return.
+void readAll(std::vector<uint8_t> bytes) {
+    std::unique_ptr<MediaFile> file;
+    MediaOpenOptions options;
+    options.timeLimit = std::chrono::seconds(2);
+    if (MediaFile::open(std::make_unique<MemorySource>(std::move(bytes)), options, file) != 0) {
+        return;
+    }
+    free(extractAlbumArt(*file));
+    metaDataInfo(*file);
+    SubtitleTrackInfo chapter;
+    for (int i = 0; chapterRecord(*file, i, chapter); i++) continue;
+    std::unique_ptr<Thumbnailer> thumbnailer;
+    if (Thumbnailer::create(std::move(file), -1, thumbnailer) != 0) return;
+    uint8_t pixels[64 * 9];
+    for (FramePick pick : {FramePick::KeyFrame, FramePick::Exact}) {
+        thumbnailer->draw(1000, pick, {pixels, sizeof(pixels), ORV_COLOR_MODE_RGB565, 16, 9});
+    }
+}
+
+TEST(MediaFile, SurvivesDamagedMedia) {
+    std::mt19937 random(1);  // the same damage each time
+    for (const char* name : {"silent.mkv", "covered.mp3", "covered.m4a", "tagged.ogg",
+                             "covered.flac", "alpha.mov", "still.png"}) {
+        const std::vector<uint8_t> whole = bytesOf(mediaPath(name));
+        for (int round = 0; round < 6; round++) {
+            std::vector<uint8_t> damaged = whole;
+            // Near the start, where the structure is.
+            const size_t range =
+                round % 2 == 0 ? std::min<size_t>(2000, whole.size()) : whole.size();
+            for (int i = 0; i < 20; i++) damaged[random() % range] = static_cast<uint8_t>(random());
+            if (round > 3) damaged.resize(random() % whole.size());
+            readAll(std::move(damaged));
+        }
+    }
+}
+
+}  // namespace
+}  // namespace orvtarn

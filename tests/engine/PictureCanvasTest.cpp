@@ -1,0 +1,233 @@
+// SPDX-License-Identifier: Apache-2.0
+#include <gtest/gtest.h>
+
+#include <cstdlib>
+#include <cstring>
+#include <memory>
+#include <vector>
+
+#include "PictureCanvas.h"
+
+extern "C" {
+#include <libavutil/frame.h>
+}
+
+namespace orvtarn {
+namespace {
+
+const int32_t kModes[] = {3, 4, 5, 9, 10, 11, 12, 15, 16, 17, 18};
+
+struct FreeFrame {
+    void operator()(AVFrame* frame) const { av_frame_free(&frame); }
+};
+typedef std::unique_ptr<AVFrame, FreeFrame> Frame;
+
+struct Rgba {
+    uint8_t r, g, b, a;
+};
+
+Frame rgbaFrame(int width, int height) {
+    Frame frame(av_frame_alloc());
+    frame->format = AV_PIX_FMT_RGBA;
+    frame->width = width;
+    frame->height = height;
+    EXPECT_EQ(av_frame_get_buffer(frame.get(), 0), 0);
+    return frame;
+}
+
+void setPixel(AVFrame& frame, int x, int y, Rgba color) {
+    memcpy(frame.data[0] + y * frame.linesize[0] + 4 * x, &color, 4);
+}
+
+Frame solid(int width, int height, Rgba color) {
+    Frame frame = rgbaFrame(width, height);
+    for (int y = 0; y < height; y++) {
+        for (int x = 0; x < width; x++) setPixel(*frame, x, y, color);
+    }
+    return frame;
+}
+
+const uint8_t kUntouched = 0xA5;
+
+// A thumbnail with guard bytes behind its last row.
+struct Drawn {
+    Drawn(int32_t mode, int32_t width, int32_t height)
+        : stride(thumbnailStride(mode, width)),
+          buffer(stride * height + 64, kUntouched),
+          request{buffer.data(), static_cast<uint32_t>(stride * height), mode, width, height} {}
+
+    // The pixel's bytes as a number, low byte first.
+    uint32_t pixel(int x, int y) const {
+        uint32_t value = 0;
+        const int size = bytesPerPixel(request.i4CanvasColormode);
+        memcpy(&value, buffer.data() + y * stride + x * size, size);
+        return value;
+    }
+
+    size_t stride;
+    std::vector<uint8_t> buffer;
+    _Media_Thumbnail_Info_T request;
+};
+
+uint32_t pixelOf(int32_t mode, Rgba color) {
+    Drawn drawn(mode, 4, 4);
+    EXPECT_EQ(drawPicture(*solid(16, 16, color), 0, drawn.request), 0);
+    return drawn.pixel(2, 2);
+}
+
+TEST(PictureCanvas, HasTheBytesOfEachMode) {
+    const int expected[20] = {0, 0, 0, 2, 2, 4, 0, 0, 0, 2, 2, 2, 4, 0, 0, 2, 2, 4, 4, 0};
+    for (int mode = 0; mode < 20; mode++) EXPECT_EQ(bytesPerPixel(mode), expected[mode]) << mode;
+    for (int mode : {-1, 20, 255, INT32_MAX, INT32_MIN}) EXPECT_EQ(bytesPerPixel(mode), 0);
+}
+
+TEST(PictureCanvas, PadsRowsTo64Bytes) {
+    EXPECT_EQ(thumbnailStride(ORV_COLOR_MODE_RGB565, 1), 64u);
+    EXPECT_EQ(thumbnailStride(ORV_COLOR_MODE_RGB565, 32), 64u);
+    EXPECT_EQ(thumbnailStride(ORV_COLOR_MODE_RGB565, 33), 128u);
+    EXPECT_EQ(thumbnailStride(ORV_COLOR_MODE_ARGB8888, 10), 64u);
+    EXPECT_EQ(thumbnailStride(ORV_COLOR_MODE_ARGB8888, 16), 64u);
+    EXPECT_EQ(thumbnailStride(ORV_COLOR_MODE_ARGB8888, 17), 128u);
+}
+
+TEST(PictureCanvas, DrawsOrangeAsEachModeSays) {
+    const Rgba orange = {255, 128, 0, 255};
+    EXPECT_EQ(pixelOf(ORV_COLOR_MODE_ARGB8888, orange), 0xFFFF8000u);
+    EXPECT_EQ(pixelOf(ORV_COLOR_MODE_XRGB8888, orange), 0xFFFF8000u);
+    EXPECT_EQ(pixelOf(ORV_COLOR_MODE_RGBA8888, orange), 0xFF0080FFu);
+    EXPECT_EQ(pixelOf(ORV_COLOR_MODE_ABGR8888, orange), 0xFF8000FFu);
+}
+
+// Full and empty channels, which no rounding or dithering moves.
+TEST(PictureCanvas, PutsEachChannelInItsBits) {
+    struct Expected {
+        Rgba color;
+        uint32_t rgb565, bgr565, argb1555, argb4444;
+    };
+    const Expected all[] = {
+        {{255, 0, 0, 255}, 0xF800, 0x001F, 0xFC00, 0xFF00},
+        {{0, 255, 0, 255}, 0x07E0, 0x07E0, 0x83E0, 0xF0F0},
+        {{0, 0, 255, 255}, 0x001F, 0xF800, 0x801F, 0xF00F},
+        {{255, 255, 255, 255}, 0xFFFF, 0xFFFF, 0xFFFF, 0xFFFF},
+        {{0, 0, 0, 255}, 0x0000, 0x0000, 0x8000, 0xF000},
+    };
+    for (const Expected& one : all) {
+        EXPECT_EQ(pixelOf(ORV_COLOR_MODE_RGB565, one.color), one.rgb565);
+        EXPECT_EQ(pixelOf(ORV_COLOR_MODE_BGR565, one.color), one.bgr565);
+        EXPECT_EQ(pixelOf(ORV_COLOR_MODE_ARGB1555, one.color), one.argb1555);
+        EXPECT_EQ(pixelOf(ORV_COLOR_MODE_ARGB4444, one.color), one.argb4444);
+    }
+}
+
+TEST(PictureCanvas, KeepsThePicturesAlpha) {
+    const Rgba clear = {255, 255, 255, 0};
+    const Rgba faint = {255, 255, 255, 0x22};
+    EXPECT_EQ(pixelOf(ORV_COLOR_MODE_ARGB8888, clear), 0x00FFFFFFu);
+    EXPECT_EQ(pixelOf(ORV_COLOR_MODE_RGBA8888, clear), 0x00FFFFFFu);
+    EXPECT_EQ(pixelOf(ORV_COLOR_MODE_ABGR8888, clear), 0xFFFFFF00u);
+    EXPECT_EQ(pixelOf(ORV_COLOR_MODE_XRGB8888, clear), 0xFFFFFFFFu);
+    EXPECT_EQ(pixelOf(ORV_COLOR_MODE_ARGB1555, {255, 255, 255, 0x90}), 0xFFFFu);
+    EXPECT_EQ(pixelOf(ORV_COLOR_MODE_ARGB1555, faint), 0x7FFFu);
+    EXPECT_EQ(pixelOf(ORV_COLOR_MODE_ARGB4444, faint), 0x2FFFu);
+    EXPECT_EQ(pixelOf(ORV_COLOR_MODE_ARGB4444, clear), 0x0FFFu);
+}
+
+// Luma and chroma of BT.601 in limited range: red is Y 81, U 90, V 240.
+TEST(PictureCanvas, DrawsYuvInItsByteOrder) {
+    const auto near = [](int value, int expected) { return abs(value - expected) <= 2; };
+    Drawn uyvy(ORV_COLOR_MODE_UYVY422, 4, 4);
+    Drawn yuyv(ORV_COLOR_MODE_YUYV422, 4, 4);
+    const Frame red = solid(16, 16, {255, 0, 0, 255});
+    ASSERT_EQ(drawPicture(*red, 0, uyvy.request), 0);
+    ASSERT_EQ(drawPicture(*red, 0, yuyv.request), 0);
+    const int expected[] = {90, 81, 240, 81};
+    for (int i = 0; i < 4; i++) {
+        EXPECT_PRED2(near, uyvy.buffer[i], expected[i]) << i;
+        EXPECT_PRED2(near, yuyv.buffer[i ^ 1], expected[i]) << i;
+    }
+}
+
+TEST(PictureCanvas, DrawsGrayInFullRange) {
+    EXPECT_LE(pixelOf(ORV_COLOR_MODE_GRAY16, {0, 0, 0, 255}), 0x0200u);
+    EXPECT_GE(pixelOf(ORV_COLOR_MODE_GRAY16, {255, 255, 255, 255}), 0xFD00u);
+    const int gray = static_cast<int>(pixelOf(ORV_COLOR_MODE_GRAY16, {128, 128, 128, 255}));
+    EXPECT_NEAR(gray, 0x8080, 0x200);
+}
+
+TEST(PictureCanvas, WritesNothingBesideThePixels) {
+    const Frame frame = solid(64, 48, {255, 255, 255, 255});
+    for (int32_t mode : kModes) {
+        for (int width : {1, 2, 15, 16, 17, 32, 33, 64}) {
+            Drawn drawn(mode, width, 3);
+            ASSERT_EQ(drawPicture(*frame, 0, drawn.request), 0) << mode << ", " << width;
+            const size_t used = static_cast<size_t>(width) * bytesPerPixel(mode);
+            for (size_t i = 0; i < drawn.buffer.size(); i++) {
+                if (i >= drawn.stride * 3 || i % drawn.stride >= used) {
+                    ASSERT_EQ(drawn.buffer[i], kUntouched) << mode << ", " << width << ", " << i;
+                }
+            }
+        }
+    }
+}
+
+TEST(PictureCanvas, DrawsEverySizeFromThinToLarge) {
+    const Frame frame = solid(1920, 1080, {10, 200, 30, 255});
+    const int sizes[][2] = {{1, 1}, {1, 255}, {4096, 1}, {255, 255}, {2, 2}, {1921, 3}};
+    for (int32_t mode : kModes) {
+        for (const auto& size : sizes) {
+            Drawn drawn(mode, size[0], size[1]);
+            ASSERT_EQ(drawPicture(*frame, 0, drawn.request), 0) << mode << ", " << size[0];
+            EXPECT_EQ(drawn.buffer[drawn.stride * size[1]], kUntouched);
+        }
+    }
+    Drawn drawn(ORV_COLOR_MODE_ARGB8888, 255, 1);
+    ASSERT_EQ(drawPicture(*frame, 0, drawn.request), 0);
+    const int expected[] = {30, 200, 10, 255};
+    for (int i = 0; i < 255 * 4; i++) EXPECT_NEAR(drawn.buffer[i], expected[i % 4], 2) << i;
+}
+
+// The corners of a picture are red, green (right), blue (bottom), white.
+TEST(PictureCanvas, TurnsPicturesClockwise) {
+    const Rgba red = {255, 0, 0, 255}, green = {0, 255, 0, 255}, blue = {0, 0, 255, 255},
+               white = {255, 255, 255, 255};
+    Frame frame = rgbaFrame(32, 16);
+    for (int y = 0; y < 16; y++) {
+        for (int x = 0; x < 32; x++) {
+            setPixel(*frame, x, y, y < 8 ? (x < 16 ? red : green) : (x < 16 ? blue : white));
+        }
+    }
+    const uint32_t r = 0xFFFF0000, g = 0xFF00FF00, b = 0xFF0000FF, w = 0xFFFFFFFF;
+    const uint32_t expected[4][4] = {{r, g, b, w}, {b, r, w, g}, {w, b, g, r}, {g, w, r, b}};
+    for (int quarter = 0; quarter < 4; quarter++) {
+        const int width = quarter % 2 == 0 ? 32 : 16;
+        Drawn drawn(ORV_COLOR_MODE_ARGB8888, width, 48 - width);
+        ASSERT_EQ(drawPicture(*frame, quarter * 90, drawn.request), 0);
+        const int right = width - 1, bottom = 47 - width;
+        EXPECT_EQ(drawn.pixel(0, 0), expected[quarter][0]) << quarter;
+        EXPECT_EQ(drawn.pixel(right, 0), expected[quarter][1]) << quarter;
+        EXPECT_EQ(drawn.pixel(0, bottom), expected[quarter][2]) << quarter;
+        EXPECT_EQ(drawn.pixel(right, bottom), expected[quarter][3]) << quarter;
+    }
+}
+
+bool isRefused(int32_t mode, int32_t width, int32_t height, uint32_t size, bool hasBuffer = true) {
+    uint8_t byte = 0;
+    return checkThumbnail({hasBuffer ? &byte : nullptr, size, mode, width, height}) ==
+           android::BAD_VALUE;
+}
+
+TEST(PictureCanvas, RefusesWhatCannotBeDrawn) {
+    EXPECT_FALSE(isRefused(ORV_COLOR_MODE_ARGB8888, 10, 2, 128));
+    EXPECT_TRUE(isRefused(ORV_COLOR_MODE_ARGB8888, 10, 2, 127));
+    EXPECT_TRUE(isRefused(ORV_COLOR_MODE_ARGB8888, 10, 2, 128, false));
+    for (int mode : {-1, 0, 1, 2, 6, 7, 8, 13, 14, 19, INT32_MAX}) {
+        EXPECT_TRUE(isRefused(mode, 10, 2, 4096)) << mode;
+    }
+    for (int size : {INT32_MIN, -1, 0, 16385, INT32_MAX}) {
+        EXPECT_TRUE(isRefused(ORV_COLOR_MODE_RGB565, size, 1, UINT32_MAX)) << size;
+        EXPECT_TRUE(isRefused(ORV_COLOR_MODE_RGB565, 1, size, UINT32_MAX)) << size;
+    }
+}
+
+}  // namespace
+}  // namespace orvtarn
