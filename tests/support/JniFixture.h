@@ -21,7 +21,7 @@ namespace orvtest {
 // loaded into it yet. At the end no violation, global reference, buffer,
 // attached thread or engine player may be left, beyond what a test announces.
 class VmFixture : public testing::Test {
-protected:
+public:
     VmFixture();
     ~VmFixture() override;
     void TearDown() override;
@@ -75,7 +75,7 @@ private:
 // The same with the library loaded and a Java player object that is not set
 // up. Players that a test leaves with a service are released at the end.
 class JniFixture : public VmFixture {
-protected:
+public:
     JniFixture() : player(newPlayer()) {}
     void SetUp() override;
 

@@ -1,0 +1,360 @@
+// SPDX-License-Identifier: Apache-2.0
+#include "AllocationFailure.h"
+#include "JniFixture.h"
+#include "dispatch/SyncToAsync.h"
+#include "jni/PlayerContext.h"
+
+namespace orvtest {
+namespace {
+
+using android::getMediaService;
+using android::OrvMediaService;
+using android::sp;
+
+ExpectedLine dispatcherLine(const std::string& text) {
+    return info("SyncToAsync::" + text).tagged("ORV::SyncToAsync");
+}
+
+// Joins lists of lines.
+std::vector<ExpectedLine> lines(std::initializer_list<std::vector<ExpectedLine>> parts) {
+    std::vector<ExpectedLine> all;
+    for (const auto& part : parts) all.insert(all.end(), part.begin(), part.end());
+    return all;
+}
+
+ExpectedLine posterLine(const char* word) {
+    return bridgeInfo(
+        std::string("MsgDispatcher::MsgDispatcher(JNIEnv, jobject thiz, jobject weak_thiz): ") +
+        word + "\n");
+}
+
+ExpectedLine listenerLine(const char* word) {
+    return bridgeInfo(std::string("MediaClientListener::MediaClientListener(JNIEnv, jobject thiz, "
+                                  "jobject weak_thiz): ") +
+                      word + "\n");
+}
+
+// Setup up to the creation of the engine player.
+std::vector<ExpectedLine> setupBegins() {
+    return {enter("OrvMediaClient_setup"),
+            serviceInfo("OrvMediaService::OrvMediaService()"),
+            posterLine("Enter"),
+            posterLine("Leave"),
+            dispatcherLine("addMsgHandler(): Enter"),
+            dispatcherLine("addMsgHandler(): Leave"),
+            listenerLine("Enter"),
+            listenerLine("Leave"),
+            serviceInfo("OrvMediaService::setListener()"),
+            enter("createPlayer")};
+}
+
+std::vector<ExpectedLine> setupEnds() {
+    return {enter("setMediaService"), leave("setMediaService"), leave("OrvMediaClient_setup")};
+}
+
+// Release from the abort on, up to the leave line.
+std::vector<ExpectedLine> takesApart() {
+    return {dispatcherLine("abortAllActions(): Enter"),
+            dispatcherLine("abortAllActions(): Leave"),
+            dispatcherLine("delMsgHandler(): Enter"),
+            dispatcherLine("m_deleteMsgHandler(): Enter"),
+            enter("MsgDispatcher::~MsgDispatcher"),
+            leave("MsgDispatcher::~MsgDispatcher"),
+            dispatcherLine("m_deleteMsgHandler(): Leave"),
+            dispatcherLine("delMsgHandler(): leave"),
+            serviceInfo("OrvMediaService::setListener()"),
+            enter("MediaClientListener::~MediaClientListener"),
+            leave("MediaClientListener::~MediaClientListener"),
+            serviceInfo("OrvMediaService::disconnect()")};
+}
+
+std::vector<ExpectedLine> releaseBegins() {
+    return {enter("OrvMediaClient_release"), enter("decVideoSurfaceRef"),
+            leave("decVideoSurfaceRef"),     enter("setMediaService"),
+            leave("setMediaService"),        serviceInfo("OrvMediaService::release()")};
+}
+
+// The service goes last, with the native method's own reference.
+std::vector<ExpectedLine> releaseEnds() {
+    return {leave("OrvMediaClient_release"), serviceInfo("OrvMediaService::~OrvMediaService()"),
+            serviceInfo("setNotifyCallback")};
+}
+
+std::vector<ExpectedLine> releaseWithoutService() {
+    return {enter("OrvMediaClient_release"), enter("decVideoSurfaceRef"), enter("setMediaService"),
+            leave("setMediaService"), leave("OrvMediaClient_release")};
+}
+
+class PlayerContextTest : public JniFixture {
+protected:
+    Outcome setup() {
+        jobject weak = vm.local(vm.newObject("java/lang/ref/WeakReference"));
+        return call<void>("native_setup", "(Ljava/lang/Object;)V", weak);
+    }
+    Outcome release() { return call<void>("native_release", "()V"); }
+    Outcome reset() { return call<void>("native_reset", "()V"); }
+    Outcome finalize() { return call<void>("native_finalize", "()V"); }
+
+    jlong context() { return player->get("mNativeContext").integer; }
+    sp<OrvMediaService> service() { return getMediaService(vm.env(), vm.local(player)); }
+};
+
+TEST_F(PlayerContextTest, SetupWiresAServiceToTheJavaObject) {
+    EXPECT_THAT(setup(), ReturnsNothing()
+                             .logs(lines({setupBegins(),
+                                          {serviceInfo("OrvMediaService::attachPlayer(player)"),
+                                           leave("createPlayer")},
+                                          setupEnds()}))
+                             .makesGlobals(2));
+    EXPECT_EQ(ScriptedEngine::live(), 1);
+    EXPECT_EQ(ScriptedEngine::last()->decoder(), -1);
+    EXPECT_NE(ScriptedEngine::last()->listener(), nullptr);
+    EXPECT_TRUE(service()->isPlayerExists());
+}
+
+TEST_F(PlayerContextTest, FieldHoldsTheServicesAddressAndOneReference) {
+    setUpPlayer();
+    const sp<OrvMediaService> held = service();
+    EXPECT_EQ(context(), static_cast<jlong>(reinterpret_cast<uintptr_t>(held.get())));
+    // The Java object's, the event handler's and this test's.
+    EXPECT_EQ(held->getStrongCount(), 3);
+}
+
+TEST_F(PlayerContextTest, ReleaseTakesEverythingApartInOrder) {
+    setUpPlayer();
+    EXPECT_THAT(release(), ReturnsNothing()
+                               .logs(lines({releaseBegins(), takesApart(), releaseEnds()}))
+                               .engine({"release()"})
+                               .makesGlobals(-2));
+    EXPECT_EQ(context(), 0);
+    EXPECT_EQ(ScriptedEngine::live(), 0);
+}
+
+TEST_F(PlayerContextTest, ReleaseDetachesTheFieldBeforeTheEngineIsAsked) {
+    jlong seen = -1;
+    setUpPlayer().whenCalled("release", [&] { seen = context(); });
+    release();
+    EXPECT_EQ(seen, 0);
+}
+
+TEST_F(PlayerContextTest, FailedReleaseThrowsAndCarriesOn) {
+    setUpPlayer().answer("release", {-19});
+    EXPECT_THAT(
+        release(),
+        ReturnsNothing()
+            .logs(lines({releaseBegins(),
+                         {bridgeError("OrvMediaClient_release(): throw exception. Line:%d\n")},
+                         takesApart(),
+                         releaseEnds()}))
+            .throws(kIllegalState)
+            .engine({"release()"})
+            .makesGlobals(-2));
+    EXPECT_EQ(context(), 0);
+}
+
+TEST_F(PlayerContextTest, SecondReleaseLogsEnterAndLeaveOnly) {
+    setUpPlayer();
+    release();
+    EXPECT_THAT(release(), ReturnsNothing().logs(releaseWithoutService()));
+}
+
+TEST_F(PlayerContextTest, FinalizeWithoutReleaseWarnsAndReleases) {
+    setUpPlayer();
+    const std::vector<ExpectedLine> begins = {
+        enter("OrvMediaClient_finalize"),
+        bridgeWarning("OrvMediaClient_finalize(): MediaPlayer finalized without being released")};
+    EXPECT_THAT(finalize(), ReturnsNothing()
+                                .logs(lines({begins,
+                                             releaseBegins(),
+                                             takesApart(),
+                                             releaseEnds(),
+                                             {leave("OrvMediaClient_finalize")}}))
+                                .engine({"release()"})
+                                .makesGlobals(-2));
+    EXPECT_EQ(context(), 0);
+}
+
+TEST_F(PlayerContextTest, FinalizeAfterReleaseDoesNotWarn) {
+    setUpPlayer();
+    release();
+    EXPECT_THAT(finalize(), ReturnsNothing().logs(lines({{enter("OrvMediaClient_finalize")},
+                                                         releaseWithoutService(),
+                                                         {leave("OrvMediaClient_finalize")}})));
+}
+
+TEST_F(PlayerContextTest, SecondSetupOnlyDropsTheOldReference) {
+    setUpPlayer();
+    sp<OrvMediaService> first = service();
+    setUpPlayer();
+    EXPECT_NE(service(), first);
+    EXPECT_EQ(first->getStrongCount(), 2);  // the event handler's and this test's
+    EXPECT_EQ(ScriptedEngine::live(), 2);
+    EXPECT_THAT(ScriptedEngine::all()[0]->calls(), testing::IsEmpty());
+
+    // Java cannot release the first one any more; its registration keeps it.
+    ORV::SyncToAsync::getInstance()->delMsgHandler(first);
+}
+
+TEST_F(PlayerContextTest, SetupWithoutMemoryForTheServiceChangesNothing) {
+    AllocationFailure failure = AllocationFailure::of<OrvMediaService>();
+    EXPECT_THAT(setup(), ReturnsNothing()
+                             .logs({enter("OrvMediaClient_setup"),
+                                    bridgeError("OrvMediaClient_setup(): out of memory, new "
+                                                "OrvMediaService failed, throw exception\n")})
+                             .throws(kRuntime, "Out of memory"));
+    EXPECT_EQ(context(), 0);
+    EXPECT_EQ(failure.failed(), 1);
+}
+
+TEST_F(PlayerContextTest, SetupWithoutMemoryForTheEngineAttachesTheServiceAlone) {
+    // Setup goes on behind the exception, and writes the Java field.
+    vm.tolerate("LongField: called with a pending java/lang/RuntimeException");
+    {
+        AllocationFailure failure = AllocationFailure::of<android::TarnPlayer>();
+        EXPECT_THAT(setup(),
+                    ReturnsNothing()
+                        .logs(lines({setupBegins(),
+                                     {bridgeError("createPlayer(): out of memory, new TarnPlayer "
+                                                  "failed, throw exception\n")},
+                                     setupEnds()}))
+                        .throws(kRuntime, "Out of memory")
+                        .makesGlobals(2));
+    }
+    EXPECT_FALSE(service()->isPlayerExists());
+    // Without an engine every operation answers that it is not initialised.
+    EXPECT_THAT(release().thrown, testing::Optional(fakejni::Thrown{kIllegalState, {}}));
+    EXPECT_EQ(context(), 0);
+}
+
+TEST_F(PlayerContextTest, CreatePlayerWithoutServiceOrEnvironmentLogs) {
+    EXPECT_THAT(
+        observeAction([&] { android::createPlayer(vm.env(), nullptr, E_ORV_PLAYER_TYPE_TARN); }),
+        ReturnsNothing().logs(
+            {enter("createPlayer"), bridgeError("createPlayer(): OrvMediaService==NULL\n")}));
+    sp<OrvMediaService> made = new OrvMediaService;
+    EXPECT_THAT(
+        observeAction([&] { android::createPlayer(nullptr, made, E_ORV_PLAYER_TYPE_TARN); }),
+        ReturnsNothing().logs({enter("createPlayer"), bridgeError("createPlayer(): env==NULL\n")}));
+    EXPECT_THAT(
+        observeAction([&] { android::createPlayer(nullptr, nullptr, E_ORV_PLAYER_TYPE_TARN); }),
+        ReturnsNothing().logs(
+            {enter("createPlayer"), bridgeError("createPlayer(): OrvMediaService==NULL\n")}));
+    EXPECT_EQ(ScriptedEngine::live(), 0);
+}
+
+TEST_F(PlayerContextTest, CreatePlayerIgnoresTheType) {
+    sp<OrvMediaService> made = new OrvMediaService;
+    for (int type : {0, 1, 7}) {
+        android::createPlayer(vm.env(), made, static_cast<E_OrvPlayer_Type>(type));
+        EXPECT_EQ(ScriptedEngine::last()->decoder(), -1);
+    }
+    EXPECT_EQ(ScriptedEngine::live(), 1);  // each replaced the one before
+}
+
+TEST_F(PlayerContextTest, GetMediaServiceIsSilentAndTakesOneReference) {
+    setUpPlayer();
+    jobject thiz = vm.local(player);
+    sp<OrvMediaService> held;
+    EXPECT_THAT(observeAction([&] { held = getMediaService(vm.env(), thiz); }), ReturnsNothing());
+    EXPECT_EQ(held->getStrongCount(), 3);
+    EXPECT_EQ(getMediaService(vm.env(), vm.local(newPlayer())), nullptr);
+}
+
+TEST_F(PlayerContextTest, SetMediaServiceSwapsAndReturnsTheOldOneAlive) {
+    jobject thiz = vm.local(player);
+    sp<OrvMediaService> first = new OrvMediaService;
+    sp<OrvMediaService> second = new OrvMediaService;
+    sp<OrvMediaService> old;
+    const auto set = [&](const sp<OrvMediaService>& next) {
+        return observeAction([&] { old = android::setMediaService(vm.env(), thiz, next); });
+    };
+    const Expected swapped =
+        ReturnsNothing().logs({enter("setMediaService"), leave("setMediaService")});
+
+    EXPECT_THAT(set(first), swapped);
+    EXPECT_EQ(old, nullptr);
+    EXPECT_EQ(first->getStrongCount(), 2);
+    EXPECT_THAT(set(second), swapped);
+    EXPECT_EQ(old, first);
+    EXPECT_EQ(first->getStrongCount(), 2);  // this test's and the returned one
+    EXPECT_EQ(second->getStrongCount(), 2);
+    EXPECT_THAT(set(nullptr), swapped);
+    EXPECT_EQ(old, second);
+    EXPECT_EQ(context(), 0);
+}
+
+TEST_F(PlayerContextTest, ServiceOutlivesAReleaseOnAnotherThread) {
+    setUpPlayer();
+    sp<OrvMediaService> held = service();
+    vm.onJavaThread([&] {
+        fakejni::callNative<void>(vm, playerClass, vm.local(player), "native_release", "()V");
+    });
+    EXPECT_EQ(held->getStrongCount(), 1);
+    EXPECT_TRUE(held->isPlayerExists());
+}
+
+TEST_F(PlayerContextTest, ResetForwardsAndKeepsTheService) {
+    setUpPlayer();
+    EXPECT_THAT(reset(),
+                ReturnsNothing()
+                    .logs({enter("OrvMediaClient_reset"), serviceInfo("OrvMediaService::reset()"),
+                           leave("OrvMediaClient_reset")})
+                    .engine({"reset()"}));
+    EXPECT_NE(context(), 0);
+}
+
+TEST_F(PlayerContextTest, EveryFailureOfResetIsAnIoException) {
+    setUpPlayer();
+    for (int status : {-38, -1, -19, 1}) {
+        engine->answer("reset", {status});
+        EXPECT_THAT(reset(), ReturnsNothing()
+                                 .logs({enter("OrvMediaClient_reset"),
+                                        serviceInfo("OrvMediaService::reset()"),
+                                        bridgeInfo("OrvMediaClient_reset(): jniThrowException\n"),
+                                        leave("OrvMediaClient_reset")})
+                                 .throws(kIo)
+                                 .engine({"reset()"}));
+        EXPECT_NE(context(), 0);
+    }
+}
+
+TEST_F(PlayerContextTest, ResetWithoutServiceIsAnIllegalState) {
+    EXPECT_THAT(reset(), ReturnsNothing()
+                             .logs({enter("OrvMediaClient_reset"),
+                                    bridgeError("service not exist, throw exception. Line:%d\n")})
+                             .throws(kIllegalState));
+}
+
+TEST_F(PlayerContextTest, PlayersAreIndependent) {
+    setUpPlayer();
+    const fakejni::ObjectPtr other = newPlayer();
+    setUp(other);
+    release();
+    EXPECT_EQ(ScriptedEngine::live(), 1);
+    EXPECT_NE(getMediaService(vm.env(), vm.local(other)), nullptr);
+}
+
+// Many threads look up, use and replace the service of one object at once.
+TEST_F(PlayerContextTest, LookupsAndReleasesMayRace) {
+    setUpPlayer();
+    std::vector<std::thread> threads;
+    for (int i = 0; i < 4; ++i) {
+        threads.emplace_back([&] {
+            JNIEnv* env;
+            vm.attach(&env, true);
+            for (int n = 0; n < 50; ++n) {
+                sp<OrvMediaService> found = getMediaService(env, vm.local(player));
+                if (found != nullptr) found->isPlaying();
+            }
+        });
+    }
+    vm.onJavaThread([&] {
+        fakejni::callNative<void>(vm, playerClass, vm.local(player), "native_release", "()V");
+    });
+    for (std::thread& thread : threads) thread.join();
+    EXPECT_EQ(context(), 0);
+    EXPECT_EQ(ScriptedEngine::live(), 0);
+}
+
+}  // namespace
+}  // namespace orvtest
