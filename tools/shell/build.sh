@@ -31,7 +31,10 @@ is_configured() {
     [ "$1" = off ] || grep -qx 'ORV_TESTS:BOOL=ON' "$ORV_BUILD/CMakeCache.txt"
 }
 
-# Warnings are errors, so what ninja --quiet leaves to be seen is failures.
+# Says nothing while all goes well, and then only the errors.
 ninja_quietly() {
-    ninja -C "$ORV_BUILD" --quiet "$@" >&2 || die "the build failed; its first error is above."
+    local log=$ORV_BUILD/log/ninja.log
+    ninja -C "$ORV_BUILD" "$@" >"$log" 2>&1 </dev/null && return
+    sed -n '/^FAILED\|^ninja: error/,$p' "$log" | head -n 60 >&2
+    die "the build failed; all it said is in $log"
 }

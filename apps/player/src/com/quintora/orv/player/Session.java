@@ -53,7 +53,7 @@ public final class Session implements AutoCloseable {
             }
             frames.expect(player.tracks().currentVideo().map(VideoTrack::frameRate).orElse(0.0));
             applyOptions();
-        } catch (IOException | SecurityException e) {
+        } catch (IOException | SecurityException | IllegalStateException e) {
             throw new Failure(e.getMessage(), e);
         }
     }
@@ -164,8 +164,12 @@ public final class Session implements AutoCloseable {
     }
 
     private void applyOptions() throws Failure {
-        player.setLooping(options.loop);
-        setVolume(options.volume / 100.0);
+        if (options.loop) {
+            player.setLooping(true);
+        }
+        if (options.volume != 100) {
+            setVolume(options.volume / 100.0);
+        }
         if (options.audioTrack != null) {
             selectAudio(options.audioTrack);
         }

@@ -9,10 +9,10 @@ import java.awt.Graphics2D;
 import java.awt.event.MouseAdapter;
 import java.awt.event.MouseEvent;
 import java.util.function.DoubleConsumer;
-import javax.swing.JComponent;
+import javax.swing.JPanel;
 
 /** A horizontal bar from 0 to 1 that the mouse sets: the volume, or the place in the media. */
-class LevelBar extends JComponent {
+class LevelBar extends JPanel {
     private static final int THICKNESS = 4;
     private static final int KNOB = 12;
 
@@ -24,6 +24,7 @@ class LevelBar extends JComponent {
 
     LevelBar(String name, int width, DoubleConsumer onSet) {
         this.onSet = onSet;
+        setOpaque(false);
         setPreferredSize(new Dimension(width, 20));
         setMinimumSize(new Dimension(40, 20));
         setCursor(Cursor.getPredefinedCursor(Cursor.HAND_CURSOR));

@@ -18,7 +18,7 @@ import javax.imageio.ImageIO;
 /** What the window needs to know of the media besides its picture. Not for the window's thread. */
 final class MediaDetails {
     private final OrvMediaPlayer player;
-    private int videoTracks;
+    private boolean hasVideo;
     private int audioTracks;
     private int subtitleTracks;
     private List<SeekBar.Mark> chapters = List.of();
@@ -32,7 +32,7 @@ final class MediaDetails {
 
     /** Call once, when the media is prepared. */
     void read() {
-        videoTracks = player.tracks().video().size();
+        hasVideo = player.getVideoWidth() > 0;
         audioTracks = player.tracks().audio().size();
         subtitleTracks = player.tracks().subtitles().size();
         chapters =
@@ -41,13 +41,13 @@ final class MediaDetails {
                         .toList();
         title = player.tracks().metadata().map(MediaMetadata::title).orElse("");
         artist = player.tracks().metadata().map(MediaMetadata::artist).orElse("");
-        if (videoTracks == 0) {
+        if (!hasVideo) {
             cover = player.pictures().embedded().map(MediaDetails::decode).orElse(null);
         }
     }
 
     boolean hasVideo() {
-        return videoTracks > 0;
+        return hasVideo;
     }
 
     int audioTracks() {

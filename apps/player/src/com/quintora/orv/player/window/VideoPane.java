@@ -10,11 +10,11 @@ import java.awt.RenderingHints;
 import java.awt.image.BufferedImage;
 import java.awt.image.DataBufferInt;
 import java.nio.ByteBuffer;
-import javax.swing.JComponent;
+import javax.swing.JPanel;
 import javax.swing.Timer;
 
 /** Shows the newest frame, as large as fits with its proportions kept, and short notices on it. */
-final class VideoPane extends JComponent {
+final class VideoPane extends JPanel {
     private static final int NOTICE_MS = 1_200;
 
     // The one that is painted and the one that is filled; they change places under the lock.
@@ -26,7 +26,6 @@ final class VideoPane extends JComponent {
     private final Timer noticeEnd = new Timer(NOTICE_MS, event -> setNotice(""));
 
     VideoPane() {
-        setOpaque(true);
         noticeEnd.setRepeats(false);
         getAccessibleContext().setAccessibleName("Video");
     }
