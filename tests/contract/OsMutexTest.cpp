@@ -7,27 +7,10 @@
 #include <string>
 #include <thread>
 
-#include "PrivateMember.h"
+#include "MutexProbe.h"
 
 namespace orvtest {
-
-struct NativeMutex {
-    friend auto memberOf(NativeMutex);
-};
-template struct PrivateMember<NativeMutex, &os::Mutex::mMutex>;
-
 namespace {
-
-// 0 when another thread could take the mutex at this moment, else EBUSY.
-int tryFromAnotherThread(os::Mutex& mutex) {
-    int result = -1;
-    std::thread([&] {
-        pthread_mutex_t* native = &(mutex.*memberOf(NativeMutex{}));
-        result = pthread_mutex_trylock(native);
-        if (result == 0) pthread_mutex_unlock(native);
-    }).join();
-    return result;
-}
 
 TEST(OsMutexTest, IsFreeOnlyAfterItsOwnerUnlockedItAsOftenAsItLockedIt) {
     os::Mutex mutex;

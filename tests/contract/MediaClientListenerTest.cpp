@@ -1,0 +1,88 @@
+// SPDX-License-Identifier: Apache-2.0
+#include <binder/Parcel.h>
+#include <dispatch/SyncToAsync.h>
+#include <jni/media-service/MediaClientListener.h>
+
+#include <algorithm>
+
+#include "ServiceFixture.h"
+
+namespace orvtest {
+namespace {
+
+using android::sp;
+
+const char kTag[] = "OrvMediaClient-JNI";
+
+class MediaClientListenerTest : public ServiceFixture {
+protected:
+    void SetUp() override {
+        ORV::SyncToAsync::getInstance();  // its first use logs more than the later ones
+        log.clear();
+    }
+
+    // The lines of this thread, or of all others.
+    std::vector<LogLine> linesOf(bool thisThread) const {
+        std::vector<LogLine> lines = log.lines();
+        const auto other = [&](const LogLine& line) {
+            return (line.thread == std::this_thread::get_id()) != thisThread;
+        };
+        lines.erase(std::remove_if(lines.begin(), lines.end(), other), lines.end());
+        return lines;
+    }
+
+    // What the dispatcher says of an action that names no service.
+    const std::vector<ExpectedLine> discarded = {
+        info("SyncToAsync::m_getMsgDispather(): invalid argument").tagged("ORV::SyncToAsync"),
+        error("SyncToAsync::Run(): prMsgDispatcher==NULL").tagged("ORV::SyncToAsync")};
+};
+
+TEST_F(MediaClientListenerTest, LogsItsConstructionAndDestruction) {
+    { sp<MediaClientListener> listener = new MediaClientListener; }
+    const std::string constructor =
+        "MediaClientListener::MediaClientListener(JNIEnv, jobject thiz, jobject weak_thiz): ";
+    EXPECT_THAT(
+        log.take(),
+        LinesAre({info(constructor + "Enter\n").tagged(kTag),
+                  info(constructor + "Leave\n").tagged(kTag),
+                  info("MediaClientListener::~MediaClientListener(): Enter\n").tagged(kTag),
+                  info("MediaClientListener::~MediaClientListener(): Leave\n").tagged(kTag)}));
+}
+
+TEST_F(MediaClientListenerTest, EventsGoToTheDispatcherWhichFindsNoPoster) {
+    sp<MediaClientListener> listener = new MediaClientListener;
+    log.clear();
+    listener->notify(1, 2, 3, nullptr);
+    ASSERT_TRUE(log.waitFor(discarded[1]));
+    EXPECT_THAT(linesOf(true),
+                LinesAre({info("MediaClientListener::notify(): Enter\n").tagged(kTag),
+                          info("MediaClientListener::notify(): Leave\n").tagged(kTag)}));
+    EXPECT_THAT(linesOf(false), LinesAre(discarded));
+}
+
+TEST_F(MediaClientListenerTest, EveryEventOfAServiceIsDiscarded) {
+    service->setListener(new MediaClientListener);
+    log.clear();
+    for (int msg : {1, 200, 5}) service->notify(msg, 0, 0, nullptr);
+    ASSERT_TRUE(log.waitFor(discarded[1], 3));
+    EXPECT_THAT(linesOf(false), LinesAre({discarded[0], discarded[1], discarded[0], discarded[1],
+                                          discarded[0], discarded[1]}));
+    service->setListener(nullptr);
+}
+
+TEST_F(MediaClientListenerTest, ParcelIsNeitherReadNorCopied) {
+    sp<MediaClientListener> listener = new MediaClientListener;
+    listener->notify(1, 2, 3, reinterpret_cast<const android::Parcel*>(8));
+    EXPECT_TRUE(log.waitFor(discarded[1]));
+}
+
+TEST_F(MediaClientListenerTest, KeepsNoReferenceToItsService) {
+    service->setListener(new MediaClientListener);
+    service->notify(1, 0, 0, nullptr);
+    ASSERT_TRUE(log.waitFor(discarded[1]));
+    EXPECT_EQ(service->getStrongCount(), 1);
+    service->setListener(nullptr);
+}
+
+}  // namespace
+}  // namespace orvtest

@@ -1,0 +1,149 @@
+// SPDX-License-Identifier: Apache-2.0
+// The dispatcher's handlers, its refusals, and its life.
+#include <stdlib.h>
+
+#include "DispatcherFixture.h"
+
+namespace orvtest {
+namespace {
+
+using android::OrvMediaService;
+using testing::AllOf;
+using testing::ElementsAre;
+using testing::HasSubstr;
+using testing::IsEmpty;
+
+class SyncToAsyncHandlersTest : public DispatcherFixture {
+protected:
+    Service service = new OrvMediaService;
+};
+
+TEST_F(SyncToAsyncHandlersTest, AddLogsEnterAndLeave) {
+    addHandler(service, "one");
+    EXPECT_THAT(dispatcherLines(),
+                LinesAre({dispatcherInfo("SyncToAsync::addMsgHandler(): Enter"),
+                          dispatcherInfo("SyncToAsync::addMsgHandler(): Leave")}));
+    dispatcher->delMsgHandler(service);
+}
+
+TEST_F(SyncToAsyncHandlersTest, DeleteLogsItsSteps) {
+    addHandler(service, "one");
+    log.clear();
+    dispatcher->delMsgHandler(service);
+    EXPECT_THAT(dispatcherLines(),
+                LinesAre({dispatcherInfo("SyncToAsync::delMsgHandler(): Enter"),
+                          dispatcherInfo("SyncToAsync::m_deleteMsgHandler(): Enter"),
+                          dispatcherInfo("SyncToAsync::m_deleteMsgHandler(): Leave"),
+                          dispatcherInfo("SyncToAsync::delMsgHandler(): leave")}));
+}
+
+TEST_F(SyncToAsyncHandlersTest, DeleteOfAnUnknownServiceOnlyLogsItsEnds) {
+    addHandler(service, "one");
+    Service stranger = new OrvMediaService;
+    log.clear();
+    dispatcher->delMsgHandler(stranger);
+    EXPECT_THAT(dispatcherLines(),
+                LinesAre({dispatcherInfo("SyncToAsync::delMsgHandler(): Enter"),
+                          dispatcherInfo("SyncToAsync::delMsgHandler(): leave")}));
+    EXPECT_EQ(service->getStrongCount(), 2);
+    dispatcher->delMsgHandler(service);
+}
+
+TEST_F(SyncToAsyncHandlersTest, FirstOfTwoHandlersGetsTheEventsAndGoesFirst) {
+    addHandler(service, "one");
+    addHandler(service, "two");
+    dispatcher->addAction(action(service, 1));
+    waitForPauses(1);
+    dispatcher->delMsgHandler(service);
+    dispatcher->addAction(action(service, 2));
+    waitForPauses(2);
+    EXPECT_THAT(posted(), ElementsAre("\"one\" 1", "\"two\" 2"));
+    dispatcher->delMsgHandler(service);
+    dispatcher->addAction(action(service, 3));
+    waitFor(dispatcherError("SyncToAsync::Run(): prMsgDispatcher==NULL"));
+    EXPECT_EQ(posted().size(), 2u);
+}
+
+TEST_F(SyncToAsyncHandlersTest, HandlerLetsGoOfThePosterFirst) {
+    auto* handler = new ORV::MsgHandler{
+        service, new ORV::MsgDispatcher(vm.env(), vm.local(player), string("one"))};
+    service.clear();
+    log.clear();
+    delete handler;
+    EXPECT_THAT(log.take(), LinesAre({bridgeInfo("MsgDispatcher::~MsgDispatcher(): Enter\n"),
+                                      bridgeInfo("MsgDispatcher::~MsgDispatcher(): Leave\n"),
+                                      serviceInfo("OrvMediaService::~OrvMediaService()")}));
+}
+
+TEST_F(SyncToAsyncHandlersTest, NullArgumentsAreLoggedAndIgnored) {
+    dispatcher->addAction(nullptr);
+    dispatcher->abortAction(nullptr);
+    dispatcher->abortAllActions(nullptr, true);
+    dispatcher->delMsgHandler(nullptr);
+    EXPECT_THAT(dispatcherLines(),
+                LinesAre({dispatcherInfo("SyncToAsync::addAction(): invalid argument"),
+                          dispatcherInfo("SyncToAsync::abortAction(): invalid argument"),
+                          dispatcherInfo("SyncToAsync::abortAllActions(): Enter"),
+                          dispatcherInfo("SyncToAsync::abortAllActions(): invalid argument"),
+                          dispatcherInfo("SyncToAsync::delMsgHandler(): Enter"),
+                          dispatcherInfo("SyncToAsync::delMsgHandler(): invalid argument")}));
+}
+
+TEST_F(SyncToAsyncHandlersTest, HandlerNeedsBothOfItsParts) {
+    const std::vector<ExpectedLine> refused = {
+        dispatcherInfo("SyncToAsync::addMsgHandler(): Enter"),
+        dispatcherInfo("SyncToAsync::addMsgHandler(): invalid argument")};
+    addHandler(nullptr, "one");
+    EXPECT_THAT(dispatcherLines(), LinesAre(refused));
+    log.clear();
+    dispatcher->addMsgHandler(service, nullptr);
+    EXPECT_THAT(dispatcherLines(), LinesAre(refused));
+    EXPECT_EQ(service->getStrongCount(), 1);
+}
+
+TEST_F(SyncToAsyncHandlersTest, AbortOfAnUnknownActionChangesNothing) {
+    ORV::SyncToAsyncAction stranger;
+    dispatcher->abortAction(&stranger);
+    EXPECT_EQ(stranger.cancelled, 0);
+    EXPECT_THAT(dispatcherLines(), IsEmpty());
+}
+
+TEST_F(SyncToAsyncHandlersTest, ManyThreadsMayAddAndAbort) {
+    addHandler(service, "one");
+    std::vector<std::thread> threads;
+    for (int t = 0; t < 4; t++) {
+        threads.emplace_back([&] {
+            for (int i = 0; i < 50; i++) {
+                dispatcher->addAction(action(service, i));
+                if (i % 10 == 0) dispatcher->abortAllActions(service, true);
+            }
+        });
+    }
+    for (std::thread& thread : threads) thread.join();
+    waitForPauses(200);
+    EXPECT_EQ(pauses().size(), 200u);
+    dispatcher->delMsgHandler(service);
+    EXPECT_EQ(service->getStrongCount(), 1);
+}
+
+// In a process of its own, where the dispatcher does not exist yet.
+class SyncToAsyncLifeTest : public testing::Test {
+protected:
+    SyncToAsyncLifeTest() { testing::FLAGS_gtest_death_test_style = "threadsafe"; }
+};
+
+TEST_F(SyncToAsyncLifeTest, StartsOnFirstUseAndEndsWithTheProcess) {
+    const auto use = [] {
+        ORV::SyncToAsync::getInstance();
+        ORV::SyncToAsync::getInstance();
+        exit(0);
+    };
+    EXPECT_EXIT(use(), testing::ExitedWithCode(0),
+                testing::MatchesRegex("(.|\n)*SyncToAsync::SyncToAsync\\(\\): Enter\n"
+                                      "[^\n]*SyncToAsync::SyncToAsync\\(\\): Leave\n"
+                                      "[^\n]*SyncToAsync::~SyncToAsync\\(\\): Enter\n"
+                                      "[^\n]*SyncToAsync::~SyncToAsync\\(\\): Leave\n"));
+}
+
+}  // namespace
+}  // namespace orvtest

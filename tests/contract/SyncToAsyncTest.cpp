@@ -1,0 +1,254 @@
+// SPDX-License-Identifier: Apache-2.0
+// The dispatcher's worker: order, pauses, and what becomes of each action.
+#include <binder/Parcel.h>
+#include <errno.h>
+#include <sys/prctl.h>
+
+#include <algorithm>
+#include <set>
+
+#include "DispatcherFixture.h"
+#include "MutexProbe.h"
+
+namespace orvtest {
+namespace {
+
+using android::OrvMediaService;
+using testing::ElementsAre;
+using testing::IsEmpty;
+
+const ExpectedLine kNotValid = dispatcherInfo("SyncToAsync::Run(): action is not valid");
+const ExpectedLine kNoPoster = dispatcherError("SyncToAsync::Run(): prMsgDispatcher==NULL");
+const ExpectedLine kNoService =
+    dispatcherInfo("SyncToAsync::m_getMsgDispather(): invalid argument");
+const ExpectedLine kCancelled = dispatcherInfo("SyncToAsync::Run(): this event has been canceled");
+const ExpectedLine kNoPayload = dispatcherError("SyncToAsync::Run(): prMsgWrapper==NULL");
+
+// A service with a registered poster named "one".
+class SyncToAsyncTest : public DispatcherFixture {
+protected:
+    void SetUp() override {
+        DispatcherFixture::SetUp();
+        service = new OrvMediaService;
+        addHandler(service, "one");
+        log.clear();
+    }
+    void TearDown() override {
+        dispatcher->delMsgHandler(service);
+        EXPECT_EQ(service->getStrongCount(), 1) << "an action or a handler was not deleted";
+        DispatcherFixture::TearDown();
+    }
+
+    Service service;
+};
+
+TEST_F(SyncToAsyncTest, IsOnePerProcess) { EXPECT_EQ(ORV::SyncToAsync::getInstance(), dispatcher); }
+
+TEST_F(SyncToAsyncTest, ActionsAreDeliveredInOrderWithAPauseBehindEach) {
+    for (int msg : {1, 2, 3}) dispatcher->addAction(action(service, msg));
+    waitForPauses(3);
+    EXPECT_THAT(posted(), ElementsAre("\"one\" 1", "\"one\" 2", "\"one\" 3"));
+    ASSERT_EQ(pauses().size(), 3u);
+    for (const timespec& pause : pauses()) {
+        EXPECT_EQ(pause.tv_sec, 0);
+        EXPECT_EQ(pause.tv_nsec, 50000000);
+    }
+    EXPECT_THAT(dispatcherLines(), IsEmpty());
+}
+
+TEST_F(SyncToAsyncTest, AllOfTheMessageReachesJava) {
+    android::Parcel parcel;
+    for (int32_t word : {1, 2, 3}) parcel.writeInt32(word);
+    auto* sent = action(service, 5);
+    *sent->payload = NotifyMessage{5, -6, 7, &parcel};
+    dispatcher->addAction(sent);
+    waitForPauses(1);
+    EXPECT_THAT(vm.javaCallTexts(),
+                ElementsAre("postEventFromNative(\"one\", 5, -6, 7, byte[12])"));
+}
+
+TEST_F(SyncToAsyncTest, OneNamedWorkerDeliversEverything) {
+    std::set<std::thread::id> threads;
+    std::set<std::string> names;
+    duringPause = [&] {
+        char name[16] = {};
+        prctl(PR_GET_NAME, name, 0, 0, 0);
+        names.insert(name);
+    };
+    for (int msg : {1, 2}) dispatcher->addAction(action(service, msg));
+    waitForPauses(2);
+    for (const fakejni::JavaCall& call : vm.javaCalls()) threads.insert(call.thread);
+    EXPECT_EQ(threads.size(), 1u);
+    EXPECT_EQ(threads.count(std::this_thread::get_id()), 0u);
+    EXPECT_THAT(names, ElementsAre("thread"));
+}
+
+TEST_F(SyncToAsyncTest, OrderIsThatOfAllServicesTogether) {
+    Service other = new OrvMediaService;
+    addHandler(other, "two");
+    for (int msg : {1, 2}) {
+        dispatcher->addAction(action(service, msg));
+        dispatcher->addAction(action(other, msg));
+    }
+    waitForPauses(4);
+    EXPECT_THAT(posted(), ElementsAre("\"one\" 1", "\"two\" 1", "\"one\" 2", "\"two\" 2"));
+    dispatcher->delMsgHandler(other);
+}
+
+TEST_F(SyncToAsyncTest, ActionIsDeletedBeforeThePause) {
+    int countInPause = 0;
+    duringPause = [&] { countInPause = service->getStrongCount(); };
+    dispatcher->addAction(action(service, 1));
+    waitForPauses(1);
+    EXPECT_EQ(countInPause, 2);  // the test's and the handler's
+}
+
+TEST_F(SyncToAsyncTest, UnknownKindIsDeletedWithoutDelivery) {
+    auto* other = action(service, 1);
+    other->kind = 1;
+    dispatcher->addAction(other);
+    waitForPauses(1);
+    EXPECT_THAT(posted(), IsEmpty());
+    EXPECT_THAT(dispatcherLines(), IsEmpty());
+}
+
+TEST_F(SyncToAsyncTest, MissingPayloadIsAnErrorWithAPause) {
+    auto* empty = action(service, 1);
+    delete empty->payload;
+    empty->payload = nullptr;
+    dispatcher->addAction(empty);
+    waitForPauses(1);
+    EXPECT_THAT(posted(), IsEmpty());
+    EXPECT_THAT(dispatcherLines(), LinesAre({kNoPayload}));
+}
+
+TEST_F(SyncToAsyncTest, UnknownKindNeedsNoPayload) {
+    auto* other = action(service, 1);
+    delete other->payload;
+    other->payload = nullptr;
+    other->kind = -1;
+    dispatcher->addAction(other);
+    waitForPauses(1);
+    EXPECT_THAT(dispatcherLines(), IsEmpty());
+}
+
+TEST_F(SyncToAsyncTest, CancelledActionIsLoggedAndPaused) {
+    auto* cancelled = action(service, 1);
+    cancelled->cancelled = -1;
+    dispatcher->addAction(cancelled);
+    waitForPauses(1);
+    EXPECT_THAT(posted(), IsEmpty());
+    EXPECT_THAT(dispatcherLines(), LinesAre({kCancelled}));
+}
+
+TEST_F(SyncToAsyncTest, InvalidActionIsDeletedWithoutPause) {
+    auto* invalid = action(service, 1);
+    invalid->valid = false;
+    invalid->cancelled = 1;
+    dispatcher->addAction(invalid);
+    waitFor(kNotValid);
+    EXPECT_THAT(posted(), IsEmpty());
+    EXPECT_THAT(pauses(), IsEmpty());
+    EXPECT_THAT(dispatcherLines(), LinesAre({kNotValid}));
+}
+
+TEST_F(SyncToAsyncTest, ActionWithoutServiceFindsNoPoster) {
+    dispatcher->addAction(action(nullptr, 1));
+    waitFor(kNoPoster);
+    EXPECT_THAT(pauses(), IsEmpty());
+    EXPECT_THAT(dispatcherLines(), LinesAre({kNoService, kNoPoster}));
+}
+
+TEST_F(SyncToAsyncTest, ActionOfAnUnregisteredServiceFindsNoPoster) {
+    Service stranger = new OrvMediaService;
+    dispatcher->addAction(action(stranger, 1));
+    waitFor(kNoPoster);
+    EXPECT_THAT(pauses(), IsEmpty());
+    EXPECT_THAT(dispatcherLines(), LinesAre({kNoPoster}));
+    EXPECT_EQ(stranger->getStrongCount(), 1);
+}
+
+TEST_F(SyncToAsyncTest, AbortAllKeepingThemValidCancelsEachWithAPause) {
+    {
+        const Hold held = hold();
+        for (int msg : {1, 2}) dispatcher->addAction(action(service, msg));
+        dispatcher->abortAllActions(service, true);
+    }
+    waitForPauses(2);
+    EXPECT_THAT(posted(), IsEmpty());
+    EXPECT_THAT(dispatcherLines(),
+                LinesAre({dispatcherInfo("SyncToAsync::abortAllActions(): Enter"),
+                          dispatcherInfo("SyncToAsync::abortAllActions(): Leave"), kCancelled,
+                          kCancelled}));
+}
+
+TEST_F(SyncToAsyncTest, AbortAllMakesThemInvalidAndTheyGoWithoutPause) {
+    {
+        const Hold held = hold();
+        for (int msg : {1, 2}) dispatcher->addAction(action(service, msg));
+        dispatcher->abortAllActions(service, false);
+    }
+    waitFor(kNotValid, 2);
+    EXPECT_THAT(posted(), IsEmpty());
+    EXPECT_THAT(pauses(), IsEmpty());
+    EXPECT_THAT(
+        dispatcherLines(),
+        LinesAre({dispatcherInfo("SyncToAsync::abortAllActions(): Enter"),
+                  dispatcherInfo("SyncToAsync::abortAllActions(): Leave"), kNotValid, kNotValid}));
+}
+
+TEST_F(SyncToAsyncTest, AbortAllLeavesOtherServicesAndLaterActionsAlone) {
+    Service other = new OrvMediaService;
+    addHandler(other, "two");
+    {
+        const Hold held = hold();
+        dispatcher->addAction(action(service, 1));
+        dispatcher->addAction(action(other, 2));
+        dispatcher->abortAllActions(service, false);
+        dispatcher->addAction(action(service, 3));
+    }
+    waitForPauses(2);
+    EXPECT_THAT(posted(), ElementsAre("\"two\" 2", "\"one\" 3"));
+    dispatcher->delMsgHandler(other);
+}
+
+TEST_F(SyncToAsyncTest, AbortOneCancelsThatOneOnly) {
+    {
+        const Hold held = hold();
+        auto* first = action(service, 1);
+        dispatcher->addAction(first);
+        dispatcher->addAction(action(service, 2));
+        dispatcher->abortAction(first);
+    }
+    waitForPauses(2);
+    EXPECT_THAT(posted(), ElementsAre("\"one\" 2"));
+    EXPECT_THAT(dispatcherLines(), LinesAre({kCancelled}));
+}
+
+TEST_F(SyncToAsyncTest, AbortOfADeliveredActionChangesNothing) {
+    auto* delivered = action(service, 1);
+    dispatcher->addAction(delivered);
+    waitForPauses(1);
+    dispatcher->abortAction(delivered);
+    EXPECT_THAT(posted(), ElementsAre("\"one\" 1"));
+    EXPECT_THAT(dispatcherLines(), IsEmpty());
+}
+
+TEST_F(SyncToAsyncTest, MutexIsHeldWhileJavaRunsAndInThePause) {
+    std::vector<int> held;
+    const auto look = [&] { held.push_back(tryFromAnotherThread(dispatcherMutex())); };
+    playerClass
+        .findMethod("postEventFromNative", "(Ljava/lang/Object;IIILjava/lang/Object;)V", true)
+        ->implementation = [&](const fakejni::Invocation&) {
+        look();
+        return fakejni::Value{};
+    };
+    duringPause = look;
+    dispatcher->addAction(action(service, 1));
+    waitForPauses(1);
+    EXPECT_THAT(held, ElementsAre(EBUSY, EBUSY));
+    EXPECT_EQ(tryFromAnotherThread(dispatcherMutex()), 0);
+}
+
+}  // namespace
+}  // namespace orvtest
