@@ -35,6 +35,6 @@ is_configured() {
 ninja_quietly() {
     local log=$ORV_BUILD/log/ninja.log
     ninja -C "$ORV_BUILD" "$@" >"$log" 2>&1 </dev/null && return
-    sed -n '/^FAILED\|^ninja: error/,$p' "$log" | head -n 60 >&2
+    sed -n '/^FAILED\|^CMake Error\|^ninja: error/,$p' "$log" | head -n 60 >&2
     die "the build failed; all it said is in $log"
 }

@@ -18,6 +18,8 @@ final class ControlBar extends JPanel {
     private final JLabel total = label();
     private final SeekBar seekBar;
     private final FlatButton play;
+    private final FlatButton back;
+    private final FlatButton forward;
     private final FlatButton mute;
     private final LevelBar volume;
     private final FlatButton speed;
@@ -29,6 +31,12 @@ final class ControlBar extends JPanel {
         super(new BorderLayout(0, 4));
         seekBar = new SeekBar(controls::seekTo);
         play = new FlatButton(Glyph.PLAY, "Play (Space)", controls::togglePlaying);
+        back =
+                new FlatButton(
+                        Glyph.BACK, "Back 10 seconds (Left)", () -> controls.skip(-SKIP_MS));
+        forward =
+                new FlatButton(
+                        Glyph.FORWARD, "On 10 seconds (Right)", () -> controls.skip(SKIP_MS));
         mute = new FlatButton(Glyph.VOLUME, "Mute (M)", controls::toggleMuted);
         volume = new LevelBar("Volume", 90, controls::setVolume);
         speed = new FlatButton(null, "Speed", () -> controls.chooseSpeed(speedButton()));
@@ -41,10 +49,11 @@ final class ControlBar extends JPanel {
         fullScreen =
                 new FlatButton(
                         Glyph.FULL_SCREEN, "Full screen (F)", controls::toggleFullScreen);
+        speed.setText(Speeds.label(1));
         setBackground(Theme.PANEL);
         setBorder(BorderFactory.createEmptyBorder(8, 14, 10, 14));
         add(timeRow(), BorderLayout.NORTH);
-        add(buttonRow(controls), BorderLayout.CENTER);
+        add(buttonRow(), BorderLayout.CENTER);
     }
 
     Component audioButton() {
@@ -85,6 +94,14 @@ final class ControlBar extends JPanel {
         subtitles.setEnabled(subtitleTracks > 0);
     }
 
+    /** Leaves only what works without media. */
+    void showNothingToPlay() {
+        for (Component control : new Component[] {play, back, forward, seekBar, speed}) {
+            control.setEnabled(false);
+        }
+        showTracks(0, 0);
+    }
+
     void showFullScreen(boolean on) {
         fullScreen.show(
                 on ? Glyph.WINDOWED : Glyph.FULL_SCREEN,
@@ -100,15 +117,11 @@ final class ControlBar extends JPanel {
         return row;
     }
 
-    private Component buttonRow(Controls controls) {
+    private Component buttonRow() {
         Box row = Box.createHorizontalBox();
         row.add(play);
-        row.add(
-                new FlatButton(
-                        Glyph.BACK, "Back 10 seconds (Left)", () -> controls.skip(-SKIP_MS)));
-        row.add(
-                new FlatButton(
-                        Glyph.FORWARD, "On 10 seconds (Right)", () -> controls.skip(SKIP_MS)));
+        row.add(back);
+        row.add(forward);
         row.add(Box.createHorizontalStrut(Theme.GAP));
         row.add(mute);
         volume.setMaximumSize(volume.getPreferredSize());

@@ -104,6 +104,7 @@ final class Stage {
     }
 
     void showFailure(String sentence) {
+        bar.showNothingToPlay();
         tellInstead(Glyph.ALERT, Theme.ALERT, "This cannot be played", sentence);
     }
 
