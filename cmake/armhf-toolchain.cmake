@@ -39,8 +39,12 @@ set(ENV{PKG_CONFIG_LIBDIR} ${orv_library_dir}/pkgconfig:${ORV_SYSROOT}/usr/share
 list(JOIN orv_runtime_dirs ":" orv_runtime_path)
 set(CMAKE_CROSSCOMPILING_EMULATOR
   qemu-arm -L ${ORV_SYSROOT} -E LD_LIBRARY_PATH=${orv_runtime_path})
-# The virtual machine that the Java tests run on.
+# The virtual machine that the Java tests run on. A 32-bit program cannot list
+# folders of the usual file systems in the emulator, so its temporary files go
+# to memory; and it starts the host's programs itself, as its helper program
+# is one that only the emulator can run.
 set(ORV_JAVA_RUNTIME
-  ${CMAKE_CROSSCOMPILING_EMULATOR} ${ORV_SYSROOT}/usr/lib/jvm/java-17-openjdk-armhf/bin/java)
+  ${CMAKE_CROSSCOMPILING_EMULATOR} ${ORV_SYSROOT}/usr/lib/jvm/java-17-openjdk-armhf/bin/java
+  -Djava.io.tmpdir=/dev/shm -Djdk.lang.Process.launchMechanism=VFORK)
 # Emulated programs are slow to start: their tests are listed when ctest runs.
 set(CMAKE_GTEST_DISCOVER_TESTS_DISCOVERY_MODE PRE_TEST)
