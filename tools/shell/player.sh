@@ -6,17 +6,38 @@ run_player() {
     use packages build
     need_packages "build and play" play
     build_targets off mediaplayer_orv orv_player
+    set_java_command
+    archive_classes
     use_utf8
     describe_terminal
     choose_log "$@"
-    exec java "${ORV_JAVA_OPTIONS[@]}" "-Djava.library.path=$ORV_BUILD/lib" \
-        "-Dorv.sample=$ORV_BUILD/media/sample.mkv" "-Dorv.make-sample=$ORV_ROOT/tools/make-sample" \
-        -cp "$ORV_BUILD/java/*:/usr/share/java/picocli.jar:/usr/share/java/gson.jar" \
-        com.quintora.orv.player.Main "$@"
+    exec "${JAVA_COMMAND[@]}" "$@"
 }
 
-# A short life needs a quick start: one compiler tier, the simplest collector.
-ORV_JAVA_OPTIONS=(-XX:TieredStopAtLevel=1 -XX:+UseSerialGC -Xshare:auto)
+# A short life needs a quick start: one compiler tier, the simplest collector,
+# and the program's classes from an archive.
+set_java_command() {
+    local jars=$ORV_BUILD/java share=/usr/share/java
+    CLASS_ARCHIVE=$jars/player.jsa
+    JAVA_COMMAND=(java -XX:TieredStopAtLevel=1 -XX:+UseSerialGC
+        -Xshare:auto "-XX:SharedArchiveFile=$CLASS_ARCHIVE" -Xlog:disable -Xlog:all=error:stderr
+        "-Djava.library.path=$ORV_BUILD/lib"
+        "-Dorv.sample=$ORV_BUILD/media/sample.mkv" "-Dorv.make-sample=$ORV_ROOT/tools/make-sample"
+        -cp "$jars/orv_player.jar:$jars/mediaplayer_orv_java.jar:$jars/orv_platform_java.jar:$share/picocli.jar:$share/gson.jar"
+        com.quintora.orv.player.Main)
+}
+
+# Made by a run that loads the classes; without an archive the player starts too.
+archive_classes() {
+    [ "$CLASS_ARCHIVE" -ot "$ORV_BUILD/java/orv_player.jar" ] ||
+        [ "$CLASS_ARCHIVE" -ot "$ORV_BUILD/java/mediaplayer_orv_java.jar" ] || return 0
+    local draft=$CLASS_ARCHIVE.$$
+    if "${JAVA_COMMAND[@]/#-XX:SharedArchiveFile=*/-XX:ArchiveClassesAtExit=$draft}" play --help \
+        >/dev/null 2>&1; then
+        mv -f -- "$draft" "$CLASS_ARCHIVE"
+    fi
+    rm -f -- "$draft"
+}
 
 # Java itself cannot tell how wide its terminal is, nor whether it has one.
 describe_terminal() {
@@ -24,7 +45,7 @@ describe_terminal() {
     local columns
     read -r _ columns < <(stty size 2>/dev/null </dev/tty) || columns=80
     [ "${columns:-0}" -gt 0 ] || columns=80
-    ORV_JAVA_OPTIONS+=("-Dorv.columns=$columns")
+    JAVA_COMMAND=("${JAVA_COMMAND[0]}" "-Dorv.columns=$columns" "${JAVA_COMMAND[@]:1}")
 }
 
 # The native libraries log to standard error, where a player's user wants quiet.

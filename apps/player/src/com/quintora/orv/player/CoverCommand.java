@@ -7,13 +7,12 @@ import java.nio.file.Files;
 import java.nio.file.Path;
 import java.util.concurrent.Callable;
 import picocli.CommandLine.Command;
-import picocli.CommandLine.Option;
+import picocli.CommandLine.Mixin;
 import picocli.CommandLine.Parameters;
 
 /** Writes the picture inside a media file. */
 @Command(
         name = "cover",
-        mixinStandardHelpOptions = true,
         description = "Writes the picture inside a file, such as an album's cover, byte for byte.")
 final class CoverCommand implements Callable<Integer> {
     @Parameters(paramLabel = "FILE", description = "A media file or URL.")
@@ -22,8 +21,7 @@ final class CoverCommand implements Callable<Integer> {
     @Parameters(paramLabel = "OUT", description = "Where to write the picture.")
     private Path out;
 
-    @Option(names = "--log", description = "Show the native library's log.")
-    private boolean log;
+    @Mixin private CommonOptions common;
 
     @Override
     public Integer call() throws Failure {

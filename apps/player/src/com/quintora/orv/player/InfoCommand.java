@@ -6,6 +6,7 @@ import com.quintora.mmp.OrvMediaPlayer;
 import java.io.PrintWriter;
 import java.util.concurrent.Callable;
 import picocli.CommandLine.Command;
+import picocli.CommandLine.Mixin;
 import picocli.CommandLine.Model.CommandSpec;
 import picocli.CommandLine.Option;
 import picocli.CommandLine.Parameters;
@@ -14,7 +15,6 @@ import picocli.CommandLine.Spec;
 /** Tells what media hold. */
 @Command(
         name = "info",
-        mixinStandardHelpOptions = true,
         description = "Tells the container, duration, tracks, chapters and metadata of media.")
 final class InfoCommand implements Callable<Integer> {
     @Parameters(paramLabel = "FILE|URL", description = "A media file or URL.")
@@ -23,9 +23,7 @@ final class InfoCommand implements Callable<Integer> {
     @Option(names = "--json", description = "For programs: one JSON object.")
     private boolean json;
 
-    @Option(names = "--log", description = "Show the native library's log.")
-    private boolean log;
-
+    @Mixin private CommonOptions common;
     @Spec private CommandSpec spec;
 
     @Override

@@ -11,7 +11,6 @@ import picocli.CommandLine.ParameterException;
  */
 @Command(
         name = "orv",
-        mixinStandardHelpOptions = true,
         subcommands = {
             PlayCommand.class,
             InfoCommand.class,

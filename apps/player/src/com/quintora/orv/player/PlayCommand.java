@@ -14,10 +14,10 @@ import picocli.CommandLine.Spec;
 /** Plays in a window, or in the terminal where there is no display. */
 @Command(
         name = "play",
-        mixinStandardHelpOptions = true,
         description = "Plays a file or URL: in a window, or in the terminal where there is no"
                 + " display.")
 final class PlayCommand implements Callable<Integer> {
+    @Mixin private CommonOptions common;
     @Mixin private PlayOptions options;
     @Spec private CommandSpec spec;
 

@@ -80,9 +80,6 @@ public final class PlayOptions {
     @Option(names = "--stats", description = "Tell afterwards how quickly and how smoothly it went.")
     boolean stats;
 
-    @Option(names = "--log", description = "Show the native library's log.")
-    boolean log;
-
     /** What stands in a window's title bar: the file's name, or the whole URL. */
     public String title() {
         return source.contains("://") ? source : String.valueOf(Path.of(source).getFileName());

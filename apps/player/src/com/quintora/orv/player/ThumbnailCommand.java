@@ -15,6 +15,7 @@ import java.nio.file.Path;
 import java.util.concurrent.Callable;
 import javax.imageio.ImageIO;
 import picocli.CommandLine.Command;
+import picocli.CommandLine.Mixin;
 import picocli.CommandLine.Model.CommandSpec;
 import picocli.CommandLine.Option;
 import picocli.CommandLine.ParameterException;
@@ -24,7 +25,6 @@ import picocli.CommandLine.Spec;
 /** Writes one picture of a video. */
 @Command(
         name = "thumbnail",
-        mixinStandardHelpOptions = true,
         description = "Writes one picture of a video as a PNG file.")
 final class ThumbnailCommand implements Callable<Integer> {
     private static final int USUAL_HEIGHT = 180;
@@ -50,9 +50,7 @@ final class ThumbnailCommand implements Callable<Integer> {
             description = "How large, at most 8192x255; without it, 180 rows in the video's shape.")
     private Size size;
 
-    @Option(names = "--log", description = "Show the native library's log.")
-    private boolean log;
-
+    @Mixin private CommonOptions common;
     @Spec private CommandSpec spec;
 
     @Override
