@@ -3,6 +3,9 @@
 
 #include <utility>
 
+#include "AlbumArt.h"
+#include "PictureCanvas.h"
+
 namespace android {
 
 TarnPlayer::Engine::Engine(int decoder, orvtarn::Notifier::Deliver deliver)
@@ -11,8 +14,19 @@ TarnPlayer::Engine::Engine(int decoder, orvtarn::Notifier::Deliver deliver)
       events(mpv, state, video, notifier),
       loader(mpv, state, video, events, protocol),
       seeker(mpv, state, notifier),
-      transport(mpv, state) {
+      transport(mpv, state),
+      speed(mpv, state, seeker, transport),
+      stepper(mpv, state, seeker, transport),
+      abRepeat(mpv, state),
+      audio(mpv, video),
+      tracks(mpv, state, loader, seeker),
+      subtitles(mpv, state, tracks),
+      bytes(mpv, state, loader, seeker),
+      metaData(mpv, state, loader),
+      parameters(mpv, video, tracks, subtitles) {
     loader.setBeforeLoad([this] { beforeLoad(); });
+    loader.setOnForget([this] { subtitles.reset(); });
+    events.setEndHandler([this] { return speed.onEndReached(); });
     if (!create(decoder >= 0)) release();
 }
 
@@ -25,6 +39,7 @@ void TarnPlayer::Engine::release() {
     if (!gate.close()) return;
     loader.release();
     gate.awaitEmpty();
+    speed.shutDown();
     video.destroy();
     events.stop();
     mpv.destroy();
@@ -35,7 +50,30 @@ void TarnPlayer::Engine::beforeLoad() {
     mpv.set("pause", true);
     mpv.set("aid", "auto");
     mpv.set("vid", "auto");
-    mpv.set("sid", "no");
+    speed.reset();
+    abRepeat.reset();
+    subtitles.beforeLoad();
+}
+
+bool TarnPlayer::Engine::drawThumbnail(const _Media_Thumbnail_Info_T* thumbnail) {
+    constexpr char kName[] = "getThumbnailInfo";
+    if (thumbnail == nullptr) return orvtarn::refused(kName, "null argument");
+    if (orvtarn::checkThumbnail(*thumbnail) != NO_ERROR) {
+        return orvtarn::refused(kName, "no such mode or size, or too small a buffer");
+    }
+    int position = 0;
+    if (state.requireOpen(kName) != NO_ERROR) return false;
+    transport.getCurrentPosition(&position);
+    const status_t status = loader.details()->draw(position, orvtarn::FramePick::Exact, *thumbnail);
+    return status == NO_ERROR || orvtarn::failed(status, kName, "no picture") == NO_ERROR;
+}
+
+MediaAlbumArt* TarnPlayer::Engine::copyAlbumArt() {
+    MediaAlbumArt* art = nullptr;
+    loader.details()->withFile(
+        [&](orvtarn::MediaFile& file) { art = orvtarn::extractAlbumArt(file); });
+    if (art == nullptr) orvtarn::refused("extractAlbumArt", "no picture");
+    return art;
 }
 
 }  // namespace android

@@ -3,15 +3,24 @@
 
 #include <orvtarn/TarnPlayer.h>
 
+#include "AbRepeat.h"
+#include "Audio.h"
+#include "BytePosition.h"
 #include "EngineLog.h"
 #include "EventLoop.h"
 #include "Gate.h"
 #include "Loader.h"
+#include "MediaMetaData.h"
 #include "MpvHandle.h"
 #include "Notifier.h"
+#include "Parameters.h"
 #include "PlayerState.h"
 #include "Seeker.h"
+#include "Speed.h"
+#include "Stepper.h"
 #include "StreamProtocol.h"
+#include "Subtitles.h"
+#include "Tracks.h"
 #include "Transport.h"
 #include "VideoOutput.h"
 
@@ -52,6 +61,19 @@ public:
     orvtarn::Loader loader;
     orvtarn::Seeker seeker;
     orvtarn::Transport transport;
+    orvtarn::Speed speed;
+    orvtarn::Stepper stepper;
+    orvtarn::AbRepeat abRepeat;
+    orvtarn::Audio audio;
+    orvtarn::Tracks tracks;
+    orvtarn::Subtitles subtitles;
+    orvtarn::BytePosition bytes;
+    orvtarn::MediaMetaData metaData;
+    orvtarn::Parameters parameters;
+
+    // The picture of the current position.
+    bool drawThumbnail(const _Media_Thumbnail_Info_T* thumbnail);
+    MediaAlbumArt* copyAlbumArt();
 
 private:
     bool create(bool hardwareDecoder);

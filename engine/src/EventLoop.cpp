@@ -122,7 +122,7 @@ void EventLoop::onEndFile(const mpv_event_end_file& end) {
 void EventLoop::onRestart() {
     onVideoSize();
     const bool hasVideo = mMpv.getInt("vid").value_or(0) > 0;
-    const double duration = mMpv.getDouble("duration").value_or(0);
+    const double duration = mMpv.getDouble("duration").value_or(sourceDuration());
     const bool seekable = mMpv.getFlag("seekable").value_or(false);
     mState.update([&](PlayerState::Values& v) {
         v.restarts++;
@@ -236,6 +236,16 @@ void EventLoop::failWith(android::status_t status) {
     if (!news) return;
     ALOGE("playback: ended by an error (status %d)", status);
     mNotifier.post(android::MEDIA_ERROR, android::MEDIA_ERROR_UNKNOWN, status);
+}
+
+// Seconds, by the source's own word.
+double EventLoop::sourceDuration() {
+    std::shared_ptr<MediaSource> source;
+    {
+        std::lock_guard<std::mutex> lock(mSourceMutex);
+        source = mSource;
+    }
+    return source != nullptr ? static_cast<double>(source->knownDuration()) / 1000 : 0;
 }
 
 bool EventLoop::sourceFailed() {

@@ -51,6 +51,7 @@ private:
     void onVideoSize();
     void becomePreparedIfReady();
     void failWith(android::status_t status);
+    double sourceDuration();
     bool sourceFailed();
 
     MpvHandle& mMpv;

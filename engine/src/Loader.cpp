@@ -27,6 +27,18 @@ constexpr seconds kUnloadLimit{10};
 // How often a read that blocks is told again to end.
 constexpr milliseconds kCancelInterval{20};
 
+// What raw samples are when nobody says.
+const IORV_PB_CTRL_SET_MEDIA_INFO_T kUsualSamples = [] {
+    IORV_PB_CTRL_SET_MEDIA_INFO_T info = {};
+    info.eMediaType = E_ORV_MEDIA_TYPE_AUDIO_ES;
+    info.uFormatInfo.tAudioEsInfo.tAudInfo.eAudEnc = E_ORV_AUD_ENC_PCM;
+    info.uFormatInfo.tAudioEsInfo.tAudInfo.uAudCodecInfo.t_pcm_info = {
+        E_ORV_PCM_TYPE_SIGNED,         E_Orv_Aud_Ch_Num{2},
+        E_Orv_Aud_Sample_Rate{44100},  4,
+        E_Orv_Aud_Bits_Per_Sample{16}, 0};
+    return info;
+}();
+
 }  // namespace
 
 android::status_t Loader::setUrl(const char* url, RequestHeaders headers) {
@@ -66,6 +78,8 @@ android::status_t Loader::setSource(const char* operation, std::shared_ptr<Media
     {
         std::lock_guard<std::mutex> lock(mSourceMutex);
         mSource = source;
+        mDetails = std::make_shared<MediaDetails>(source);
+        mDetails->setRaw(mRawFormat.has_value());
     }
     mProtocol.setSource(source);
     mEvents.setSource(source);
@@ -78,9 +92,39 @@ std::shared_ptr<MediaSource> Loader::source() const {
     return mSource;
 }
 
-void Loader::setLoadOptions(std::string options) {
+std::shared_ptr<MediaDetails> Loader::details() const {
     std::lock_guard<std::mutex> lock(mSourceMutex);
-    mLoadOptions = std::move(options);
+    return mDetails != nullptr ? mDetails : std::make_shared<MediaDetails>(nullptr);
+}
+
+android::status_t Loader::setRawFormat(const IORV_PB_CTRL_SET_MEDIA_INFO_T& info) {
+    PcmFormat format;
+    std::string reason;
+    if (!pcmFormat(info, format, reason)) {
+        return failed(android::BAD_VALUE, "setPCMMediaInfo", reason.c_str());
+    }
+    std::lock_guard<std::mutex> load(mLoadMutex);
+    const Phase phase = mState.phase();
+    if (phase != Phase::Idle && phase != Phase::Initialized && phase != Phase::Stopped) {
+        return PlayerState::wrongPhase("setPCMMediaInfo", phase);
+    }
+    std::lock_guard<std::mutex> lock(mSourceMutex);
+    mRawFormat = format;
+    if (mDetails != nullptr) mDetails->setRaw(true);
+    return android::NO_ERROR;
+}
+
+android::status_t Loader::setRaw() {
+    {
+        std::lock_guard<std::mutex> lock(mSourceMutex);
+        if (mRawFormat) return android::NO_ERROR;
+    }
+    return setRawFormat(kUsualSamples);
+}
+
+int Loader::rawBytesPerSecond() const {
+    std::lock_guard<std::mutex> lock(mSourceMutex);
+    return mRawFormat ? mRawFormat->bytesPerSecond : 0;
 }
 
 android::status_t Loader::prepare() {
@@ -119,7 +163,7 @@ android::status_t Loader::load() {
     std::string options;
     {
         std::lock_guard<std::mutex> lock(mSourceMutex);
-        options = mLoadOptions;
+        if (mRawFormat) options = loadfileOptions(*mRawFormat);
     }
     const int error = mMpv.command({"loadfile", media->name().c_str(), "replace", options.c_str()});
     if (error >= 0) return android::NO_ERROR;
@@ -236,14 +280,17 @@ void Loader::unload() {
 
 void Loader::forgetSource() {
     std::shared_ptr<MediaSource> media;
+    std::shared_ptr<MediaDetails> details;
     {
         std::lock_guard<std::mutex> lock(mSourceMutex);
         media.swap(mSource);
-        mLoadOptions.clear();
+        details.swap(mDetails);
+        mRawFormat.reset();
     }
     if (mOnForget) mOnForget();
     mProtocol.setSource(nullptr);
     mEvents.setSource(nullptr);
+    if (details != nullptr) details->close();
     if (media != nullptr) media->close();
 }
 

@@ -8,11 +8,14 @@
 #include <functional>
 #include <memory>
 #include <mutex>
+#include <optional>
 #include <string>
 
 #include "EventLoop.h"
+#include "MediaDetails.h"
 #include "MediaSource.h"
 #include "MpvHandle.h"
+#include "PcmFormat.h"
 #include "PlayerState.h"
 #include "StreamProtocol.h"
 #include "VideoOutput.h"
@@ -43,11 +46,19 @@ public:
     void setBeforeLoad(std::function<void()> action) { mBeforeLoad = std::move(action); }
     // Called when the source is given up.
     void setOnForget(std::function<void()> action) { mOnForget = std::move(action); }
-    // Options of the next loads, as "loadfile" takes them.
-    void setLoadOptions(std::string options);
+    // The media are raw samples, until the source is given up. BAD_VALUE for a
+    // description that does not fit together, INVALID_OPERATION while media are
+    // open.
+    android::status_t setRawFormat(const IORV_PB_CTRL_SET_MEDIA_INFO_T& info);
+    // The same without a description: two channels of 16 bits at 44100 Hz.
+    android::status_t setRaw();
+    // 0 for media that are not raw.
+    int rawBytesPerSecond() const;
 
     // The current source; null when there is none.
     std::shared_ptr<MediaSource> source() const;
+    // Never null; without a source they have nothing to say.
+    std::shared_ptr<MediaDetails> details() const;
 
 private:
     android::status_t setSource(const char* operation, std::shared_ptr<MediaSource> source);
@@ -72,7 +83,8 @@ private:
     std::mutex mLoadMutex;
     mutable std::mutex mSourceMutex;
     std::shared_ptr<MediaSource> mSource;
-    std::string mLoadOptions;
+    std::shared_ptr<MediaDetails> mDetails;
+    std::optional<PcmFormat> mRawFormat;
 };
 
 }  // namespace orvtarn

@@ -29,6 +29,8 @@ public:
     virtual RequestHeaders headers() const { return {}; }
     // Whether openReader gives readers.
     virtual bool isOfBytes() const { return false; }
+    // A file: reading it once more costs nobody anything.
+    virtual bool isLocal() const { return false; }
     // A reader with a position of its own; null when the source is closed,
     // cannot be read twice, or is not of bytes.
     virtual std::unique_ptr<ByteSource> openReader() { return nullptr; }
@@ -79,6 +81,7 @@ public:
 
     std::string name() const override { return mName; }
     RequestHeaders headers() const override { return mHeaders; }
+    bool isLocal() const override { return mName[0] == '/'; }
 
 private:
     const std::string mName;
@@ -95,6 +98,7 @@ public:
 
     std::string name() const override { return kByteSourceName; }
     bool isOfBytes() const override { return true; }
+    bool isLocal() const override { return true; }
     std::unique_ptr<ByteSource> openReader() override;
     void close() override;
 

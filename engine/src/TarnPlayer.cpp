@@ -8,11 +8,7 @@
 namespace android {
 namespace {
 
-// For operations that the engine does not carry out yet.
-status_t notYet(const char* operation) {
-    ALOGE("%s: not available yet", operation);
-    return INVALID_OPERATION;
-}
+constexpr int kLargestPin = 9999;
 
 orvtarn::RequestHeaders pairsOf(const KeyedVector<String8, String8>* headers) {
     orvtarn::RequestHeaders pairs;
@@ -34,17 +30,28 @@ status_t TarnPlayer::release() {
     mEngine->release();
     return NO_ERROR;
 }
-void TarnPlayer::configPlayer(bool) {}
-void TarnPlayer::setPcmFlag() {}
-int TarnPlayer::setABRepeat(int) { return notYet(__func__) == NO_ERROR; }
+// Such files hold a flat picture that plays as it is.
+void TarnPlayer::configPlayer(bool ssif) {
+    if (ssif) ALOGI("configPlayer: a stereoscopic file plays its flat picture");
+}
+
+void TarnPlayer::setPcmFlag() {
+    mEngine->call(__func__, status_t{INVALID_OPERATION}, [&] { return mEngine->loader.setRaw(); });
+}
+
+int TarnPlayer::setABRepeat(int type) {
+    return mEngine->call(__func__, int{false}, [&] { return int{mEngine->abRepeat.set(type)}; });
+}
+
 int TarnPlayer::getBufferPercent() {
     return mEngine->call(__func__, 0, [&] { return mEngine->transport.bufferPercent(); });
 }
 
 MediaAlbumArt* TarnPlayer::extractAlbumArt() {
-    notYet(__func__);
-    return nullptr;
+    return mEngine->call(__func__, static_cast<MediaAlbumArt*>(nullptr),
+                         [&] { return mEngine->copyAlbumArt(); });
 }
+
 status_t TarnPlayer::setDataSource(const char* url, const KeyedVector<String8, String8>* headers) {
     return mEngine->call(__func__, status_t{INVALID_OPERATION},
                          [&] { return mEngine->loader.setUrl(url, pairsOf(headers)); });
@@ -123,11 +130,31 @@ status_t TarnPlayer::setLooping(int loop) {
                          [&] { return mEngine->transport.setLooping(loop != 0); });
 }
 
-status_t TarnPlayer::setParameter(int, const Parcel&) { return notYet(__func__); }
-status_t TarnPlayer::getParameter(int, Parcel*) { return notYet(__func__); }
-status_t TarnPlayer::invoke(const Parcel&, Parcel*) { return notYet(__func__); }
-status_t TarnPlayer::getMetadata(const SortedVector<int>&, Parcel*) { return notYet(__func__); }
-status_t TarnPlayer::setVolume(float, float) { return notYet(__func__); }
+status_t TarnPlayer::setParameter(int key, const Parcel& request) {
+    return mEngine->call(__func__, status_t{INVALID_OPERATION},
+                         [&] { return mEngine->parameters.set(key, request); });
+}
+
+status_t TarnPlayer::getParameter(int key, Parcel* reply) {
+    return mEngine->call(__func__, status_t{INVALID_OPERATION},
+                         [&] { return mEngine->parameters.get(key, reply); });
+}
+
+status_t TarnPlayer::invoke(const Parcel& request, Parcel* reply) {
+    return mEngine->call(__func__, status_t{INVALID_OPERATION},
+                         [&] { return mEngine->parameters.invoke(request, reply); });
+}
+
+status_t TarnPlayer::getMetadata(const SortedVector<int>& ids, Parcel* records) {
+    return mEngine->call(__func__, status_t{INVALID_OPERATION},
+                         [&] { return mEngine->metaData.write(ids, records); });
+}
+
+status_t TarnPlayer::setVolume(float left, float right) {
+    return mEngine->call(__func__, status_t{INVALID_OPERATION},
+                         [&] { return mEngine->audio.setVolume(left, right); });
+}
+
 status_t TarnPlayer::getVideoWidth(int* w) {
     return mEngine->call(__func__, status_t{INVALID_OPERATION},
                          [&] { return mEngine->transport.getVideoWidth(w); });
@@ -138,43 +165,151 @@ status_t TarnPlayer::getVideoHeight(int* h) {
                          [&] { return mEngine->transport.getVideoHeight(h); });
 }
 
-status_t TarnPlayer::getCurrentBytePosition(int*) { return notYet(__func__); }
-bool TarnPlayer::canDoSeek(int) { return notYet(__func__) == NO_ERROR; }
-bool TarnPlayer::canDoTrick(int) { return notYet(__func__) == NO_ERROR; }
-bool TarnPlayer::setTS(unsigned short) { return notYet(__func__) == NO_ERROR; }
-bool TarnPlayer::step(int) { return notYet(__func__) == NO_ERROR; }
-status_t TarnPlayer::setSpeed(int) { return notYet(__func__); }
-bool TarnPlayer::getSpeed(int&) { return notYet(__func__) == NO_ERROR; }
-bool TarnPlayer::seekToPosition(unsigned long long) { return notYet(__func__) == NO_ERROR; }
-bool TarnPlayer::getThumbnailInfo(_Media_Thumbnail_Info_T*) { return notYet(__func__) == NO_ERROR; }
-bool TarnPlayer::getMetaDataInfo(MetaDataInfo&) { return notYet(__func__) == NO_ERROR; }
-bool TarnPlayer::getVideoCodecInfo(VideoCodecInfo&) { return notYet(__func__) == NO_ERROR; }
-bool TarnPlayer::getVideoCodecInfo(int, VideoCodecInfo&) { return notYet(__func__) == NO_ERROR; }
-bool TarnPlayer::getVideoTrackCount(int&) { return notYet(__func__) == NO_ERROR; }
-bool TarnPlayer::getAudioTrackCount(int&) { return notYet(__func__) == NO_ERROR; }
-bool TarnPlayer::getAudioTrackInfo(bool, int, AudioTrackInfo&) {
-    return notYet(__func__) == NO_ERROR;
+status_t TarnPlayer::getCurrentBytePosition(int* pos) {
+    return mEngine->call(__func__, status_t{INVALID_OPERATION},
+                         [&] { return mEngine->bytes.get(pos); });
 }
-bool TarnPlayer::selectAudioTrack(int) { return notYet(__func__) == NO_ERROR; }
-status_t TarnPlayer::getCurrentAudioIndex(int*) { return notYet(__func__); }
-bool TarnPlayer::getSubtitleTrackCount(int&) { return notYet(__func__) == NO_ERROR; }
-bool TarnPlayer::getSubtitleTrackInfo(int, SubtitleTrackInfo&) {
-    return notYet(__func__) == NO_ERROR;
+
+bool TarnPlayer::canDoSeek(int speed) {
+    return mEngine->call(__func__, false, [&] { return mEngine->speed.canSeek(speed); });
 }
-status_t TarnPlayer::getCurrentSubtitleIndex(int*) { return notYet(__func__); }
-bool TarnPlayer::onSubtitleTrack(int) { return notYet(__func__) == NO_ERROR; }
-bool TarnPlayer::offSubtitleTrack() { return notYet(__func__) == NO_ERROR; }
-bool TarnPlayer::selectTrack(int) { return notYet(__func__) == NO_ERROR; }
-bool TarnPlayer::deselectTrack(int) { return notYet(__func__) == NO_ERROR; }
-bool TarnPlayer::addTimedTextSource(const char*) { return notYet(__func__) == NO_ERROR; }
-bool TarnPlayer::setSubtitleDataSource(const char*) { return notYet(__func__) == NO_ERROR; }
-bool TarnPlayer::setSubtitleDataSourceEx(const char*, const char*) {
-    return notYet(__func__) == NO_ERROR;
+
+bool TarnPlayer::canDoTrick(int speed) {
+    return mEngine->call(__func__, false, [&] { return mEngine->speed.canPlay(speed); });
 }
-bool TarnPlayer::setSubtitleAttr(int, void*) { return notYet(__func__) == NO_ERROR; }
-bool TarnPlayer::flushSubtitleAttr() { return notYet(__func__) == NO_ERROR; }
-status_t TarnPlayer::setPlayerRole(E_Orv_Player_Role_Type) { return notYet(__func__); }
-status_t TarnPlayer::setPCMMediaInfo(IORV_PB_CTRL_SET_MEDIA_INFO_T*) { return notYet(__func__); }
-status_t TarnPlayer::setUnLockPin(int) { return notYet(__func__); }
+
+bool TarnPlayer::setTS(unsigned short ts) {
+    ALOGE("setTS: %u: transport streams have no such setting here", ts);
+    return false;
+}
+
+bool TarnPlayer::step(int amount) {
+    return mEngine->call(__func__, false, [&] { return mEngine->stepper.step(amount); });
+}
+
+status_t TarnPlayer::setSpeed(int speed) {
+    return mEngine->call(__func__, status_t{INVALID_OPERATION},
+                         [&] { return mEngine->speed.set(speed); });
+}
+
+bool TarnPlayer::getSpeed(int& speed) {
+    return mEngine->call(__func__, false, [&] {
+        speed = mEngine->speed.get();
+        return true;
+    });
+}
+
+bool TarnPlayer::seekToPosition(unsigned long long pos) {
+    return mEngine->call(__func__, false, [&] { return mEngine->bytes.seekTo(pos); });
+}
+
+bool TarnPlayer::getThumbnailInfo(_Media_Thumbnail_Info_T* thumbnail) {
+    return mEngine->call(__func__, false, [&] { return mEngine->drawThumbnail(thumbnail); });
+}
+
+bool TarnPlayer::getMetaDataInfo(MetaDataInfo& info) {
+    return mEngine->call(__func__, false, [&] { return mEngine->metaData.get(info); });
+}
+
+bool TarnPlayer::getVideoCodecInfo(VideoCodecInfo& info) {
+    return mEngine->call(__func__, false, [&] { return mEngine->tracks.currentVideoInfo(info); });
+}
+
+bool TarnPlayer::getVideoCodecInfo(int index, VideoCodecInfo& info) {
+    return mEngine->call(__func__, false, [&] { return mEngine->tracks.videoInfo(index, info); });
+}
+
+bool TarnPlayer::getVideoTrackCount(int& count) {
+    return mEngine->call(__func__, false, [&] { return mEngine->tracks.videoCount(count); });
+}
+
+bool TarnPlayer::getAudioTrackCount(int& count) {
+    return mEngine->call(__func__, false, [&] { return mEngine->tracks.audioCount(count); });
+}
+
+bool TarnPlayer::getAudioTrackInfo(bool flag, int index, AudioTrackInfo& info) {
+    return mEngine->call(__func__, false,
+                         [&] { return mEngine->tracks.audioInfo(flag, index, info); });
+}
+
+bool TarnPlayer::selectAudioTrack(int index) {
+    return mEngine->call(__func__, false, [&] { return mEngine->tracks.selectAudio(index); });
+}
+
+status_t TarnPlayer::getCurrentAudioIndex(int* index) {
+    return mEngine->call(__func__, status_t{0},
+                         [&] { return status_t{mEngine->tracks.currentAudio(index)}; });
+}
+
+bool TarnPlayer::getSubtitleTrackCount(int& count) {
+    return mEngine->call(__func__, false, [&] { return mEngine->tracks.subtitleCount(count); });
+}
+
+bool TarnPlayer::getSubtitleTrackInfo(int index, SubtitleTrackInfo& info) {
+    return mEngine->call(__func__, false,
+                         [&] { return mEngine->tracks.subtitleInfo(index, info); });
+}
+
+status_t TarnPlayer::getCurrentSubtitleIndex(int* index) {
+    return mEngine->call(__func__, status_t{0},
+                         [&] { return status_t{mEngine->tracks.currentSubtitle(index)}; });
+}
+
+bool TarnPlayer::onSubtitleTrack(int index) {
+    return mEngine->call(__func__, false, [&] { return mEngine->tracks.selectSubtitle(index); });
+}
+
+bool TarnPlayer::offSubtitleTrack() {
+    return mEngine->call(__func__, false, [&] { return mEngine->tracks.subtitlesOff(); });
+}
+
+bool TarnPlayer::selectTrack(int index) {
+    return mEngine->call(__func__, false, [&] { return mEngine->tracks.select(index); });
+}
+
+bool TarnPlayer::deselectTrack(int index) {
+    return mEngine->call(__func__, false, [&] { return mEngine->tracks.deselect(index); });
+}
+
+bool TarnPlayer::addTimedTextSource(const char* path) {
+    return mEngine->call(__func__, false,
+                         [&] { return mEngine->subtitles.add(__func__, path, false); });
+}
+
+bool TarnPlayer::setSubtitleDataSource(const char* url) {
+    return mEngine->call(__func__, false,
+                         [&] { return mEngine->subtitles.add(__func__, url, true); });
+}
+
+bool TarnPlayer::setSubtitleDataSourceEx(const char* sub, const char* idx) {
+    return mEngine->call(__func__, false, [&] { return mEngine->subtitles.addPair(sub, idx); });
+}
+
+bool TarnPlayer::setSubtitleAttr(int type, void* attr) {
+    return mEngine->call(__func__, false, [&] { return mEngine->subtitles.stage(type, attr); });
+}
+
+bool TarnPlayer::flushSubtitleAttr() {
+    return mEngine->call(__func__, false, [&] { return mEngine->subtitles.flush(); });
+}
+
+status_t TarnPlayer::setPlayerRole(E_Orv_Player_Role_Type role) {
+    return mEngine->call(__func__, status_t{INVALID_OPERATION},
+                         [&] { return mEngine->audio.setRole(role); });
+}
+
+status_t TarnPlayer::setPCMMediaInfo(IORV_PB_CTRL_SET_MEDIA_INFO_T* info) {
+    return mEngine->call(__func__, status_t{INVALID_OPERATION}, [&] {
+        if (info == nullptr) return orvtarn::failed(BAD_VALUE, "setPCMMediaInfo", "null argument");
+        return mEngine->loader.setRawFormat(*info);
+    });
+}
+
+status_t TarnPlayer::setUnLockPin(int pin) {
+    if (pin < 0 || pin > kLargestPin) {
+        return orvtarn::failed(BAD_VALUE, __func__, "a PIN has four digits");
+    }
+    return orvtarn::failed(INVALID_OPERATION, __func__, "nothing is locked here");
+}
 
 }  // namespace android

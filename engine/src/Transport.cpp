@@ -18,17 +18,17 @@ int milliseconds(double seconds) { return static_cast<int>(lround(seconds * 1000
 
 status_t Transport::start() {
     std::lock_guard<std::mutex> lock(mMutex);
-    const Phase before = mState.update([](PlayerState::Values& v) {
+    const Phase before = mState.update([this](PlayerState::Values& v) {
         const Phase phase = v.phase;
         if (v.isOpen()) v.phase = Phase::Started;
-        if (phase == Phase::Completed) v.position = 0;
+        if (phase == Phase::Completed && !mBackward) v.position = 0;
         return phase;
     });
     switch (before) {
         case Phase::Started:
             return android::NO_ERROR;
         case Phase::Completed:
-            mMpv.seek(0, "absolute");
+            if (!mBackward) mMpv.seek(0, "absolute");
             break;
         case Phase::Prepared:
         case Phase::Paused:
@@ -36,7 +36,7 @@ status_t Transport::start() {
         default:
             return PlayerState::wrongPhase("start", before);
     }
-    mMpv.set("pause", false);
+    mMpv.set("pause", mCoreHeld);
     return android::NO_ERROR;
 }
 
@@ -53,8 +53,16 @@ status_t Transport::pause() {
     return allowed ? android::NO_ERROR : PlayerState::wrongPhase("pause", before);
 }
 
+void Transport::setTrick(bool coreHeld, bool backward) {
+    std::lock_guard<std::mutex> lock(mMutex);
+    mCoreHeld = coreHeld;
+    mBackward = backward;
+    mMpv.set("pause", coreHeld || mState.phase() != Phase::Started);
+}
+
 void Transport::becomePaused() {
     std::lock_guard<std::mutex> lock(mMutex);
+    mMpv.set("pause", true);
     mState.update([](PlayerState::Values& v) {
         if (v.isOneOf({Phase::Prepared, Phase::Started})) v.phase = Phase::Paused;
     });

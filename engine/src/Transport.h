@@ -29,6 +29,9 @@ public:
 
     // Pauses as an effect of another operation.
     void becomePaused();
+    // While another unit moves the position itself, the core is kept paused.
+    // Backward play after the end begins at the end.
+    void setTrick(bool coreHeld, bool backward);
 
 private:
     android::status_t getSize(const char* operation, int PlayerState::Values::*member,
@@ -38,6 +41,8 @@ private:
     PlayerState& mState;
     // The phase and the core's own pause change together.
     std::mutex mMutex;
+    bool mCoreHeld = false;
+    bool mBackward = false;
 };
 
 }  // namespace orvtarn

@@ -43,7 +43,7 @@ TEST_F(PlaybackTest, PlaysToTheEndInRealTime) {
 }
 
 TEST_F(PlaybackTest, TellsTheListenerInOrder) {
-    ASSERT_EQ(NO_ERROR, player->setDataSource(media("silent.mp4").c_str(), nullptr));
+    ASSERT_EQ(NO_ERROR, player->setDataSource(mediaPath("silent.mp4").c_str(), nullptr));
     ASSERT_EQ(NO_ERROR, player->prepareAsync());
     ASSERT_TRUE(events->waitFor(MEDIA_PREPARED));
     playToEnd();

@@ -6,8 +6,6 @@
 
 namespace orvtest {
 
-std::string media(const std::string& name) { return std::string(ORV_TEST_MEDIA "/") + name; }
-
 bool eventually(const std::function<bool()>& condition, int seconds) {
     const auto deadline = std::chrono::steady_clock::now() + std::chrono::seconds(seconds);
     while (!condition()) {
@@ -34,7 +32,7 @@ PlayerTest::PlayerTest() {
 PlayerTest::~PlayerTest() { player->release(); }
 
 void PlayerTest::open(const std::string& name) {
-    ASSERT_EQ(android::NO_ERROR, player->setDataSource(media(name).c_str(), nullptr));
+    ASSERT_EQ(android::NO_ERROR, player->setDataSource(mediaPath(name).c_str(), nullptr));
     ASSERT_EQ(android::NO_ERROR, player->prepare());
 }
 

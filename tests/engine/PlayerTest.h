@@ -9,11 +9,9 @@
 
 #include "EventRecorder.h"
 #include "FrameSink.h"
+#include "TestMedia.h"
 
 namespace orvtest {
-
-// The path of a file of tests/media.
-std::string media(const std::string& name);
 
 // Waits for a condition, asking again and again; false after the seconds.
 bool eventually(const std::function<bool()>& condition, int seconds = 15);

@@ -11,7 +11,10 @@ set -eu
 FILES="video.mp4 video.mkv video.ts video.avi slides.mkv rotated.mp4 hd.mp4 hd709.mp4 odd.mkv
        alpha.mov still.png silent.mkv tracks.mkv tracks.mp4 tagged.mp3 tagged.ogg broken-tags.mp4
        front.jpg back.png covered.mp3 covered.flac covered.m4a covered.mkv noise.bin
-       cut.mp4 cut.mkv"
+       cut.mp4 cut.mkv
+       feature.mkv short.mp4 short.ts long.mkv silent.mp4 plain.mkv plain.mp4 lines.srt
+       latin1.srt lines.ass words.idx words.sub tone.mp3 tone.flac tone-s16le.pcm
+       tone-s16be.pcm subtitles-only.mkv garbage.bin empty.bin"
 
 quiet_ffmpeg() { ffmpeg -nostdin -v error -y "$@"; }
 
@@ -96,7 +99,7 @@ several_tracks() {
     chapters >"$parts/chapters.txt"
     quiet_ffmpeg -i "$folder/video.mp4" -f lavfi -i "sine=880:duration=10:sample_rate=44100" \
         -i "$parts/1.srt" -i "$parts/2.srt" -i "$parts/chapters.txt" \
-        -map 0:v -map 0:a -map 1:a -map 2 -map 3 -map_metadata -1 -map_chapters 4 \
+        -map 0:v -map 0:a -map 1:a -map 2 -map 3 -map_metadata:g -1 -map_chapters 4 \
         -c:v copy -c:a:0 copy -c:a:1 "$1" -c:s "$2" \
         -metadata:s:a:0 language=eng -metadata:s:a:0 title="Main mix" \
         -metadata:s:a:1 language=deu -metadata:s:a:1 title="Kommentar (größer)" \
@@ -169,6 +172,90 @@ make_noise_bin() { yes 'neither sound nor picture' | head -c 65536 >"$1"; }
 make_cut_mp4() { need video.mp4 && head -c 20000 "$folder/video.mp4" >"$1"; }
 make_cut_mkv() { need video.mkv && head -c 40000 "$folder/video.mkv" >"$1"; }
 
+# What follows is for playing: 30 frames a second, so that the clock shows.
+playing() { echo "testsrc2=size=$1:rate=30:duration=$2"; }
+tone() { echo "sine=frequency=$1:duration=$2,volume=0.1"; }
+fast_h264() { echo "-c:v libx264 -preset ultrafast -crf 28 -pix_fmt yuv420p -bf 0 -sc_threshold 0"; }
+
+# A subtitle for each two seconds: text, seconds.
+lines() {
+    local s
+    for ((s = 0; s < $2; s += 2)); do
+        printf '%d\n00:00:%02d,000 --> 00:00:%02d,000\n%s\n\n' \
+            $((s / 2 + 1)) "$s" $((s + 2)) "$1"
+    done
+}
+
+# 10 s, 720p: two audio tracks, two subtitle tracks; a key frame every two seconds.
+make_feature_mkv() {
+    # shellcheck disable=SC2046
+    quiet_ffmpeg -f lavfi -i "$(playing 1280x720 10)" -f lavfi -i "$(tone 440 10)" \
+        -f lavfi -i "$(tone 880 10)" -i <(lines 'First line' 10) -i <(lines 'Zweite Zeile' 10) \
+        -i <(chapters) -map 0:v -map 1:a -map 2:a -map 3:s -map 4:s -map_chapters 5 \
+        $(fast_h264) -g 60 -c:a aac -ac:a:0 2 -ac:a:1 1 -c:s subrip \
+        -metadata:s:a:0 language=eng -metadata:s:a:0 title=Stereo \
+        -metadata:s:a:1 language=fra -metadata:s:a:1 title=Commentaire \
+        -metadata:s:s:0 language=eng -metadata:s:s:0 title=Captions \
+        -metadata:s:s:1 language=deu -metadata:s:s:1 title=Untertitel \
+        -disposition:s:0 default -metadata title="The Feature" "$1"
+}
+
+# 3 s, key frames every second.
+playing_short() {
+    # shellcheck disable=SC2046
+    quiet_ffmpeg -f lavfi -i "$(playing 320x180 3)" -f lavfi -i "$(tone 440 3)" \
+        $(fast_h264) -g 30 -c:a aac -ac 2 "$@"
+}
+
+make_short_mp4() { playing_short -movflags +faststart "$1"; }
+make_short_ts() { playing_short "$1"; }
+
+# A minute for fast play, forward and back; key frames every second.
+make_long_mkv() {
+    # shellcheck disable=SC2046
+    quiet_ffmpeg -f lavfi -i "$(playing 320x180 60)" -f lavfi -i "$(tone 440 60)" \
+        $(fast_h264) -g 30 -c:a aac -ac 2 "$1"
+}
+
+make_silent_mp4() {
+    # shellcheck disable=SC2046
+    quiet_ffmpeg -f lavfi -i "$(playing 320x180 2)" $(fast_h264) -g 30 "$1"
+}
+
+# A still grey picture, on which subtitles show.
+grey() { echo "color=c=0x404040:size=640x360:rate=30:duration=20"; }
+
+make_plain_mkv() {
+    # shellcheck disable=SC2046
+    quiet_ffmpeg -f lavfi -i "$(grey)" -f lavfi -i "$(tone 440 20)" -i <(lines 'Inside' 20) \
+        -i <(lines 'Another one, and longer' 20) -map 0 -map 1 -map 2 -map 3 \
+        $(fast_h264) -g 60 -c:a aac -c:s subrip -disposition:s 0 "$1"
+}
+
+make_plain_mp4() {
+    # shellcheck disable=SC2046
+    quiet_ffmpeg -f lavfi -i "$(grey)" $(fast_h264) -g 60 "$1"
+}
+
+make_lines_srt() { lines 'Outside' 20 >"$1"; }
+make_latin1_srt() { lines 'Große Grüße' 20 | iconv -f UTF-8 -t ISO-8859-1 >"$1"; }
+make_lines_ass() { lines 'Styled' 20 | quiet_ffmpeg -f srt -i /dev/stdin "$1"; }
+
+# A VobSub pair: the index and the pictures that it points to.
+make_words_sub() { python3 "$here/make-vobsub.py" /dev/null "$1"; }
+make_words_idx() { python3 "$here/make-vobsub.py" "$1" /dev/null; }
+
+make_tone_mp3() { quiet_ffmpeg -f lavfi -i "$(tone 440 3)" -c:a libmp3lame -b:a 128k "$1"; }
+make_tone_flac() { quiet_ffmpeg -f lavfi -i "$(tone 440 3)" -c:a flac "$1"; }
+
+# Raw samples: two seconds, stereo, 44100 a second.
+make_tone_s16le_pcm() { quiet_ffmpeg -f lavfi -i "$(tone 440 2)" -ac 2 -ar 44100 -f s16le "$1"; }
+make_tone_s16be_pcm() { quiet_ffmpeg -f lavfi -i "$(tone 440 2)" -ac 2 -ar 44100 -f s16be "$1"; }
+
+make_subtitles_only_mkv() { lines 'Alone' 4 | quiet_ffmpeg -f srt -i /dev/stdin -c:s subrip "$1"; }
+make_garbage_bin() { seq 1 40 | sha512sum | head -c 100 | tr '0-9a-f' '\200-\217' >"$1"; }
+make_empty_bin() { : >"$1"; }
+
 # Makes each file that is not there yet, under another name until it is whole.
 need() {
     local file unfinished
@@ -183,6 +270,7 @@ need() {
 
 [ $# -ge 1 ] || { echo "usage: make-media.sh FOLDER [FILE...]" >&2; exit 2; }
 folder=$1
+here=$(dirname -- "$(readlink -f -- "${BASH_SOURCE[0]}")")
 shift
 mkdir -p "$folder"
 for file in ${*:-$FILES}; do

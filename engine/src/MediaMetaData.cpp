@@ -1,0 +1,123 @@
+// SPDX-License-Identifier: Apache-2.0
+#include "MediaMetaData.h"
+
+#include <math.h>
+#include <media/Metadata.h>
+#include <stdlib.h>
+#include <utils/String8.h>
+
+#include <algorithm>
+#include <string>
+
+#include "ContainerInfo.h"
+#include "EngineLog.h"
+#include "RecordText.h"
+
+namespace orvtarn {
+namespace {
+
+using android::media::Metadata;
+
+struct TextKey {
+    Metadata::Type key;
+    OrvWideText MetaDataInfo::*text;
+    const char* tag;
+};
+
+const TextKey kTexts[] = {
+    {Metadata::kTitle, &MetaDataInfo::mTitle, "title"},
+    {Metadata::kArtist, &MetaDataInfo::mArtist, "artist"},
+    {Metadata::kAlbum, &MetaDataInfo::mAlbum, "album"},
+    {Metadata::kGenre, &MetaDataInfo::mGenre, "genre"},
+    {Metadata::kComposer, &MetaDataInfo::mComposer, "composer"},
+    {Metadata::kComment, &MetaDataInfo::mComment, "comment"},
+};
+
+struct NumberKey {
+    Metadata::Type key;
+    int32_t value;
+};
+
+std::string utf8Of(const OrvWideText& text) {
+    const auto* end = std::find(text, text + ORV_TEXT_UNITS, uint16_t{0});
+    const android::String8 utf8(reinterpret_cast<const char16_t*>(text),
+                                static_cast<size_t>(end - text));
+    return utf8.string();
+}
+
+class RecordWriter {
+public:
+    RecordWriter(const android::SortedVector<int>& keys, android::Parcel* records)
+        : mKeys(keys), mMetadata(records) {}
+
+    void text(Metadata::Type key, const std::string& value) {
+        if (!value.empty() && wants(key)) mMetadata.appendString(key, value.c_str());
+    }
+    void number(Metadata::Type key, int32_t value) {
+        if (value > 0 && wants(key)) mMetadata.appendInt32(key, value);
+    }
+    void flag(Metadata::Type key, bool value) {
+        if (wants(key)) mMetadata.appendBool(key, value);
+    }
+
+private:
+    bool wants(Metadata::Type key) const {
+        return mKeys.isEmpty() || mKeys[0] == Metadata::kAny || mKeys.indexOf(key) >= 0;
+    }
+
+    const android::SortedVector<int>& mKeys;
+    Metadata mMetadata;
+};
+
+}  // namespace
+
+bool MediaMetaData::get(MetaDataInfo& info) {
+    if (mState.requireOpen("getMetaDataInfo") != android::NO_ERROR) return false;
+    const bool told =
+        mLoader.details()->withFile([&](MediaFile& file) { info = metaDataInfo(file); });
+    if (!told) info = fromCore();
+    return true;
+}
+
+// For media that cannot be read twice: what playback has found.
+MetaDataInfo MediaMetaData::fromCore() const {
+    MetaDataInfo info;
+    const auto tag = [this](const std::string& name) {
+        return mMpv.getString(("metadata/by-key/" + name).c_str()).value_or("");
+    };
+    for (const TextKey& key : kTexts) setWideText(info.*key.text, tag(key.tag));
+    setWideText(info.mContainer, mMpv.getString("file-format").value_or(""));
+    info.mDuration = static_cast<int32_t>(lround(mMpv.getDouble("duration").value_or(0) * 1000));
+    info.mChapterCount = static_cast<int32_t>(mMpv.getInt("chapters").value_or(0));
+    info.mYear = std::max(atoi(tag("date").c_str()), 0);
+    info.mTrackNumber = std::max(atoi(tag("track").c_str()), 0);
+    info.mDiscNumber = std::max(atoi(tag("disc").c_str()), 0);
+    return info;
+}
+
+android::status_t MediaMetaData::write(const android::SortedVector<int>& keys,
+                                       android::Parcel* records) {
+    if (records == nullptr) return failed(android::BAD_VALUE, "getMetadata", "null argument");
+    MetaDataInfo info;
+    if (!get(info)) return android::INVALID_OPERATION;
+    const PlayerState::Values now = mState.read([](const PlayerState::Values& v) { return v; });
+    RecordWriter writer(keys, records);
+    for (const TextKey& key : kTexts) writer.text(key.key, utf8Of(info.*key.text));
+    if (info.mYear > 0) writer.text(Metadata::kDate, std::to_string(info.mYear));
+    const NumberKey numbers[] = {
+        {Metadata::kDuration, static_cast<int32_t>(lround(now.duration * 1000))},
+        {Metadata::kCdTrackNumber, info.mTrackNumber},
+        {Metadata::kBitRate, info.mBitRate},
+        {Metadata::kVideoHeight, now.height},
+        {Metadata::kVideoWidth, now.width},
+        {Metadata::kNumTracks, static_cast<int32_t>(mMpv.getInt("track-list/count").value_or(0))},
+    };
+    for (const NumberKey& number : numbers) writer.number(number.key, number.value);
+    writer.flag(Metadata::kPauseAvailable, true);
+    writer.flag(Metadata::kSeekBackwardAvailable, now.seekable);
+    writer.flag(Metadata::kSeekForwardAvailable, now.seekable);
+    writer.flag(Metadata::kSeekAvailable, now.seekable);
+    return android::NO_ERROR;
+}
+
+}  // namespace orvtarn
