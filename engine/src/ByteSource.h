@@ -9,7 +9,7 @@ namespace orvtarn {
 // one thread uses a source at a time. Calls may block as long as the source.
 class ByteSource {
 public:
-    virtual ~ByteSource() {}
+    virtual ~ByteSource() = default;
 
     // Reads up to length bytes from the current position. The count (more than
     // 0), 0 at the end, negative for an error.

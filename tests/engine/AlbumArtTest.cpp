@@ -11,7 +11,7 @@ std::vector<uint8_t> artOf(const std::string& name) {
     const auto file = orvtest::openMedia(name);
     MediaAlbumArt* art = extractAlbumArt(*file);
     if (art == nullptr) return {};
-    const std::vector<uint8_t> bytes(art->data(), art->data() + art->size());
+    std::vector<uint8_t> bytes(art->data(), art->data() + art->size());
     free(art);
     return bytes;
 }

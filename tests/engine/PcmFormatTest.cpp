@@ -20,7 +20,7 @@ IORV_PB_CTRL_SET_MEDIA_INFO_T description(int type, int bits, int channels, int 
     pcm.e_pcm_type = static_cast<E_Orv_Pcm_Type>(type);
     pcm.eNumCh = static_cast<E_Orv_Aud_Ch_Num>(channels);
     pcm.eSampleRate = static_cast<E_Orv_Aud_Sample_Rate>(rate);
-    pcm.u2BlockAlign = static_cast<uint16_t>(channels * bits / 8);
+    pcm.u2BlockAlign = static_cast<uint16_t>(int64_t{channels} * bits / 8);
     pcm.eBitsPerSample = static_cast<E_Orv_Aud_Bits_Per_Sample>(bits);
     pcm.fgBigEndian = bigEndian;
     return info;

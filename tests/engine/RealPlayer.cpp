@@ -44,7 +44,7 @@ bool RealPlayer::command(const char* name, const char* first, const char* second
 
 std::string RealPlayer::text(const std::string& property) {
     char* value = mpv_get_property_string(mMpv, property.c_str());
-    const std::string text = value == nullptr ? "" : value;
+    std::string text = value == nullptr ? "" : value;
     mpv_free(value);
     return text;
 }

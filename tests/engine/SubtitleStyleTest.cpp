@@ -19,6 +19,7 @@ std::vector<std::string> texts(const std::vector<MpvAssignment>& style) {
         std::string operator()(const std::string& text) { return text; }
     };
     std::vector<std::string> lines;
+    lines.reserve(style.size());
     for (const MpvAssignment& one : style) {
         lines.push_back(one.property + "=" + std::visit(Text(), one.value));
     }

@@ -169,7 +169,9 @@ public:
         node.u.double_ = value;
         return node;
     }
-    mpv_node list(std::vector<mpv_node> values) { return hold(MPV_FORMAT_NODE_ARRAY, {}, values); }
+    mpv_node list(std::vector<mpv_node> values) {
+        return hold(MPV_FORMAT_NODE_ARRAY, {}, std::move(values));
+    }
     mpv_node map(const std::vector<std::pair<const char*, mpv_node>>& members) {
         std::vector<char*> keys;
         std::vector<mpv_node> values;
@@ -177,7 +179,7 @@ public:
             keys.push_back(const_cast<char*>(key));
             values.push_back(value);
         }
-        return hold(MPV_FORMAT_NODE_MAP, keys, values);
+        return hold(MPV_FORMAT_NODE_MAP, std::move(keys), std::move(values));
     }
 
 private:
