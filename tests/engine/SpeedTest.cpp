@@ -1,0 +1,190 @@
+// SPDX-License-Identifier: Apache-2.0
+// Speeds, backward play, single frames and repeated sections.
+#include <chrono>
+
+#include "PlayerTest.h"
+
+using namespace android;
+using namespace orvtest;
+
+namespace {
+
+class SpeedTest : public PlayerTest {
+protected:
+    // Media seconds played in a second of the clock, measured from position to
+    // position.
+    double measure(int from, int to) {
+        const bool forward = to > from;
+        const auto passed = [&](int mark) {
+            return forward ? position() >= mark : position() <= mark;
+        };
+        EXPECT_TRUE(eventually([&] { return passed(from); }, 30));
+        const int begin = position();
+        const auto beginTime = std::chrono::steady_clock::now();
+        EXPECT_TRUE(eventually([&] { return passed(to); }, 30));
+        const std::chrono::duration<double> taken = std::chrono::steady_clock::now() - beginTime;
+        return (position() - begin) / 1000.0 / taken.count();
+    }
+};
+
+class ForwardSpeedTest : public SpeedTest, public testing::WithParamInterface<int> {};
+
+TEST_P(ForwardSpeedTest, PlaysAtThatSpeed) {
+    const double factor = GetParam() / 1000.0;
+    open("long.mkv");
+    ASSERT_EQ(NO_ERROR, player->setSpeed(GetParam()));
+    EXPECT_EQ(GetParam(), speed());
+    EXPECT_FALSE(player->isPlaying()) << "a speed does not start";
+    ASSERT_EQ(NO_ERROR, player->start());
+    const int from = std::min(2000, static_cast<int>(factor * 500));
+    const double measured = measure(from, std::min(50000, from + static_cast<int>(factor * 1500)));
+    EXPECT_NEAR(factor, measured, factor * 0.25);
+}
+
+INSTANTIATE_TEST_SUITE_P(Speeds, ForwardSpeedTest,
+                         testing::Values(250, 500, 1500, 2000, 4000, 8000, 16000, 32000));
+
+class BackwardSpeedTest : public SpeedTest, public testing::WithParamInterface<int> {};
+
+TEST_P(BackwardSpeedTest, PlaysBackAtThatSpeed) {
+    const double factor = GetParam() / 1000.0;
+    open("long.mkv");
+    ASSERT_EQ(NO_ERROR, player->seekTo(55000, 0));
+    ASSERT_EQ(NO_ERROR, player->setSpeed(GetParam()));
+    EXPECT_EQ(GetParam(), speed());
+    ASSERT_EQ(NO_ERROR, player->start());
+    EXPECT_TRUE(player->isPlaying());
+    const int from = 53500;
+    const double measured = measure(from, std::max(3000, from + static_cast<int>(factor * 2000)));
+    EXPECT_NEAR(factor, measured, -factor * 0.3);
+}
+
+INSTANTIATE_TEST_SUITE_P(Speeds, BackwardSpeedTest,
+                         testing::Values(-1000, -2000, -8000, -16000, -32000),
+                         [](const auto& info) { return "Minus" + std::to_string(-info.param); });
+
+class RewindTest : public SpeedTest, public testing::WithParamInterface<int> {};
+
+TEST_P(RewindTest, AtTheStartGoesOnForward) {
+    open("feature.mkv");
+    ASSERT_EQ(NO_ERROR, player->seekTo(6000, 0));
+    ASSERT_EQ(NO_ERROR, player->setSpeed(GetParam()));
+    ASSERT_EQ(NO_ERROR, player->start());
+    ASSERT_TRUE(eventually([&] { return speed() == 1000; }, 30));
+    ASSERT_TRUE(eventually([&] { return position() > 300 && position() < 3000; }));
+    EXPECT_TRUE(player->isPlaying());
+    EXPECT_EQ(0, events->count(MEDIA_PLAYBACK_COMPLETE));
+}
+
+INSTANTIATE_TEST_SUITE_P(Speeds, RewindTest, testing::Values(-4000, -32000),
+                         [](const auto& info) { return "Minus" + std::to_string(-info.param); });
+
+TEST_F(SpeedTest, RewindingPausesAndGoesOn) {
+    open("long.mkv");
+    ASSERT_EQ(NO_ERROR, player->seekTo(50000, 0));
+    ASSERT_EQ(NO_ERROR, player->setSpeed(-16000));
+    ASSERT_EQ(NO_ERROR, player->start());
+    ASSERT_TRUE(eventually([&] { return position() < 45000; }));
+    ASSERT_EQ(NO_ERROR, player->pause());
+    const int held = position();
+    EXPECT_TRUE(remains([&] { return position() > held - 3000; }));
+    ASSERT_EQ(NO_ERROR, player->start());
+    ASSERT_TRUE(eventually([&] { return position() < held - 5000; }));
+    ASSERT_EQ(NO_ERROR, player->setSpeed(1000));
+    const int turned = position();
+    ASSERT_TRUE(eventually([&] { return position() > turned + 500; }));
+    EXPECT_LT(position(), turned + 5000);
+}
+
+TEST_F(SpeedTest, RefusesWhatIsNoSpeed) {
+    open("short.mp4");
+    for (int wrong : {0, 249, -249, 32001, -32001, INT32_MAX, INT32_MIN}) {
+        EXPECT_EQ(BAD_VALUE, player->setSpeed(wrong)) << wrong;
+        EXPECT_FALSE(player->canDoTrick(wrong)) << wrong;
+    }
+    EXPECT_EQ(1000, speed());
+}
+
+TEST_F(SpeedTest, PromisesOnlyWhatItCanDo) {
+    EXPECT_FALSE(player->canDoSeek(1000)) << "without media";
+    EXPECT_FALSE(player->canDoTrick(2000));
+    EXPECT_EQ(INVALID_OPERATION, player->setSpeed(2000));
+    open("short.mp4");
+    EXPECT_TRUE(player->canDoSeek(1000));
+    EXPECT_TRUE(player->canDoTrick(32000));
+    EXPECT_TRUE(player->canDoTrick(-32000));
+}
+
+TEST_F(SpeedTest, NewMediaPlaysAtTheNormalSpeed) {
+    open("short.mp4");
+    ASSERT_EQ(NO_ERROR, player->setSpeed(-2000));
+    player->reset();
+    open("short.mp4");
+    EXPECT_EQ(1000, speed());
+    ASSERT_EQ(NO_ERROR, player->start());
+    EXPECT_TRUE(eventually([&] { return position() > 500; }));
+}
+
+TEST_F(SpeedTest, StepsSingleFramesBothWays) {
+    open("feature.mkv");
+    ASSERT_EQ(NO_ERROR, player->seekTo(4000, 0));
+    ASSERT_TRUE(player->step(1));
+    EXPECT_NEAR(4033, position(), 1);
+    ASSERT_TRUE(player->step(5));
+    EXPECT_NEAR(4200, position(), 1);
+    ASSERT_TRUE(player->step(-2));
+    EXPECT_NEAR(4133, position(), 1);
+    EXPECT_TRUE(player->step(0));
+    EXPECT_FALSE(player->isPlaying());
+    EXPECT_TRUE(remains([&] { return position() < 4140; }));
+}
+
+TEST_F(SpeedTest, SteppingPausesPlayback) {
+    open("feature.mkv");
+    ASSERT_EQ(NO_ERROR, player->start());
+    ASSERT_TRUE(eventually([&] { return position() > 200; }));
+    ASSERT_TRUE(player->step(1));
+    EXPECT_FALSE(player->isPlaying());
+    const int held = position();
+    EXPECT_TRUE(remains([&] { return position() == held; }));
+}
+
+TEST_F(SpeedTest, StepsNeedAPictureAndAFrame) {
+    open("tone.mp3");
+    EXPECT_FALSE(player->step(1));
+    player->reset();
+    open("short.mp4");
+    EXPECT_FALSE(player->step(-1)) << "before the first frame";
+    EXPECT_EQ(0, position());
+}
+
+TEST_F(SpeedTest, RepeatsASection) {
+    open("long.mkv");
+    ASSERT_EQ(NO_ERROR, player->seekTo(10000, 0));
+    ASSERT_NE(0, player->setABRepeat(E_ORV_AB_REPEAT_SET_A));
+    ASSERT_EQ(NO_ERROR, player->seekTo(11000, 0));
+    ASSERT_NE(0, player->setABRepeat(E_ORV_AB_REPEAT_SET_B));
+    ASSERT_EQ(NO_ERROR, player->seekTo(10000, 0));
+    ASSERT_EQ(NO_ERROR, player->start());
+    for (int round = 0; round < 2; round++) {
+        ASSERT_TRUE(eventually([&] { return position() > 10700; }));
+        ASSERT_TRUE(eventually([&] { return position() < 10500; }));
+        EXPECT_GE(position(), 9900);
+    }
+    ASSERT_NE(0, player->setABRepeat(E_ORV_AB_REPEAT_OFF));
+    EXPECT_TRUE(eventually([&] { return position() > 11500; }));
+}
+
+TEST_F(SpeedTest, RefusesSectionsWithoutALength) {
+    open("long.mkv");
+    EXPECT_EQ(0, player->setABRepeat(E_ORV_AB_REPEAT_SET_B)) << "no beginning yet";
+    ASSERT_EQ(NO_ERROR, player->seekTo(5000, 0));
+    ASSERT_NE(0, player->setABRepeat(E_ORV_AB_REPEAT_SET_A));
+    EXPECT_EQ(0, player->setABRepeat(E_ORV_AB_REPEAT_SET_B)) << "no length";
+    ASSERT_EQ(NO_ERROR, player->seekTo(2000, 0));
+    EXPECT_EQ(0, player->setABRepeat(E_ORV_AB_REPEAT_SET_B)) << "before the beginning";
+    EXPECT_EQ(0, player->setABRepeat(3));
+    EXPECT_EQ(0, player->setABRepeat(-1));
+}
+
+}  // namespace

@@ -1,0 +1,234 @@
+// SPDX-License-Identifier: Apache-2.0
+// Subtitles as they are seen: the pictures change where and as the player is
+// told. The media are a grey picture (0x40), on which nothing else moves.
+#include "PlayerTest.h"
+
+using namespace android;
+using namespace orvtest;
+
+namespace {
+
+constexpr double kGrey = 0x40;
+
+class SubtitleTest : public PlayerTest {
+protected:
+    static bool isPlain(const Picture& picture) {
+        return picture.pixels.empty() ? false : brightPixels(picture) == 0;
+    }
+
+    // Pixels brighter than the background by far.
+    static int brightPixels(const Picture& picture) {
+        int count = 0;
+        for (size_t i = 1; i < picture.pixels.size(); i += 4) count += picture.pixels[i] > 200;
+        return count;
+    }
+
+    // Rows or columns that bright pixels take, and where they begin.
+    struct Extent {
+        int left = INT32_MAX, top = INT32_MAX, right = -1, bottom = -1;
+        int width() const { return right - left + 1; }
+        int height() const { return bottom - top + 1; }
+    };
+    static Extent extentOf(const Picture& picture) {
+        Extent extent;
+        for (int i = 0; i < picture.width * picture.height; i++) {
+            if (picture.pixels[size_t(i) * 4 + 1] <= 200) continue;
+            extent.left = std::min(extent.left, i % picture.width);
+            extent.right = std::max(extent.right, i % picture.width);
+            extent.top = std::min(extent.top, i / picture.width);
+            extent.bottom = std::max(extent.bottom, i / picture.width);
+        }
+        return extent;
+    }
+
+    bool sees(const std::function<bool(const Picture&)>& condition) {
+        return eventually([&] { return condition(sink->newest()); });
+    }
+    bool seesText() {
+        return sees([](const Picture& p) { return brightPixels(p) > 50; });
+    }
+    bool seesNothing() { return sees(isPlain); }
+
+    // Paused in the middle of a subtitle.
+    void openAtLine(const char* name) {
+        open(name);
+        ASSERT_EQ(NO_ERROR, player->seekTo(4000, 0));
+        ASSERT_TRUE(seesNothing()) << "no subtitle is on by itself";
+    }
+
+    template <class Record>
+    void apply(int type, Record record) {
+        ASSERT_TRUE(player->setSubtitleAttr(type, &record));
+        ASSERT_TRUE(player->flushSubtitleAttr());
+    }
+};
+
+TEST_F(SubtitleTest, AppearsAndDisappearsOnScreen) {
+    openAtLine("plain.mkv");
+    ASSERT_TRUE(player->onSubtitleTrack(0));
+    EXPECT_TRUE(seesText());
+    EXPECT_GT(extentOf(sink->newest()).top, 180) << "in the lower half";
+    ASSERT_TRUE(player->offSubtitleTrack());
+    EXPECT_TRUE(seesNothing());
+    ASSERT_TRUE(player->onSubtitleTrack(0));
+    EXPECT_TRUE(seesText()) << "the same line comes back";
+}
+
+TEST_F(SubtitleTest, TheOtherTrackIsAnotherText) {
+    openAtLine("plain.mkv");
+    ASSERT_TRUE(player->onSubtitleTrack(0));
+    ASSERT_TRUE(seesText());
+    const int width = extentOf(sink->newest()).width();
+    ASSERT_TRUE(player->onSubtitleTrack(1));
+    EXPECT_TRUE(sees([&](const Picture& p) { return extentOf(p).width() > 2 * width; }));
+}
+
+class ExternalSubtitleTest : public SubtitleTest,
+                             public testing::WithParamInterface<const char*> {};
+
+TEST_P(ExternalSubtitleTest, IsDrawn) {
+    openAtLine("plain.mp4");
+    ASSERT_TRUE(player->setSubtitleDataSource(mediaPath(GetParam()).c_str()));
+    EXPECT_TRUE(seesText());
+    int count = 0;
+    EXPECT_TRUE(player->getSubtitleTrackCount(count));
+    EXPECT_EQ(1, count);
+    SubtitleTrackInfo info;
+    ASSERT_TRUE(player->getSubtitleTrackInfo(0, info));
+    EXPECT_TRUE(info.mFlags & ORV_TRACK_FLAG_EXTERNAL);
+    EXPECT_TRUE(info.mFlags & ORV_TRACK_FLAG_SELECTED);
+}
+
+INSTANTIATE_TEST_SUITE_P(Formats, ExternalSubtitleTest,
+                         testing::Values("lines.srt", "lines.ass", "latin1.srt", "words.idx"),
+                         [](const auto& info) {
+                             std::string name = info.param;
+                             name[name.find('.')] = '_';
+                             return name;
+                         });
+
+TEST_F(SubtitleTest, APairMayLieInTwoPlaces) {
+    openAtLine("plain.mp4");
+    const std::string other = mediaPath("other name.sub");
+    outputOf("cp '" + mediaPath("words.sub") + "' '" + other + "'");
+    const std::string index = mediaPath("apart.idx");
+    outputOf("cp '" + mediaPath("words.idx") + "' '" + index + "'");
+    ASSERT_TRUE(player->setSubtitleDataSourceEx(other.c_str(), index.c_str()));
+    ASSERT_TRUE(seesText());
+    // The bar that the pictures are.
+    const Extent bar = extentOf(sink->newest());
+    EXPECT_NEAR(220, bar.left, 2);
+    EXPECT_NEAR(300, bar.top, 2);
+    EXPECT_NEAR(200, bar.width(), 4);
+    EXPECT_NEAR(30, bar.height(), 4);
+}
+
+TEST_F(SubtitleTest, ATimedTextSourceWaitsToBeSelected) {
+    openAtLine("plain.mp4");
+    ASSERT_TRUE(player->addTimedTextSource(mediaPath("lines.srt").c_str()));
+    EXPECT_TRUE(isPlain(sink->newest()));
+    ASSERT_TRUE(player->selectTrack(1));
+    EXPECT_TRUE(seesText());
+}
+
+TEST_F(SubtitleTest, AFileNamedBeforePreparingComesWithTheMedia) {
+    ASSERT_EQ(NO_ERROR, player->setDataSource(mediaPath("plain.mp4").c_str(), nullptr));
+    ASSERT_TRUE(player->setSubtitleDataSource(mediaPath("lines.srt").c_str()));
+    ASSERT_EQ(NO_ERROR, player->prepare());
+    EXPECT_TRUE(seesText());
+}
+
+TEST_F(SubtitleTest, RefusesFilesThatAreNone) {
+    EXPECT_FALSE(player->setSubtitleDataSource(mediaPath("lines.srt").c_str())) << "no media yet";
+    openAtLine("plain.mp4");
+    EXPECT_FALSE(player->setSubtitleDataSource(mediaPath("missing.srt").c_str()));
+    EXPECT_FALSE(player->setSubtitleDataSource(mediaPath("garbage.bin").c_str()));
+    EXPECT_FALSE(player->setSubtitleDataSource(nullptr));
+    EXPECT_FALSE(player->addTimedTextSource(""));
+    EXPECT_FALSE(player->setSubtitleDataSourceEx(nullptr, nullptr));
+    EXPECT_FALSE(player->setSubtitleDataSourceEx(mediaPath("words.sub").c_str(), "/nowhere.idx"));
+    int count = -1;
+    EXPECT_TRUE(player->getSubtitleTrackCount(count));
+    EXPECT_EQ(0, count);
+}
+
+TEST_F(SubtitleTest, ColoursTheText) {
+    openAtLine("plain.mkv");
+    ASSERT_TRUE(player->onSubtitleTrack(0));
+    ASSERT_TRUE(seesText());
+    apply(E_SUBTITLE_ATTR_TYPE_TEXT_COLOR, Subtitle_Color{255, 255, 0, 0});
+    EXPECT_TRUE(sees([](const Picture& p) {
+        int red = 0;
+        for (size_t i = 0; i < p.pixels.size(); i += 4) {
+            red += p.pixels[i + 2] > 200 && p.pixels[i + 1] < 60 && p.pixels[i] < 60;
+        }
+        return red > 50;
+    }));
+}
+
+TEST_F(SubtitleTest, SizesTheText) {
+    openAtLine("plain.mkv");
+    ASSERT_TRUE(player->onSubtitleTrack(0));
+    ASSERT_TRUE(seesText());
+    const int usual = extentOf(sink->newest()).height();
+    apply(E_SUBTITLE_ATTR_TYPE_FONT_INFO, Subtitle_FontInfo{ORV_SUBTITLE_FONT_CUSTOM, 110});
+    EXPECT_TRUE(sees([&](const Picture& p) { return extentOf(p).height() > usual * 1.6; }));
+}
+
+TEST_F(SubtitleTest, MovesTheText) {
+    openAtLine("plain.mkv");
+    ASSERT_TRUE(player->onSubtitleTrack(0));
+    ASSERT_TRUE(seesText());
+    const int usual = extentOf(sink->newest()).top;
+    apply(E_SUBTITLE_ATTR_TYPE_DISPLAY_OFFSET, Subtitle_TimeOffset{0, -500});
+    EXPECT_TRUE(sees([&](const Picture& p) {
+        const Extent extent = extentOf(p);
+        return extent.right >= 0 && std::abs(usual - extent.top - 180) < 20;
+    }));
+}
+
+TEST_F(SubtitleTest, DelaysTheText) {
+    openAtLine("plain.mkv");
+    ASSERT_EQ(NO_ERROR, player->seekTo(0, 0));
+    ASSERT_TRUE(player->onSubtitleTrack(0));
+    ASSERT_TRUE(seesText());
+    apply(E_SUBTITLE_ATTR_TYPE_TIME_OFFSET,
+          Subtitle_TimeOffset{ORV_SUBTITLE_TIME_OFFSET_DELAY, 1000});
+    EXPECT_TRUE(seesNothing());
+}
+
+TEST_F(SubtitleTest, StagedAttributesWaitForTheFlush) {
+    openAtLine("plain.mkv");
+    ASSERT_TRUE(player->onSubtitleTrack(0));
+    ASSERT_TRUE(seesText());
+    const Picture before = sink->newest();
+    Subtitle_FontInfo font{ORV_SUBTITLE_FONT_CUSTOM, 110};
+    Subtitle_Color colour{255, 255, 0, 0};
+    ASSERT_TRUE(player->setSubtitleAttr(E_SUBTITLE_ATTR_TYPE_FONT_INFO, &font));
+    ASSERT_TRUE(player->setSubtitleAttr(E_SUBTITLE_ATTR_TYPE_TEXT_COLOR, &colour));
+    EXPECT_TRUE(remains([&] { return sink->newest().differences(before) == 0; }));
+    ASSERT_TRUE(player->flushSubtitleAttr());
+    EXPECT_TRUE(sees([&](const Picture& p) { return p.differences(before) > 500; }));
+    EXPECT_FALSE(player->setSubtitleAttr(99, &font));
+    EXPECT_FALSE(player->setSubtitleAttr(E_SUBTITLE_ATTR_TYPE_FONT_INFO, nullptr));
+}
+
+TEST_F(SubtitleTest, ResetForgetsTheLook) {
+    openAtLine("plain.mkv");
+    ASSERT_TRUE(player->onSubtitleTrack(0));
+    ASSERT_TRUE(seesText());
+    const Picture usual = sink->newest();
+    apply(E_SUBTITLE_ATTR_TYPE_FONT_INFO, Subtitle_FontInfo{ORV_SUBTITLE_FONT_CUSTOM, 110});
+    ASSERT_TRUE(sees([&](const Picture& p) { return p.differences(usual) > 500; }));
+    player->reset();
+    openAtLine("plain.mkv");
+    ASSERT_TRUE(player->onSubtitleTrack(0));
+    EXPECT_TRUE(sees([&](const Picture& p) { return p.differences(usual) == 0; }));
+}
+
+TEST_F(SubtitleTest, TheGreyIsGrey) {
+    openAtLine("plain.mkv");
+    EXPECT_NEAR(kGrey, sink->newest().brightness(), 4);
+}
+
+}  // namespace
