@@ -5,7 +5,10 @@
 #include <stdint.h>
 
 // Codecs are four-character codes, first character in the low byte, as in
-// 'h' | '2' << 8 | '6' << 16 | '4' << 24; 0 when unknown.
+// 'h' | '2' << 8 | '6' << 16 | '4' << 24; 0 when unknown. They are the
+// registered ones of well-known codecs ("hevc", "mp4a", "ac-3", "fLaC", "tx3g"),
+// else the first letters of the codec's common name, padded with blanks
+// ("s16l" for signed 16-bit little-endian PCM, "srt ").
 
 // Bits of the flag members.
 enum : int32_t {
