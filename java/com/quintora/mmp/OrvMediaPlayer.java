@@ -153,7 +153,7 @@ public final class OrvMediaPlayer extends Playback {
     // writes them before those would run.
 
     private long mNativeContext;
-    private long mNativeSurfaceTexture;
+    long mNativeSurfaceTexture;
     byte[] mStreamReadBuffer;
     long mStreamSize;
     long mStreamCurPos;

@@ -155,15 +155,17 @@ abstract sealed class Playback extends PlayerCore implements AutoCloseable permi
     }
 
     /**
-     * Chooses where the picture goes. Every state.
+     * Chooses where the picture goes. Every state. Waits for a {@link #prepare()} that blocks on
+     * another thread.
      *
      * @param surface a surface that is not released; null for no picture
-     * @throws IllegalArgumentException when the surface was released
+     * @throws IllegalArgumentException when the surface was released or nobody consumes it; the
+     *     picture stays where it was
      * @throws IllegalStateException after release
      */
     public void setSurface(Surface surface) {
         states.requireAlive("setSurface()");
-        peer.native_setVideoSurface(surface);
+        bindSurface(surface);
     }
 
     /**
@@ -176,7 +178,7 @@ abstract sealed class Playback extends PlayerCore implements AutoCloseable permi
      */
     public void prepare() throws IOException {
         int epoch = states.enter("prepare()", CAN_PREPARE, PlayerState.PREPARING);
-        prepareWith(epoch, peer::native_prepare);
+        prepareWith(epoch, this::prepareWithSurface);
         events().prepared(epoch);
     }
 
@@ -258,7 +260,7 @@ abstract sealed class Playback extends PlayerCore implements AutoCloseable permi
             return;
         }
         try {
-            peer.native_release();
+            releaseWithSurface();
         } catch (IllegalStateException e) {
             throw Failures.refused("release()", e);
         } finally {

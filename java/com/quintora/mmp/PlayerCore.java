@@ -1,19 +1,26 @@
 // SPDX-License-Identifier: Apache-2.0
 package com.quintora.mmp;
 
+import android.view.Surface;
 import java.io.IOException;
 import java.lang.ref.WeakReference;
 import java.util.EnumSet;
 import java.util.Set;
 import java.util.concurrent.Executor;
+import java.util.concurrent.TimeUnit;
 import java.util.concurrent.locks.ReentrantLock;
 
 /** The part of {@link OrvMediaPlayer} that keeps engine, state and events in step. */
 abstract sealed class PlayerCore permits Playback {
+    private static final int BINDING_WAIT_MS = 100;
+
     // Held over the short engine calls that change whether the player runs, together with the
     // change of state that they mean. Never held while a listener is called.
     final ReentrantLock commands = new ReentrantLock();
     final StateMachine states = new StateMachine();
+
+    // The native half counts references to the surface without a lock of its own.
+    private final ReentrantLock surfaceBinding = new ReentrantLock();
 
     final OrvMediaPlayer peer = (OrvMediaPlayer) this;
     private final Watcher watcher = new Watcher(new WeakReference<>(peer));
@@ -77,6 +84,46 @@ abstract sealed class PlayerCore permits Playback {
         leaveCompletion(epoch);
         events.seekDone(epoch);
         watcher.wake();
+    }
+
+    final void bindSurface(Surface surface) {
+        surfaceBinding.lock();
+        try {
+            peer.native_setVideoSurface(surface);
+        } catch (IllegalArgumentException e) {
+            // The native half gave up the old surface's reference but kept its address, and would
+            // give the reference up again next time. The engine holds one of its own.
+            peer.mNativeSurfaceTexture = 0;
+            throw e;
+        } finally {
+            surfaceBinding.unlock();
+        }
+    }
+
+    final void prepareWithSurface() throws IOException {
+        surfaceBinding.lock();
+        try {
+            peer.native_prepare();
+        } finally {
+            surfaceBinding.unlock();
+        }
+    }
+
+    /** Waits while a surface is bound, but not for a prepare that only the release can end. */
+    final void releaseWithSurface() {
+        boolean locked = false;
+        try {
+            locked = surfaceBinding.tryLock(BINDING_WAIT_MS, TimeUnit.MILLISECONDS);
+        } catch (InterruptedException e) {
+            Thread.currentThread().interrupt();
+        }
+        try {
+            peer.native_release();
+        } finally {
+            if (locked) {
+                surfaceBinding.unlock();
+            }
+        }
     }
 
     private void leaveCompletion(int epoch) {

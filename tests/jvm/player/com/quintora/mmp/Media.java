@@ -9,13 +9,13 @@ import java.nio.file.Path;
 import java.util.List;
 
 /** The media of the tests, made when first asked for. */
-final class Media {
+public final class Media {
     private static final Path FOLDER = Path.of(System.getProperty("orv.test.media"));
     private static final String MAKER = System.getProperty("orv.test.make-media");
 
     private Media() {}
 
-    static String path(String name) throws Exception {
+    public static String path(String name) throws Exception {
         Path file = FOLDER.resolve(name);
         if (Files.notExists(file)) {
             run(MAKER, FOLDER.toString(), name);
@@ -24,7 +24,7 @@ final class Media {
     }
 
     /** What a program writes to its standard output; the test fails when the program does. */
-    static byte[] run(String... command) throws IOException, InterruptedException {
+    public static byte[] run(String... command) throws IOException, InterruptedException {
         Process process = new ProcessBuilder(command)
                 .redirectError(ProcessBuilder.Redirect.INHERIT)
                 .start();

@@ -7,14 +7,14 @@ import java.time.Duration;
 import java.util.concurrent.Callable;
 
 /** Waits for conditions, with a bound that slow machines can stretch. */
-final class Wait {
+public final class Wait {
     /** The bound, generous: only broken code ever waits so long. */
-    static final Duration LIMIT =
+    public static final Duration LIMIT =
             Duration.ofSeconds(20L * Integer.getInteger("orv.test.patience", 1));
 
     private Wait() {}
 
-    static void until(String what, Callable<Boolean> condition) throws Exception {
+    public static void until(String what, Callable<Boolean> condition) throws Exception {
         long end = System.nanoTime() + LIMIT.toNanos();
         while (!condition.call()) {
             if (System.nanoTime() > end) {

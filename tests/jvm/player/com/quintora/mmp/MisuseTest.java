@@ -1,0 +1,233 @@
+// SPDX-License-Identifier: Apache-2.0
+package com.quintora.mmp;
+
+import static org.junit.jupiter.api.Assertions.assertEquals;
+import static org.junit.jupiter.api.Assertions.assertFalse;
+import static org.junit.jupiter.api.Assertions.assertNotEquals;
+import static org.junit.jupiter.api.Assertions.assertThrows;
+import static org.junit.jupiter.api.Assertions.assertTrue;
+
+import java.lang.reflect.InvocationTargetException;
+import java.lang.reflect.Method;
+import java.lang.reflect.Modifier;
+import java.util.Arrays;
+import java.util.Map;
+import java.util.Set;
+import java.util.concurrent.ExecutorService;
+import java.util.concurrent.Executors;
+import java.util.concurrent.Future;
+import java.util.stream.Stream;
+import org.junit.jupiter.api.DynamicTest;
+import org.junit.jupiter.api.Test;
+import org.junit.jupiter.api.TestFactory;
+import org.junit.jupiter.api.function.Executable;
+
+/** Calls in the wrong state, after release, twice, and from several threads. */
+class MisuseTest extends PlayerFixture {
+    // The calls that stay possible after release.
+    private static final Set<String> ALWAYS =
+            Set.of("release", "close", "getState", "removeListener");
+
+    @Test
+    void callsBeforeTheirStateAreRefusedWithASentence() throws Exception {
+        assertRefused("prepare() was called in the state IDLE", player::prepare);
+        assertRefused("prepareAsync() was called in the state IDLE", player::prepareAsync);
+        assertRefused("start() was called in the state IDLE", player::start);
+        assertRefused("pause() was called in the state IDLE", player::pause);
+        assertRefused("stop() was called in the state IDLE", player::stop);
+        assertRefused("seekTo(5) was called in the state IDLE", () -> player.seekTo(5));
+        player.setDataSource(Media.path("video.mp4"));
+        assertRefused("setDataSource() was called in the state INITIALIZED",
+                () -> player.setDataSource("/other"));
+        assertRefused("start() was called in the state INITIALIZED", player::start);
+        player.prepare();
+        assertRefused("prepare() was called in the state PREPARED", player::prepare);
+        assertRefused("pause() was called in the state PREPARED", player::pause);
+        player.stop();
+        assertRefused("start() was called in the state STOPPED", player::start);
+        player.prepare();
+        player.start();
+        awaitMoving();
+    }
+
+    @Test
+    void aFailedPlayerCanBeResetAndUsed() throws Exception {
+        player.setDataSource(Media.path("garbage.bin"));
+        assertThrows(MediaException.class, player::prepare);
+        assertEquals(PlayerState.ERROR, player.getState());
+        assertRefused("start() was called in the state ERROR", player::start);
+        player.reset();
+        prepare("video.mp4");
+        player.start();
+        awaitMoving();
+    }
+
+    @Test
+    void releaseIsPossibleTwiceAndInEveryState() throws Exception {
+        player.release();
+        player.release();
+        player.close();
+        assertEquals(PlayerState.RELEASED, player.getState());
+        for (String media : new String[] {"video.mp4", "garbage.bin"}) {
+            OrvMediaPlayer other = new OrvMediaPlayer();
+            other.setDataSource(Media.path(media));
+            other.prepareAsync();
+            other.release();
+            assertEquals(PlayerState.RELEASED, other.getState());
+        }
+    }
+
+    @TestFactory
+    Stream<DynamicTest> everyCallAfterReleaseIsRefused() {
+        player.release();
+        return Stream.of(player, player.tracks(), player.subtitles(), player.pictures(),
+                        player.trickPlay(), player.audio(), player.divx(), player.engine())
+                .flatMap(object -> publicMethods(object.getClass())
+                        .map(method -> DynamicTest.dynamicTest(
+                                object.getClass().getSimpleName() + "." + method.getName(),
+                                () -> assertRefusedAfterRelease(object, method))));
+    }
+
+    @Test
+    void releaseEndsAPrepareThatBlocks() throws Exception {
+        ScriptedSource source = new ScriptedSource(new byte[10_000]);
+        source.misreading(0, source::block);
+        player.setDataSource(source);
+        ExecutorService other = Executors.newSingleThreadExecutor();
+        Future<?> preparing = other.submit(() -> {
+            player.prepare();
+            return null;
+        });
+        Wait.until("the engine reads", () -> source.reads.get() > 0);
+        player.release();
+        Exception thrown = assertThrows(Exception.class,
+                () -> preparing.get(Wait.LIMIT.toSeconds(), java.util.concurrent.TimeUnit.SECONDS));
+        assertTrue(thrown.getCause() instanceof MediaException
+                || thrown.getCause() instanceof IllegalStateException, thrown.toString());
+        assertEquals(PlayerState.RELEASED, player.getState());
+        assertEquals(1, source.closes.get());
+        other.shutdown();
+    }
+
+    @Test
+    void resetEndsAPrepareThatBlocks() throws Exception {
+        ScriptedSource source = new ScriptedSource(new byte[10_000]);
+        source.misreading(0, source::block);
+        player.setDataSource(source);
+        player.prepareAsync();
+        Wait.until("the engine reads", () -> source.reads.get() > 0);
+        player.reset();
+        assertEquals(PlayerState.IDLE, player.getState());
+        prepare("video.mp4");
+        assertEquals(0, recorder.count("error"));
+    }
+
+    @Test
+    void threadsThatCallAtTheSameTimeDoNotDisturbEachOther() throws Exception {
+        prepare("video.mp4");
+        player.setLooping(true);
+        ExecutorService callers = Executors.newFixedThreadPool(4);
+        Future<?>[] calls = Stream.<Runnable>of(
+                        player::start, player::getCurrentPosition,
+                        () -> player.seekTo(2000), () -> player.tracks().audio())
+                .map(call -> callers.submit(() -> repeat(25, call)))
+                .toArray(Future<?>[]::new);
+        for (Future<?> call : calls) {
+            call.get();
+        }
+        callers.shutdown();
+        assertEquals(PlayerState.STARTED, player.getState());
+        awaitMoving();
+    }
+
+    @Test
+    void releaseDuringCallsOfOtherThreadsEndsThem() throws Exception {
+        prepare("video.mp4");
+        player.start();
+        ExecutorService callers = Executors.newFixedThreadPool(3);
+        Stream.<Runnable>of(player::getCurrentPosition, () -> player.seekTo(2000),
+                        () -> player.tracks().audio())
+                .forEach(call -> callers.submit(() -> repeat(Integer.MAX_VALUE, call)));
+        Thread.sleep(50);
+        player.release();
+        callers.shutdown();
+        assertTrue(callers.awaitTermination(
+                Wait.LIMIT.toSeconds(), java.util.concurrent.TimeUnit.SECONDS));
+    }
+
+    private static void repeat(int times, Runnable call) {
+        for (int i = 0; i < times; i++) {
+            call.run();
+        }
+    }
+
+    private static Stream<Method> publicMethods(Class<?> type) {
+        return Arrays.stream(type.getMethods())
+                .filter(method -> method.getDeclaringClass() != Object.class)
+                .filter(method -> !Modifier.isStatic(method.getModifiers()))
+                .filter(method -> !ALWAYS.contains(method.getName()))
+                .filter(method -> !isAccessor(method));
+    }
+
+    // tracks(), subtitles() and the like hand out objects, which refuse by themselves.
+    private static boolean isAccessor(Method method) {
+        return method.getDeclaringClass() == OrvMediaPlayer.class
+                && method.getReturnType().getPackage() == OrvMediaPlayer.class.getPackage()
+                && method.getParameterCount() == 0;
+    }
+
+    private static void assertRefusedAfterRelease(Object object, Method method) throws Exception {
+        Object[] arguments = Arrays.stream(method.getParameterTypes())
+                .map(MisuseTest::argument)
+                .toArray();
+        InvocationTargetException thrown = assertThrows(
+                InvocationTargetException.class, () -> method.invoke(object, arguments));
+        assertEquals(IllegalStateException.class, thrown.getCause().getClass(),
+                thrown.getCause().toString());
+        String message = thrown.getCause().getMessage();
+        assertTrue(message.endsWith(" was called after the player was released"), message);
+        assertTrue(message.startsWith(method.getName() + "("), message);
+    }
+
+    private static Object argument(Class<?> type) {
+        Map<Class<?>, Object> values = Map.of(
+                int.class, 1, long.class, 1L, float.class, 1f, double.class, 1.0,
+                boolean.class, true,
+                String.class, "x",
+                Map.class, Map.of(),
+                Set.class, Set.of(),
+                java.io.FileDescriptor.class, java.io.FileDescriptor.in);
+        if (values.containsKey(type)) {
+            return values.get(type);
+        }
+        return type.isEnum() ? type.getEnumConstants()[0] : Values.of(type);
+    }
+
+    /** Objects that the calls take. */
+    private static final class Values {
+        static Object of(Class<?> type) {
+            if (type == MediaStreamSource.class) {
+                return new ScriptedSource(new byte[0]);
+            }
+            if (type == PlayerListener.class) {
+                return new Recorder();
+            }
+            if (type == com.quintora.mmp.util.PcmMediaInfo.class) {
+                return com.quintora.mmp.util.PcmMediaInfo.of(48_000, 2, 16);
+            }
+            if (type == com.quintora.SubtitleAttr.class) {
+                return com.quintora.SubtitleAttr.builder().build();
+            }
+            return null;
+        }
+    }
+
+    private void assertRefused(String beginning, Executable call) {
+        PlayerState before = player.getState();
+        String message = assertThrows(IllegalStateException.class, call).getMessage();
+        assertTrue(message.startsWith(beginning), message);
+        assertEquals(before, player.getState());
+        assertFalse(message.isBlank());
+        assertNotEquals(PlayerState.RELEASED, player.getState());
+    }
+}
