@@ -203,15 +203,13 @@ class StreamSourceTest extends PlayerFixture {
 
     @Test
     void aReadThatBlocksIsCancelledByReset() throws Exception {
-        ScriptedSource source = source("video.ts");
-        source.misreading(300_000, source::block);
+        ScriptedSource source = source("long.mkv");
         prepare(source);
+        source.misreading(0, source::block);
         player.start();
-        int reads = source.reads.get();
         Wait.until("a read blocks", source.blockedReads::hasQueuedThreads);
         player.reset();
         assertTrue(source.cancels.get() > 0);
-        assertTrue(source.reads.get() >= reads);
         assertEquals(1, source.closes.get());
         assertEquals(0, recorder.count("error"), "what a cancelled read throws is no failure");
         prepare("silent.mkv");
@@ -219,9 +217,9 @@ class StreamSourceTest extends PlayerFixture {
 
     @Test
     void aReadThatBlocksIsCancelledByRelease() throws Exception {
-        ScriptedSource source = source("video.ts");
-        source.misreading(300_000, source::block);
+        ScriptedSource source = source("long.mkv");
         prepare(source);
+        source.misreading(0, source::block);
         player.start();
         Wait.until("a read blocks", source.blockedReads::hasQueuedThreads);
         player.release();
@@ -231,19 +229,19 @@ class StreamSourceTest extends PlayerFixture {
 
     @Test
     void aStreamMayStallAndGoOn() throws Exception {
-        byte[] file = Files.readAllBytes(Path.of(Media.path("video.ts")));
+        byte[] file = Files.readAllBytes(Path.of(Media.path("long.mkv")));
         ScriptedSource source = new ScriptedSource(file) {
             @Override
             public boolean mayStall() {
                 return true;
             }
         };
-        source.misreading(100_000, (buffer, length) -> {
+        prepare(source);
+        source.misreading(0, (buffer, length) -> {
             source.blockedReads.acquireUninterruptibly();
             source.misreadFrom = Integer.MAX_VALUE;
             return source.read(buffer, length);
         });
-        prepare(source);
         player.start();
         recorder.await("info " + PlayerListener.INFO_BUFFERING_STARTED + " 0");
         source.blockedReads.release();
