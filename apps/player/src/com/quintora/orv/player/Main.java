@@ -42,7 +42,8 @@ public final class Main {
     private static int tellFailure(
             Exception problem, CommandLine command, CommandLine.ParseResult arguments)
             throws Exception {
-        if (!(problem instanceof Failure)) {
+        // A player says in a sentence what it cannot do in its present state.
+        if (!(problem instanceof Failure) && !(problem instanceof IllegalStateException)) {
             throw problem;
         }
         say(command, problem.getMessage());

@@ -1,0 +1,92 @@
+// SPDX-License-Identifier: Apache-2.0
+package com.quintora.orv.player;
+
+import static org.junit.jupiter.api.Assertions.assertEquals;
+import static org.junit.jupiter.api.Assertions.assertFalse;
+import static org.junit.jupiter.api.Assertions.assertTrue;
+
+import com.quintora.mmp.Media;
+import com.quintora.mmp.Wait;
+import java.io.IOException;
+import java.net.ServerSocket;
+import java.nio.file.Files;
+import java.nio.file.Path;
+import java.util.ArrayList;
+import java.util.Arrays;
+import java.util.List;
+import java.util.concurrent.TimeUnit;
+import org.junit.jupiter.api.AfterEach;
+import org.junit.jupiter.api.Test;
+import org.junit.jupiter.api.io.TempDir;
+
+/** Ctrl-C, in a process of its own. */
+class InterruptionTest {
+    private static final String SHOW_CURSOR = "\033[?25h";
+
+    @TempDir Path folder;
+
+    private Process process;
+
+    @AfterEach
+    void endProcess() {
+        process.destroyForcibly();
+    }
+
+    @Test
+    void aPlaybackIsEndedAndTheTerminalRestored() throws Exception {
+        play(Media.path("long.mkv"));
+        Wait.until("it plays", () -> out().contains("shown"));
+        interrupt();
+        assertEquals(Interruption.EXIT_STATUS, process.exitValue(), this::all);
+        assertTrue(out().endsWith(SHOW_CURSOR + "\n"), this::all);
+        assertEquals("", err());
+    }
+
+    @Test
+    void anOpeningThatTakesForEverIsEndedToo() throws Exception {
+        try (ServerSocket silent = new ServerSocket(0)) {
+            play("http://127.0.0.1:" + silent.getLocalPort() + "/film.mkv");
+            silent.accept();
+            interrupt();
+        }
+        assertEquals(Interruption.EXIT_STATUS, process.exitValue(), this::all);
+        assertFalse(err().contains("Exception"), this::all);
+    }
+
+    private void play(String source) throws IOException {
+        List<String> command = new ArrayList<>();
+        command.add(Path.of(System.getProperty("java.home"), "bin", "java").toString());
+        command.add("-Djava.library.path=" + System.getProperty("java.library.path"));
+        command.add("-Dorv.columns=80");
+        command.addAll(
+                Arrays.asList("-cp", System.getProperty("java.class.path"), Main.class.getName()));
+        command.addAll(Arrays.asList("play", "--no-window", source));
+        ProcessBuilder builder = new ProcessBuilder(command);
+        builder.environment().put("ORV_LOG", "silent");
+        process =
+                builder.redirectOutput(folder.resolve("out").toFile())
+                        .redirectError(folder.resolve("err").toFile())
+                        .start();
+    }
+
+    private void interrupt() throws Exception {
+        Media.run("kill", "-INT", String.valueOf(process.pid()));
+        assertTrue(process.waitFor(Wait.LIMIT.toSeconds(), TimeUnit.SECONDS), this::all);
+    }
+
+    private String out() throws IOException {
+        return Files.readString(folder.resolve("out"));
+    }
+
+    private String err() throws IOException {
+        return Files.readString(folder.resolve("err"));
+    }
+
+    private String all() {
+        try {
+            return out() + err();
+        } catch (IOException e) {
+            return e.toString();
+        }
+    }
+}

@@ -1,0 +1,113 @@
+// SPDX-License-Identifier: Apache-2.0
+package com.quintora.orv.player;
+
+import static org.junit.jupiter.api.Assertions.assertArrayEquals;
+import static org.junit.jupiter.api.Assertions.assertEquals;
+import static org.junit.jupiter.api.Assertions.assertTrue;
+
+import com.quintora.mmp.Media;
+import java.awt.image.BufferedImage;
+import java.nio.file.Files;
+import java.nio.file.Path;
+import javax.imageio.ImageIO;
+import org.junit.jupiter.api.Test;
+import org.junit.jupiter.api.io.TempDir;
+
+/** Thumbnails and covers. */
+class PictureCommandsTest {
+    // Two scalers and two decoders' rounding lie between the pictures that are compared.
+    private static final double ALIKE_DB = 28;
+
+    @TempDir Path folder;
+
+    @Test
+    void aThumbnailIsTheFrameOfItsMoment() throws Exception {
+        Path out = folder.resolve("out.png");
+        Cli thumbnail =
+                Cli.run("thumbnail", Media.path("video.mp4"), "--at", "4", "--size", "320x180",
+                        out.toString());
+        assertEquals(0, thumbnail.status(), thumbnail.err());
+        BufferedImage drawn = ImageIO.read(out.toFile());
+        assertEquals(320, drawn.getWidth());
+        assertEquals(180, drawn.getHeight());
+        assertTrue(psnr(frame("video.mp4", "4"), drawn) > ALIKE_DB);
+        assertTrue(psnr(frame("video.mp4", "8"), drawn) < ALIKE_DB);
+    }
+
+    @Test
+    void aMomentBetweenKeyFramesIsMetToo() throws Exception {
+        Path out = folder.resolve("out.png");
+        Cli thumbnail =
+                Cli.run("thumbnail", Media.path("video.mp4"), "--at", "5.4", "--size", "320x180",
+                        out.toString());
+        assertEquals(0, thumbnail.status(), thumbnail.err());
+        assertTrue(psnr(frame("video.mp4", "5.4"), ImageIO.read(out.toFile())) > ALIKE_DB);
+    }
+
+    @Test
+    void withoutASizeItHasTheShapeOfTheVideo() throws Exception {
+        Path out = folder.resolve("out.PNG");
+        assertEquals(0, Cli.run("thumbnail", Media.path("video.mp4"), out.toString()).status());
+        BufferedImage drawn = ImageIO.read(out.toFile());
+        assertEquals("320x180", drawn.getWidth() + "x" + drawn.getHeight());
+    }
+
+    @Test
+    void whatCannotBeDrawnIsRefusedInASentence() throws Exception {
+        String media = Media.path("video.mp4");
+        String out = folder.resolve("out.png").toString();
+        assertRefused(2, "at most 255 rows, not 256",
+                Cli.run("thumbnail", media, "--size", "320x256", out));
+        assertRefused(2, "at most 8192 columns, not 8193",
+                Cli.run("thumbnail", media, "--size", "8193x10", out));
+        assertRefused(2, "a PNG file", Cli.run("thumbnail", media, folder + "/out.jpg"));
+        assertRefused(1, "ends at 0:10", Cli.run("thumbnail", media, "--at", "60", out));
+        assertRefused(1, "there is no video", Cli.run("thumbnail", Media.path("tone.mp3"), out));
+        assertRefused(1, "its folder does not exist",
+                Cli.run("thumbnail", media, folder + "/none/out.png"));
+        assertTrue(Files.notExists(Path.of(out)));
+    }
+
+    @Test
+    void aCoverIsWrittenByteForByte() throws Exception {
+        Path out = folder.resolve("cover.jpg");
+        Cli cover = Cli.run("cover", Media.path("covered.mp3"), out.toString());
+        assertEquals(0, cover.status(), cover.err());
+        assertArrayEquals(
+                Files.readAllBytes(Path.of(Media.path("front.jpg"))), Files.readAllBytes(out));
+    }
+
+    @Test
+    void mediaWithoutACoverLeaveNoFile() throws Exception {
+        Path out = folder.resolve("cover.jpg");
+        assertRefused(1, "there is no picture inside",
+                Cli.run("cover", Media.path("tone.mp3"), out.toString()));
+        assertTrue(Files.notExists(out));
+    }
+
+    private static void assertRefused(int status, String words, Cli run) {
+        assertEquals(status, run.status(), run.err());
+        assertTrue(run.errLines().get(0).contains(words), run.err());
+    }
+
+    private BufferedImage frame(String media, String at) throws Exception {
+        Path file = folder.resolve("frame-" + at + ".png");
+        Media.run("ffmpeg", "-nostdin", "-v", "error", "-y", "-ss", at, "-i", Media.path(media),
+                "-frames:v", "1", file.toString());
+        return ImageIO.read(file.toFile());
+    }
+
+    private static double psnr(BufferedImage one, BufferedImage other) {
+        double squares = 0;
+        for (int y = 0; y < one.getHeight(); y++) {
+            for (int x = 0; x < one.getWidth(); x++) {
+                for (int shift = 0; shift < 24; shift += 8) {
+                    int difference =
+                            (one.getRGB(x, y) >> shift & 255) - (other.getRGB(x, y) >> shift & 255);
+                    squares += difference * difference;
+                }
+            }
+        }
+        return 10 * Math.log10(255.0 * 255 * 3 * one.getWidth() * one.getHeight() / squares);
+    }
+}

@@ -1,0 +1,112 @@
+// SPDX-License-Identifier: Apache-2.0
+package com.quintora.orv.player;
+
+import static org.junit.jupiter.api.Assertions.assertEquals;
+import static org.junit.jupiter.api.Assertions.assertTrue;
+
+import com.quintora.mmp.Media;
+import java.util.regex.Matcher;
+import java.util.regex.Pattern;
+import org.junit.jupiter.api.Test;
+import org.junit.jupiter.params.ParameterizedTest;
+import org.junit.jupiter.params.provider.CsvSource;
+
+/** Playing in the terminal, with its options, to the end of the media. */
+class PlayCommandTest {
+    private static final Pattern REPORT =
+            Pattern.compile("([0-9.]+) s of media took ([0-9.]+) s; (\\d+) frames shown");
+
+    /** How a playback went, as it tells itself. */
+    private record Report(double media, double time, int frames) {}
+
+    @Test
+    void mediaPlaysToItsEnd() throws Exception {
+        Report report = play("short.mp4");
+        assertEquals(3, report.media, 0.2);
+        assertTrue(report.frames > 60, report.toString());
+    }
+
+    @Test
+    void soundAloneHasNoFrames() throws Exception {
+        assertEquals(0, play("tone.mp3").frames);
+    }
+
+    @Test
+    void aStartBeginsLater() throws Exception {
+        assertEquals(1, play("short.mp4", "--start", "2").media, 0.2);
+    }
+
+    @Test
+    void aSpeedTakesLessTime() throws Exception {
+        Report report = play("long.mkv", "--start", "40", "--speed", "8");
+        assertEquals(20, report.media, 1.1);
+        assertTrue(report.time < report.media / 2, report.toString());
+    }
+
+    @Test
+    void aStreamPlaysAsTheFileDoes() throws Exception {
+        assertEquals(3, play("short.mp4", "--stream").media, 0.2);
+    }
+
+    @Test
+    void rawPcmPlaysAsDescribed() throws Exception {
+        assertEquals(2, play("tone-s16be.pcm", "--pcm", "44100:2:s16be").media, 0.2);
+        assertEquals(1, play("tone-s16le.pcm", "--pcm", "44100:4:s16le").media, 0.2);
+    }
+
+    @Test
+    void tracksAndSubtitlesAreTaken() throws Exception {
+        play("tracks.mkv", "--audio-track", "1", "--subtitle-track", "1", "--start", "8");
+        play("tracks.mkv", "--subtitle", Media.path("lines.srt"), "--start", "8");
+        play("tracks.mkv", "--subtitle-track", "-1", "--start", "8", "--volume", "10");
+    }
+
+    @ParameterizedTest
+    @CsvSource({
+        "--audio-track, 2, 'there is no sound track 2; they are 0 to 1'",
+        "--subtitle-track, 7, 'there is no subtitle track 7; they are 0 to 1'",
+        "--subtitle, /none.srt, 'cannot read subtitles from ''/none.srt'''",
+        "--speed, 99, 'this media cannot be played at speed 99.0'"
+    })
+    void whatTheMediaCannotDoIsOneSentence(String option, String value, String sentence)
+            throws Exception {
+        Cli run = Cli.run("play", "--no-window", Media.path("tracks.mkv"), option, value);
+        assertEquals(1, run.status());
+        assertEquals("orv: " + sentence + "\n", run.err());
+    }
+
+    @ParameterizedTest
+    @CsvSource({"--start, soon", "--volume, 101", "--ab, 5", "--pcm, x", "--speed, fast"})
+    void whatIsNoArgumentIsAQuestionOfUsage(String option, String value) {
+        Cli run = Cli.run("play", "--no-window", "some.mkv", option, value);
+        assertEquals(2, run.status());
+        assertEquals("orv: see ./orv play --help", run.errLines().get(1));
+    }
+
+    @Test
+    void mediaThatIsDamagedOrMissingIsOneSentence() throws Exception {
+        for (String source : new String[] {"/none.mkv", Media.path("noise.bin"), "/"}) {
+            Cli run = Cli.run("play", "--no-window", source);
+            assertEquals(1, run.status());
+            assertEquals(1, run.errLines().size(), run.err());
+            assertTrue(run.err().startsWith("orv: " + source + ":"), run.err());
+        }
+    }
+
+    private static Report play(String media, String... options) throws Exception {
+        String[] arguments = new String[options.length + 4];
+        arguments[0] = "play";
+        arguments[1] = "--no-window";
+        arguments[2] = "--stats";
+        arguments[3] = Media.path(media);
+        System.arraycopy(options, 0, arguments, 4, options.length);
+        Cli run = Cli.run(arguments);
+        assertEquals(0, run.status(), run.err());
+        Matcher report = REPORT.matcher(run.out());
+        assertTrue(report.find(), run.out());
+        return new Report(
+                Double.parseDouble(report.group(1)),
+                Double.parseDouble(report.group(2)),
+                Integer.parseInt(report.group(3)));
+    }
+}
