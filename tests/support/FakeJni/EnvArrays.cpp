@@ -52,7 +52,7 @@ ObjectPtr* elementOf(Entry& entry, jobjectArray handle, jsize index) {
         return nullptr;
     }
     const bool inRange = index >= 0 && static_cast<size_t>(index) < array->elements.size();
-    if (inRange && !entry.fails()) return &array->elements[index];
+    if (inRange) return &array->elements[index];
     return entry.raise("java/lang/ArrayIndexOutOfBoundsException", std::to_string(index));
 }
 
@@ -110,7 +110,7 @@ uint8_t* regionOf(Entry& entry, jbyteArray handle, jsize start, jsize length) {
     ObjectPtr array = entry.object(handle, "[B");
     if (array == nullptr) return nullptr;
     const auto size = static_cast<int64_t>(array->bytes.size());
-    if (start >= 0 && length >= 0 && int64_t{start} + length <= size && !entry.fails())
+    if (start >= 0 && length >= 0 && int64_t{start} + length <= size)
         return array->bytes.data() + start;
     return entry.raise("java/lang/ArrayIndexOutOfBoundsException", std::to_string(start));
 }

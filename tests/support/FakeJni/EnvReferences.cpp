@@ -7,15 +7,23 @@ namespace fakejni {
 
 namespace {
 
+// What a handle refers to, for the record.
+std::string targetOf(JNIEnv* env, jobject handle) {
+    Vm& vm = *static_cast<FakeEnv*>(env)->vm;
+    std::lock_guard<std::recursive_mutex> lock(vm.mutex());
+    std::string fault;
+    return toString(Value::of(vm.references().resolve(handle, threadNumber(), &fault)));
+}
+
 jobject newReference(JNIEnv* env, const char* function, RefKind kind, jobject handle) {
-    Entry entry(env, function);
+    Entry entry(env, function, targetOf(env, handle));
     ObjectPtr object = entry.object(handle, true);
     if (object == nullptr || entry.fails()) return nullptr;
     return entry.vm.references().make(kind, object, entry.thread.number);
 }
 
 void deleteReference(JNIEnv* env, const char* function, RefKind kind, jobject handle) {
-    Entry entry(env, function, "", Entry::kAllowed);
+    Entry entry(env, function, targetOf(env, handle), Entry::kAllowed);
     std::string fault;
     entry.vm.references().remove(handle, kind, entry.thread.number, &fault);
     if (!fault.empty()) entry.violation(fault);

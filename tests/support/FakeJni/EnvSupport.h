@@ -24,6 +24,7 @@ struct ThreadState {
     int number;
     bool attached = false;
     bool isJava = false;
+    size_t mark = 0;  // references made before it was attached
     ObjectPtr pending;
     FakeEnv env;
 };

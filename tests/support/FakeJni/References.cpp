@@ -18,7 +18,8 @@ const char* nameOf(RefKind kind) {
 }
 
 std::string describe(const Ref& ref) {
-    return std::string(nameOf(ref.kind)) + " reference to " + toString(Value::of(ref.object));
+    const std::string kind = std::string(nameOf(ref.kind)) + " reference";
+    return ref.live ? kind + " to " + toString(Value::of(ref.object)) : kind;
 }
 
 bool isFrameLocal(const Ref& ref, int thread) {
@@ -31,6 +32,7 @@ jobject References::make(RefKind kind, ObjectPtr object, int thread) {
     if (object == nullptr) return nullptr;
     mRefs.push_back({kind, std::move(object), thread, true});
     mKnown.insert(&mRefs.back());
+    ++mLive[static_cast<int>(kind)];
     return reinterpret_cast<jobject>(&mRefs.back());
 }
 
@@ -65,18 +67,14 @@ void References::remove(jobject handle, RefKind kind, int thread, std::string* f
     } else if (kind == RefKind::kLocal && ref->thread != thread) {
         *fault = "deletion of another thread's " + describe(*ref);
     } else {
-        ref->live = false;
+        drop(*ref);
     }
 }
 
-size_t References::liveCount(RefKind kind) const { return live(kind).size(); }
-
-std::vector<ObjectPtr> References::live(RefKind kind) const {
-    std::vector<ObjectPtr> objects;
-    for (const Ref& ref : mRefs) {
-        if (ref.live && ref.kind == kind) objects.push_back(ref.object);
-    }
-    return objects;
+void References::drop(Ref& ref) {
+    ref.live = false;
+    ref.object = nullptr;
+    --mLive[static_cast<int>(ref.kind)];
 }
 
 jobjectRefType References::typeOf(jobject handle) const {
@@ -101,7 +99,7 @@ size_t References::liveLocalsSince(size_t mark, int thread) const {
 
 void References::dropLocalsSince(size_t mark, int thread) {
     for (size_t i = mark; i < mRefs.size(); ++i) {
-        if (isFrameLocal(mRefs[i], thread)) mRefs[i].live = false;
+        if (isFrameLocal(mRefs[i], thread)) drop(mRefs[i]);
     }
 }
 

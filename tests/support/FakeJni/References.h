@@ -6,7 +6,6 @@
 #include <deque>
 #include <string>
 #include <unordered_set>
-#include <vector>
 
 #include "FakeJni/Model.h"
 
@@ -34,9 +33,7 @@ public:
     // Fills fault when the handle is no live reference of that kind.
     void remove(jobject handle, RefKind kind, int thread, std::string* fault);
 
-    size_t liveCount(RefKind kind) const;
-    // What the live ones of a kind refer to, in the order they were made.
-    std::vector<ObjectPtr> live(RefKind kind) const;
+    size_t liveCount(RefKind kind) const { return mLive[static_cast<int>(kind)]; }
     jobjectRefType typeOf(jobject handle) const;
 
     // Locals of a thread made after a mark are the frame of one native call.
@@ -46,9 +43,11 @@ public:
 
 private:
     Ref* find(jobject handle) const;
+    void drop(Ref& ref);
 
     mutable std::deque<Ref> mRefs;
     std::unordered_set<const void*> mKnown;
+    size_t mLive[3] = {};  // by kind
 };
 
 }  // namespace fakejni

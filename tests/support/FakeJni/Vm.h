@@ -93,6 +93,8 @@ public:
     void fail(const std::string& function, int nth = 1);
     // As fail, over all functions that can fail, counted together.
     void failNth(int n);
+    // Failures that have not come yet do not come any more.
+    void forgetFailures();
     // How many calls were failed so far.
     int failures() const { return mFailures; }
 

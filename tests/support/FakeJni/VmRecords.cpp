@@ -20,6 +20,11 @@ void Vm::fail(const std::string& function, int nth) {
 
 void Vm::failNth(int n) { fail("", n); }
 
+void Vm::forgetFailures() {
+    Lock lock(mMutex);
+    mPlans.clear();
+}
+
 bool Vm::mustFail(const std::string& function) {
     bool hit = false;
     for (Plan& plan : mPlans) {

@@ -75,7 +75,10 @@ ThreadState& Vm::thisThread() {
 
 jint Vm::attach(JNIEnv** env, bool asJava) {
     ThreadState& thread = thisThread();
-    if (!thread.attached) thread.isJava = asJava;
+    if (!thread.attached) {
+        thread.isJava = asJava;
+        thread.mark = mReferences.mark();
+    }
     thread.attached = true;
     *env = &thread.env;
     return JNI_OK;
@@ -91,7 +94,7 @@ jint Vm::detach() {
     // An exception that nobody caught goes to the thread's handler.
     thread.pending = nullptr;
     thread.attached = false;
-    mReferences.dropLocalsSince(0, thread.number);
+    mReferences.dropLocalsSince(thread.mark, thread.number);
     return JNI_OK;
 }
 
