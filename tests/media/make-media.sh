@@ -12,7 +12,7 @@ FILES="video.mp4 video.mkv video.ts video.avi slides.mkv rotated.mp4 hd.mp4 hd70
        alpha.mov still.png silent.mkv tracks.mkv tracks.mp4 tagged.mp3 tagged.ogg broken-tags.mp4
        front.jpg back.png covered.mp3 covered.flac covered.m4a covered.mkv noise.bin
        cut.mp4 cut.mkv
-       feature.mkv short.mp4 short.ts long.mkv silent.mp4 plain.mkv plain.mp4 lines.srt
+       feature.mkv short.mp4 short.ts long.mkv distant.mkv silent.mp4 plain.mkv plain.mp4 lines.srt
        latin1.srt lines.ass words.idx words.sub tone.mp3 tone.flac tone-s16le.pcm
        tone-s16be.pcm subtitles-only.mkv garbage.bin empty.bin"
 
@@ -215,6 +215,12 @@ make_long_mkv() {
     # shellcheck disable=SC2046
     quiet_ffmpeg -f lavfi -i "$(playing 320x180 60)" -f lavfi -i "$(tone 440 60)" \
         $(fast_h264) -g 30 -c:a aac -ac 2 "$1"
+}
+
+# Half a minute with a key frame every 15 seconds.
+make_distant_mkv() {
+    # shellcheck disable=SC2046
+    quiet_ffmpeg -f lavfi -i "$(playing 160x90 30)" $(fast_h264) -g 450 "$1"
 }
 
 make_silent_mp4() {

@@ -173,14 +173,24 @@ public final class Session implements AutoCloseable {
         if (options.audioTrack != null) {
             selectAudio(options.audioTrack);
         }
+        chooseSubtitles();
+        if (options.speed != 1) {
+            setSpeed(options.speed);
+        }
+    }
+
+    /** What is asked for, or what the media itself wants to be seen. */
+    private void chooseSubtitles() throws Failure {
         if (options.subtitle != null) {
             addSubtitles(options.subtitle);
         }
         if (options.subtitleTrack != null) {
             selectSubtitle(options.subtitleTrack);
-        }
-        if (options.speed != 1) {
-            setSpeed(options.speed);
+        } else if (options.subtitle == null) {
+            player.tracks().subtitles().stream()
+                    .filter(track -> track.flags().isDefault() || track.flags().isForced())
+                    .findFirst()
+                    .ifPresent(track -> player.subtitles().show(track.index()));
         }
     }
 

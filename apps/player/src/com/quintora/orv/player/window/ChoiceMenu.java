@@ -40,6 +40,7 @@ final class ChoiceMenu {
             super(choice.text);
             this.choice = choice;
             setFont(Theme.BODY);
+            setBorder(null);
             addActionListener(event -> choice.action.run());
         }
 

@@ -99,11 +99,18 @@ final class Conductor implements Controls {
     @Override
     public void skip(int millis) {
         stage.tell((millis < 0 ? "− " : "+ ") + Math.abs(millis) / 1000 + " s");
-        later(
-                () -> {
-                    int to = player.getCurrentPosition() + millis;
-                    session.seekTo(Math.max(0, Math.min(to, player.getDuration())));
-                });
+        later(() -> skipFrom(player.getCurrentPosition(), millis));
+    }
+
+    // A seek ends at the key frame before its goal. Where key frames are so far apart that this
+    // leads back, the goal moves on.
+    private void skipFrom(int from, int millis) {
+        int end = player.getDuration();
+        int goal = from;
+        do {
+            goal = Math.max(0, Math.min(goal + millis, end));
+            session.seekTo(goal);
+        } while (millis > 0 && goal < end && player.getCurrentPosition() <= from);
     }
 
     // While the knob is dragged only its latest place counts.
