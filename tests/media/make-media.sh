@@ -279,8 +279,10 @@ folder=$1
 here=$(dirname -- "$(readlink -f -- "${BASH_SOURCE[0]}")")
 shift
 mkdir -p "$folder"
-for file in ${*:-$FILES}; do
-    case " $(echo $FILES) " in
+read -r -d '' -a every <<<"$FILES" || true
+[ $# -gt 0 ] || set -- "${every[@]}"
+for file in "$@"; do
+    case " ${every[*]} " in
     *" $file "*) need "$file" ;;
     *) echo "make-media.sh: no such file is made: $file" >&2; exit 2 ;;
     esac
