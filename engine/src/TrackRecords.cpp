@@ -118,7 +118,7 @@ Track<Record> track(const Entry& entry, const Record& record) {
 
 void addEntry(const Entry& entry, TrackTables& tables) {
     const std::string_view type = entry.text("type");
-    const bool isPicture = entry.isSet("albumart") || entry.isSet("image");
+    const bool isPicture = entry.isSet("albumart");
     if (entry.integer("id") <= 0) return;
     if (type == "video" && !isPicture) tables.video.push_back(track(entry, videoRecord(entry)));
     if (type == "audio") tables.audio.push_back(track(entry, audioRecord(entry)));

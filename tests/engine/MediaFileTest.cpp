@@ -44,12 +44,17 @@ TEST(MediaFile, OpensPathsAndFileUrls) {
     EXPECT_EQ(statusOf("file://" + path.substr(0, path.size() - 3) + "%6d%70%34"), 0);
 }
 
+// Relative, so that nothing but the colon could be taken for a scheme.
 TEST(MediaFile, TakesColonsAndPercentsInPathsAsTheyAre) {
-    const std::string odd = testing::TempDir() + "/a:b%41.mp4";
-    unlink(odd.c_str());
-    ASSERT_EQ(symlink(mediaPath("video.mp4").c_str(), odd.c_str()), 0);
-    EXPECT_EQ(statusOf(odd), 0);
-    unlink(odd.c_str());
+    const std::string media = mediaPath("video.mp4");
+    const int before = open(".", O_RDONLY | O_DIRECTORY);
+    ASSERT_EQ(chdir(testing::TempDir().c_str()), 0);
+    unlink("a:b%41.mp4");
+    ASSERT_EQ(symlink(media.c_str(), "a:b%41.mp4"), 0);
+    EXPECT_EQ(statusOf("a:b%41.mp4"), 0);
+    unlink("a:b%41.mp4");
+    EXPECT_EQ(fchdir(before), 0);
+    close(before);
 }
 
 TEST(MediaFile, TellsWhyItCannotOpen) {
@@ -115,6 +120,36 @@ TEST(MediaFile, EndsWhenCancelledOrLate) {
     MediaOpenOptions late;
     late.timeLimit = std::chrono::milliseconds(0);
     EXPECT_EQ(statusOf(mediaPath("video.mp4"), late), ORV_ERROR_IO);
+}
+
+class CancellingSource : public MemorySource {
+public:
+    CancellingSource(std::vector<uint8_t> bytes, int reads, std::atomic<bool>& cancel)
+        : MemorySource(std::move(bytes)), mReads(reads), mCancel(cancel) {}
+
+    int read(uint8_t* buffer, int length) override {
+        if (mReads-- == 0) mCancel = true;
+        return MemorySource::read(buffer, length);
+    }
+
+private:
+    int mReads;
+    std::atomic<bool>& mCancel;
+};
+
+// Also while the streams are probed, where libavformat makes do with what it has.
+TEST(MediaFile, EndsWhenCancelledAtAnyRead) {
+    for (int reads = 0; reads < 4; reads++) {
+        std::atomic<bool> cancel{false};
+        MediaOpenOptions options;
+        options.cancel = &cancel;
+        auto source =
+            std::make_unique<CancellingSource>(bytesOf(mediaPath("video.ts")), reads, cancel);
+        source->mLongestRead = 4096;
+        std::unique_ptr<MediaFile> file;
+        EXPECT_EQ(MediaFile::open(std::move(source), options, file), ORV_ERROR_IO) << reads;
+        EXPECT_EQ(file, nullptr);
+    }
 }
 
 TEST(MediaFile, KnowsItsStreams) {

@@ -144,6 +144,8 @@ TEST(Thumbnailer, DrawsTheLastFramePastTheEndAndTheFirstBeforeTheStart) {
     for (int64_t position : {int64_t{9960}, int64_t{9990}, int64_t{10000}, int64_t{1} << 40}) {
         EXPECT_GT(psnr(kBgra, draw(*thumbnailer, position, {160, 90}), last), kSamePicture);
     }
+    // Broadcast formats cannot even be sought past the end.
+    EXPECT_GT(psnr(kBgra, draw(*open("video.ts"), 60000, {160, 90}), last), 30);
     const auto first = reference("video.mp4", "0", {160, 90});
     for (int64_t position : {int64_t{0}, int64_t{-1}, INT64_MIN}) {
         EXPECT_GT(psnr(kBgra, draw(*thumbnailer, position, {160, 90}), first), kSamePicture);

@@ -130,6 +130,8 @@ TEST(TrackRecords, TakesNoCoverForVideo) {
     const TrackTables tables = tablesOf("covered.mp3", *file);
     EXPECT_TRUE(tables.video.empty());
     EXPECT_EQ(tables.audio.size(), 1u);
+    // A picture that is the media itself is shown like video.
+    EXPECT_EQ(tablesOf("still.png", *orvtest::openMedia("still.png")).video.size(), 1u);
 }
 
 TEST(TrackRecords, KnowsTheSampleWidthOfPcm) {
