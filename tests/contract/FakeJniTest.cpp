@@ -20,6 +20,8 @@ using testing::Optional;
 class FakeJniTest : public testing::Test {
 protected:
     FakeJniTest() : type(vm.define("Thing")), env(vm.env()) {
+        // Other tests leave the dispatcher's worker running.
+        GTEST_FLAG_SET(death_test_style, "threadsafe");
         type.field("number", "I");
         type.field("flag", "Z");
         type.field("text", "Ljava/lang/String;");

@@ -51,7 +51,7 @@ TEST_F(JavaInputStreamReadTest, CopiesWhatJavaRead) {
     EXPECT_EQ(copied(), 200u);
     EXPECT_THAT(vm.callsOf("ReleaseByteArrayElements"), ElementsAre("0"));
     EXPECT_THAT(vmCalls(), ElementsAre("GetEnv", "AttachCurrentThread", "CallIntMethod",
-                                       "GetObjectField", "GetByteArrayElements",
+                                       "GetObjectField", "GetByteArrayElements", "GetArrayLength",
                                        "ReleaseByteArrayElements", "DetachCurrentThread"));
 }
 

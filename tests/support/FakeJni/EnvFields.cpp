@@ -64,6 +64,7 @@ void toValue(Entry&, Value& slot, T value) {
     if (std::is_floating_point<T>::value) {
         slot.real = static_cast<double>(value);
     } else {
+        // NOLINTNEXTLINE(bugprone-signed-char-misuse): Java's bytes are signed
         slot.integer = static_cast<int64_t>(value);
     }
 }

@@ -110,7 +110,7 @@ bool fits(Entry& entry, const Method& method, const Target& target, Class* type)
 
 // Runs the method's Java side without the machine's lock: it may block, or
 // call the machine again.
-Value run(Entry& entry, const Method& method, const char* form, ObjectPtr self,
+Value run(Entry& entry, const Method& method, const char* form, const ObjectPtr& self,
           ArgumentList& arguments) {
     std::vector<Value> args;
     const Shape shape = shapeOf(method.signature);
@@ -128,7 +128,7 @@ Value run(Entry& entry, const Method& method, const char* form, ObjectPtr self,
 
 Value invoke(Entry& entry, const Target& target, jobject handle, jmethodID id,
              ArgumentList& arguments) {
-    const Value zero = Value::zero(target.result);
+    Value zero = Value::zero(target.result);
     if (!entry.vm.isHandedOut(id)) {
         entry.violation("not a method ID");
         return zero;

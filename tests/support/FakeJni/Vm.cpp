@@ -49,7 +49,7 @@ JNIEnv* Vm::env() {
 
 Class& Vm::add(const std::string& path, Class* super) {
     std::unique_ptr<Class>& added = mClasses[path];
-    added.reset(new Class);
+    added = std::make_unique<Class>();
     added->path = path;
     added->super = super;
     added->mirror = std::make_shared<Object>();

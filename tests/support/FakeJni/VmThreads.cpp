@@ -64,7 +64,7 @@ ThreadState& Vm::thisThread() {
     Lock lock(mMutex);
     std::unique_ptr<ThreadState>& thread = mThreads[threadNumber()];
     if (thread == nullptr) {
-        thread.reset(new ThreadState);
+        thread = std::make_unique<ThreadState>();
         thread->number = threadNumber();
         thread->env.functions = envTable();
         thread->env.vm = this;
