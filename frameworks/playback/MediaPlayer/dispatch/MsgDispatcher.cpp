@@ -79,8 +79,8 @@ void MsgDispatcher::postParcel(JNIEnv* env, int msg, int ext1, int ext2, const P
     if (bytes != nullptr) {
         memcpy(bytes, parcel.data(), size);
         env->ReleaseByteArrayElements(array, bytes, 0);
+        post(env, msg, ext1, ext2, array);
     }
-    post(env, msg, ext1, ext2, array);
     env->DeleteLocalRef(array);
 }
 

@@ -111,7 +111,9 @@ void JavaInputStream::copyReadBuffer(JNIEnv* env, char* buffer, int len, int cou
         return;
     }
     if (count > len) ALOGE("JavaInputStream::read(): copy i4ReadResult>len Issue handle \n");
-    memcpy(buffer, bytes, std::max(0, std::min(count, len)));
+    // Java's count is not trusted beyond the end of its own array.
+    const int available = std::min(count, env->GetArrayLength(array));
+    memcpy(buffer, bytes, std::max(0, std::min(available, len)));
     env->ReleaseByteArrayElements(array, bytes, 0);
 }
 
