@@ -1,6 +1,8 @@
 // SPDX-License-Identifier: Apache-2.0
 // The dispatcher's handlers, its refusals, and its life.
+#include <jni/PlayerContext.h>
 #include <stdlib.h>
+#include <unistd.h>
 
 #include "DispatcherFixture.h"
 
@@ -124,6 +126,25 @@ TEST_F(SyncToAsyncHandlersTest, ManyThreadsMayAddAndAbort) {
     EXPECT_EQ(pauses().size(), 200u);
     dispatcher->delMsgHandler(service);
     EXPECT_EQ(service->getStrongCount(), 1);
+}
+
+// A program that gives its player up in the player's own event: the poster goes
+// on the worker, behind the delivery. In a process of its own, for it may crash.
+TEST_F(SyncToAsyncHandlersTest, PlayerMayBeReleasedInsideItsOwnEvent) {
+    testing::FLAGS_gtest_death_test_style = "threadsafe";
+    const auto releaseInEvent = [this] {
+        setUpPlayer();
+        playerClass
+            .findMethod("postEventFromNative", "(Ljava/lang/Object;IIILjava/lang/Object;)V", true)
+            ->implementation = [this](const fakejni::Invocation&) {
+            fakejni::callNative<void>(vm, playerClass, vm.local(player), "native_release", "()V");
+            return fakejni::Value{};
+        };
+        dispatcher->addAction(action(android::getMediaService(vm.env(), vm.local(player)), 2));
+        waitForPauses(1);
+        _exit(vm.globalReferences() == 0 && vm.violations().empty() ? 0 : 1);
+    };
+    EXPECT_EXIT(releaseInEvent(), testing::ExitedWithCode(0), "");
 }
 
 // In a process of its own, where the dispatcher does not exist yet.

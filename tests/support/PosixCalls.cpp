@@ -12,6 +12,8 @@ int __real_sigaction(int, const struct sigaction*, struct sigaction*);
 int __real_pthread_attr_init(pthread_attr_t*);
 int __real_pthread_create(pthread_t*, const pthread_attr_t*, void* (*)(void*), void*);
 void* __real_mmap(void*, size_t, int, int, int, off_t);
+void* __real_malloc(size_t);
+void __real_free(void*);
 }
 
 namespace orvtest {
@@ -25,6 +27,8 @@ PosixCall<int(pthread_attr_t*)> pthreadAttrInitCall(__real_pthread_attr_init);
 PosixCall<int(pthread_t*, const pthread_attr_t*, void* (*)(void*), void*)> pthreadCreateCall(
     __real_pthread_create);
 PosixCall<void*(void*, size_t, int, int, int, off_t)> mmapCall(__real_mmap);
+PosixCall<void*(size_t)> mallocCall(__real_malloc);
+PosixCall<void(void*)> freeCall(__real_free);
 
 }  // namespace orvtest
 
@@ -53,5 +57,7 @@ int __wrap_pthread_create(pthread_t* thread, const pthread_attr_t* attributes,
 void* __wrap_mmap(void* address, size_t length, int protection, int flags, int fd, off_t offset) {
     return orvtest::mmapCall(address, length, protection, flags, fd, offset);
 }
+void* __wrap_malloc(size_t size) { return orvtest::mallocCall(size); }
+void __wrap_free(void* block) { orvtest::freeCall(block); }
 
 }  // extern "C"

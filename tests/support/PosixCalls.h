@@ -72,5 +72,7 @@ extern PosixCall<int(int, const struct sigaction*, struct sigaction*)> sigaction
 extern PosixCall<int(pthread_attr_t*)> pthreadAttrInitCall;
 extern PosixCall<int(pthread_t*, const pthread_attr_t*, void* (*)(void*), void*)> pthreadCreateCall;
 extern PosixCall<void*(void*, size_t, int, int, int, off_t)> mmapCall;
+extern PosixCall<void*(size_t)> mallocCall;
+extern PosixCall<void(void*)> freeCall;
 
 }  // namespace orvtest
