@@ -5,6 +5,7 @@
 
 #include "AllocationFailure.h"
 #include "PlaybackCommandTable.h"
+#include "ServiceFailure.h"
 
 namespace orvtest {
 namespace {
@@ -220,6 +221,23 @@ TEST_F(PlaybackCommandsTest, NegativeAudioSessionIsAnIoException) {
                     .throws(kIo,
                             "OrvMediaClient_set_audio_session_id failed.: "
                             "status=0xFFFFFFEA"));
+}
+
+TEST_F(PlaybackCommandsTest, FailedEffectsAreIoExceptions) {
+    setUpPlayer();
+    const ServiceFailure failure(-19);
+    const auto failed = [](const std::string& name) {
+        return ReturnsNothing().logs(playbackCommand(name).whole(
+            {bridgeError("process_media_player_call(): else 2, throw exception\n")}));
+    };
+    EXPECT_THAT(
+        run("setAuxEffectSendLevel"),
+        failed("setAuxEffectSendLevel")
+            .throws(kIo, "OrvMediaClient_setAuxEffectSendLevel failed.: status=0xFFFFFFED"));
+    // The message of another command, as it is.
+    EXPECT_THAT(
+        run("attachAuxEffect"),
+        failed("attachAuxEffect").throws(kIo, "getCurrentBytePosition failed.: status=0xFFFFFFED"));
 }
 
 TEST_F(PlaybackCommandsTest, AudioStreamTypeWithoutEngineIsAnIoException) {

@@ -1,0 +1,42 @@
+// SPDX-License-Identifier: Apache-2.0
+#include "ServiceFailure.h"
+
+#include "jni/media-service/OrvMediaService.h"
+
+using android::OrvMediaService;
+using android::status_t;
+
+namespace {
+
+status_t sStatus = android::NO_ERROR;
+
+}  // namespace
+
+namespace orvtest {
+
+ServiceFailure::ServiceFailure(status_t status) { sStatus = status; }
+ServiceFailure::~ServiceFailure() { sStatus = android::NO_ERROR; }
+
+}  // namespace orvtest
+
+// What the linker's --wrap makes of attachAuxEffect(int) and
+// setAuxEffectSendLevel(float).
+extern "C" {
+
+status_t __real__ZN7android15OrvMediaService15attachAuxEffectEi(OrvMediaService* service, int id);
+status_t __real__ZN7android15OrvMediaService21setAuxEffectSendLevelEf(OrvMediaService* service,
+                                                                      float level);
+
+status_t __wrap__ZN7android15OrvMediaService15attachAuxEffectEi(OrvMediaService* service, int id) {
+    const status_t status = __real__ZN7android15OrvMediaService15attachAuxEffectEi(service, id);
+    return sStatus != android::NO_ERROR ? sStatus : status;
+}
+
+status_t __wrap__ZN7android15OrvMediaService21setAuxEffectSendLevelEf(OrvMediaService* service,
+                                                                      float level) {
+    const status_t status =
+        __real__ZN7android15OrvMediaService21setAuxEffectSendLevelEf(service, level);
+    return sStatus != android::NO_ERROR ? sStatus : status;
+}
+
+}  // extern "C"

@@ -1,0 +1,19 @@
+// SPDX-License-Identifier: Apache-2.0
+#pragma once
+
+#include <utils/Errors.h>
+
+namespace orvtest {
+
+// While one lives, the service's two effect operations fail with its status.
+// They cannot fail by themselves: the engine has no such operation. The test
+// program's linker leads their callers here. One at a time.
+class ServiceFailure {
+public:
+    explicit ServiceFailure(android::status_t status);
+    ~ServiceFailure();
+    ServiceFailure(const ServiceFailure&) = delete;
+    ServiceFailure& operator=(const ServiceFailure&) = delete;
+};
+
+}  // namespace orvtest
