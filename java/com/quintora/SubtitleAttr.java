@@ -122,13 +122,18 @@ public class SubtitleAttr extends com.quintora.mmp.util.SubtitleAttr {
         }
 
         /**
-         * Moves the texts from their usual place.
+         * Moves the texts from their usual place, which is in the middle at the bottom.
          *
-         * @param x to the right, in thousandths of the picture's width
-         * @param y downward, in thousandths of the picture's height
+         * @param x thousandths of the picture's width, -1000 to 1000: above 0 lines begin that far
+         *     from the left edge, below 0 they end that far from the right edge, 0 centres them
+         * @param y thousandths of the picture's height, -1000 to 1000: above 0 further down, below
+         *     0 further up
          * @return this
+         * @throws IllegalArgumentException for an offset out of range
          */
         public Builder displayOffset(int x, int y) {
+            requireOffset(x);
+            requireOffset(y);
             Subtitle_DisplayOffset offset = new Subtitle_DisplayOffset();
             offset.mX = x;
             offset.mY = y;
@@ -155,6 +160,13 @@ public class SubtitleAttr extends com.quintora.mmp.util.SubtitleAttr {
         private Builder with(int flag) {
             attr.mMask |= flag;
             return this;
+        }
+
+        private static void requireOffset(int thousandths) {
+            if (thousandths < -1000 || thousandths > 1000) {
+                throw new IllegalArgumentException(
+                        "a display offset is -1000 to 1000: " + thousandths);
+            }
         }
 
         private static Subtitle_Color color(int argb) {

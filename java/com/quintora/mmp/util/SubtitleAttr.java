@@ -110,10 +110,13 @@ public class SubtitleAttr {
 
     /** A place, counted from the usual one. */
     public static class Subtitle_DisplayOffset {
-        /** To the right, in thousandths of the picture's width. */
+        /**
+         * Thousandths of the picture's width: above 0 lines begin that far from the left edge,
+         * below 0 they end that far from the right edge, 0 centres them.
+         */
         public int mX;
 
-        /** Downward, in thousandths of the picture's height. */
+        /** Thousandths of the picture's height, downward. */
         public int mY;
 
         /** The usual place. */

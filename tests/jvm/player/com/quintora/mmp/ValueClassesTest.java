@@ -101,6 +101,8 @@ class ValueClassesTest {
         assertThrows(IllegalArgumentException.class, () -> builder.fontSize(256));
         assertThrows(IllegalArgumentException.class, () -> builder.fontSizeType(3));
         assertThrows(IllegalArgumentException.class, () -> builder.fontSizeType(-1));
+        assertThrows(IllegalArgumentException.class, () -> builder.displayOffset(1001, 0));
+        assertThrows(IllegalArgumentException.class, () -> builder.displayOffset(0, -1001));
     }
 
     @Test

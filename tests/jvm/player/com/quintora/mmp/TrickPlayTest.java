@@ -1,0 +1,142 @@
+// SPDX-License-Identifier: Apache-2.0
+package com.quintora.mmp;
+
+import static org.junit.jupiter.api.Assertions.assertEquals;
+import static org.junit.jupiter.api.Assertions.assertFalse;
+import static org.junit.jupiter.api.Assertions.assertThrows;
+import static org.junit.jupiter.api.Assertions.assertTrue;
+
+import org.junit.jupiter.api.Test;
+import org.junit.jupiter.params.ParameterizedTest;
+import org.junit.jupiter.params.provider.ValueSource;
+
+class TrickPlayTest extends PlayerFixture {
+    @Test
+    void trickPlayNeedsMedia() {
+        assertThrows(IllegalStateException.class, () -> player.trickPlay().setSpeed(1));
+        assertThrows(IllegalStateException.class, () -> player.trickPlay().step(1));
+        assertThrows(IllegalStateException.class, () -> player.trickPlay().seekToByte(0));
+        assertThrows(IllegalStateException.class, () -> player.trickPlay().repeatFromHere());
+        assertThrows(IllegalStateException.class, () -> player.trickPlay().getBytePosition());
+        assertEquals(1, player.trickPlay().getSpeed());
+        assertEquals(0, player.trickPlay().getBufferedPercent());
+    }
+
+    @ParameterizedTest
+    @ValueSource(doubles = {2, 4, 0.5})
+    void forwardSpeedsMoveOn(double speed) throws Exception {
+        prepare("long.mkv");
+        assertTrue(player.trickPlay().canPlayAt(speed));
+        player.trickPlay().setSpeed(speed);
+        assertEquals(speed, player.trickPlay().getSpeed());
+        player.start();
+        awaitMoving();
+        long begin = System.nanoTime();
+        int from = player.getCurrentPosition();
+        Wait.until("some seconds were played", () -> player.getCurrentPosition() > from + 3000);
+        double played = player.getCurrentPosition() - from;
+        double real = (System.nanoTime() - begin) / 1e6;
+        assertTrue(played < real * speed * 1.5 + 1500, played + " ms in " + real);
+        player.trickPlay().setSpeed(1);
+        assertEquals(1, player.trickPlay().getSpeed());
+    }
+
+    @ParameterizedTest
+    @ValueSource(doubles = {-1, -4, -16})
+    void backwardSpeedsMoveBack(double speed) throws Exception {
+        prepare("long.mkv");
+        player.seekTo(40_000);
+        assertTrue(player.trickPlay().canPlayAt(speed));
+        player.trickPlay().setSpeed(speed);
+        player.start();
+        Wait.until("it went back", () -> player.getCurrentPosition() < 39_000);
+        player.trickPlay().setSpeed(1);
+        awaitMoving();
+        assertEquals(PlayerState.STARTED, player.getState());
+    }
+
+    @Test
+    void speedsOutOfRangeAreRefused() throws Exception {
+        prepare("long.mkv");
+        for (double speed : new double[] {33, -33, Double.NaN, Double.POSITIVE_INFINITY}) {
+            assertFalse(player.trickPlay().canPlayAt(speed));
+            assertFalse(player.trickPlay().canSeekAt(speed));
+            assertThrows(IllegalArgumentException.class,
+                    () -> player.trickPlay().setSpeed(speed));
+        }
+        assertEquals(1, player.trickPlay().getSpeed());
+        assertTrue(player.trickPlay().canSeekAt(1));
+    }
+
+    @Test
+    void singleFramesAreShown() throws Exception {
+        prepare("long.mkv");
+        player.start();
+        awaitMoving();
+        player.trickPlay().step(1);
+        assertEquals(PlayerState.PAUSED, player.getState());
+        int before = player.getCurrentPosition();
+        player.trickPlay().step(1);
+        Wait.until("one frame of 33 ms passed",
+                () -> Math.abs(player.getCurrentPosition() - before - 33) < 10);
+        player.trickPlay().step(3);
+        Wait.until("three more passed",
+                () -> Math.abs(player.getCurrentPosition() - before - 133) < 10);
+        player.trickPlay().step(-2);
+        Wait.until("two went back",
+                () -> Math.abs(player.getCurrentPosition() - before - 67) < 10);
+    }
+
+    @Test
+    void aSectionIsRepeated() throws Exception {
+        prepare("long.mkv");
+        assertFalse(player.trickPlay().repeatUntilHere(), "nothing was begun");
+        player.seekTo(10_000);
+        assertTrue(player.trickPlay().repeatFromHere());
+        player.seekTo(11_000);
+        assertTrue(player.trickPlay().repeatUntilHere());
+        player.start();
+        for (int round = 0; round < 3; round++) {
+            Wait.until("the section's end is near", () -> player.getCurrentPosition() > 10_700);
+            Wait.until("it begins again", () -> player.getCurrentPosition() < 10_600);
+            assertTrue(player.getCurrentPosition() >= 9_900);
+        }
+        assertTrue(player.trickPlay().repeatOff());
+        Wait.until("it plays on", () -> player.getCurrentPosition() > 11_300);
+        assertEquals(0, recorder.count("completion"));
+    }
+
+    @Test
+    void bytePositionsMoveOnAndAreSought() throws Exception {
+        prepare("long.mkv");
+        long begin = player.trickPlay().getBytePosition();
+        assertTrue(begin > 0);
+        player.trickPlay().seekToByte(3_000_000);
+        assertEquals(30_000, player.getCurrentPosition(), 10_000);
+        assertTrue(player.trickPlay().getBytePosition() > begin);
+        recorder.await("seek");
+        assertThrows(IllegalArgumentException.class, () -> player.trickPlay().seekToByte(-1));
+        assertThrows(IllegalArgumentException.class,
+                () -> player.trickPlay().seekToByte(1L << 31));
+        assertThrows(IllegalStateException.class,
+                () -> player.trickPlay().seekToByte(Integer.MAX_VALUE));
+    }
+
+    @Test
+    void theNativeHalfCutsBytePositions() throws Exception {
+        prepare("long.mkv");
+        player.seekTo(30_000);
+        player.native_seekToPosition((1L << 32) + 16);
+        assertTrue(player.getCurrentPosition() < 2000, "16 bytes from the start");
+        assertThrows(IllegalStateException.class, () -> player.native_seekToPosition(1L << 31));
+    }
+
+    @Test
+    void whatIsBufferedIsAPercentage() throws Exception {
+        prepare("long.mkv");
+        int percent = player.trickPlay().getBufferedPercent();
+        assertTrue(percent >= 0 && percent <= 100, "" + percent);
+        player.seekTo(59_000);
+        Wait.until("nearly all is read", () -> player.trickPlay().getBufferedPercent() > 95);
+    }
+}
