@@ -32,10 +32,17 @@ MsgDispatcher::MsgDispatcher(JNIEnv* env, jobject thiz, jobject weak_thiz) {
 
 MsgDispatcher::~MsgDispatcher() {
     ALOGI("MsgDispatcher::~MsgDispatcher(): Enter\n");
-    // Not attached here: the last reference goes on a Java thread.
+    // Normally the last reference goes on a Java thread, in native_release. A
+    // player that is released inside its own event loses it on the dispatcher's
+    // thread, which is detached by then.
     JNIEnv* env = AndroidRuntime::getJNIEnv();
-    env->DeleteGlobalRef(mObject);
-    env->DeleteGlobalRef(mClass);
+    const bool attach = env == nullptr && g__JavaVM != nullptr;
+    if (attach) g__JavaVM->AttachCurrentThread(&env, nullptr);
+    if (env != nullptr) {
+        env->DeleteGlobalRef(mObject);
+        env->DeleteGlobalRef(mClass);
+    }
+    if (attach) g__JavaVM->DetachCurrentThread();
     ALOGI("MsgDispatcher::~MsgDispatcher(): Leave\n");
 }
 
