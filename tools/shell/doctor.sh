@@ -1,0 +1,64 @@
+# SPDX-License-Identifier: Apache-2.0
+# shellcheck shell=bash
+# What ./orv doctor says of the machine. Each check prints one line and fails
+# when ./orv play could not work for it.
+
+# row WHAT STATE SENTENCE
+row() { printf '%-10s %-8s %s\n' "$@"; }
+
+check_machine() {
+    local bad=0 check
+    for check in packages java display sound; do
+        "check_$check" || bad=1
+    done
+    return $bad
+}
+
+check_packages() {
+    local list missing status=0
+    for list in play test armhf inspect; do
+        missing=$(missing_packages "$list" | awk '{print $1}' | paste -sd' ')
+        if [ -z "$missing" ]; then
+            row packages ok "all of tools/packages-$list.txt are installed"
+        elif [ "$list" = play ]; then
+            row packages missing "to build and play: $missing; ./orv play installs them"
+            status=1
+        else
+            row packages missing "of tools/packages-$list.txt: $missing; installed when they are needed"
+        fi
+    done
+    return $status
+}
+
+check_java() {
+    local version
+    if ! command -v javac >/dev/null; then
+        row java missing "there is no JDK; ./orv play installs openjdk-17-jdk"
+        return 1
+    fi
+    version=$(javac -version 2>&1 | awk '{print $2}')
+    if [ "${version%%.*}" -lt 17 ] 2>/dev/null; then
+        row java old "javac is version $version; 17 or newer is needed, see update-alternatives --config javac"
+        return 1
+    fi
+    row java ok "JDK $version"
+}
+
+check_display() {
+    if [ -n "${DISPLAY:-}" ]; then
+        row display ok "$DISPLAY"
+    else
+        row display none "without a display ./orv play plays in the terminal"
+    fi
+}
+
+check_sound() {
+    local runtime=${XDG_RUNTIME_DIR:-/run/user/$(id -u)}
+    if [ -n "${PULSE_SERVER:-}" ] || [ -S "$runtime/pulse/native" ] || [ -S "$runtime/pipewire-0" ]; then
+        row sound ok "a sound server runs"
+    elif grep -qs '^ *[0-9]' /proc/asound/cards; then
+        row sound ok "$(sed -n 's/^ *[0-9]* \[.*\]: //p' /proc/asound/cards | head -n 1)"
+    else
+        row sound none "there is no sound card and no sound server: video plays without sound"
+    fi
+}
