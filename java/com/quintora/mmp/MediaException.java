@@ -28,6 +28,7 @@ public class MediaException extends IOException {
     /** The engine gave no status. */
     public static final int STATUS_UNKNOWN = Integer.MIN_VALUE;
 
+    /** The engine's status. */
     private final int status;
 
     /**
