@@ -1,11 +1,12 @@
 // SPDX-License-Identifier: Apache-2.0
 #pragma once
 
-#ifndef LOG_TAG
-#define LOG_TAG "TarnPlayer"
-#endif
 #include <log/log.h>
 #include <utils/Errors.h>
+
+// Platform headers that log themselves leave a tag of their own.
+#undef LOG_TAG
+#define LOG_TAG "TarnPlayer"
 
 namespace orvtarn {
 

@@ -12,6 +12,7 @@
 #include "EngineLog.h"
 #include "MpvError.h"
 #include "ThreadName.h"
+#include "UrlRest.h"
 
 namespace orvtarn {
 namespace {
@@ -86,6 +87,9 @@ void EventLoop::handle(const mpv_event& event) {
         case MPV_EVENT_END_FILE:
             onEndFile(*static_cast<const mpv_event_end_file*>(event.data));
             break;
+        case MPV_EVENT_FILE_LOADED:
+            onLoaded();
+            break;
         case MPV_EVENT_SEEK:
             mState.update([](PlayerState::Values& v) { v.seeks++; });
             break;
@@ -107,6 +111,15 @@ void EventLoop::handle(const mpv_event& event) {
         default:
             break;
     }
+}
+
+// Formats without an index find key frames by guessing, sometimes behind the
+// time that was asked for: exact seeks begin further ahead there.
+void EventLoop::onLoaded() {
+    const bool indexed = mMpv.getString("file-format").value_or("").find("mpeg") != 0;
+    mMpv.set("hr-seek-demuxer-offset", indexed ? 0.0 : 2.0);
+    // A connection that breaks loses it.
+    mFileSize = mMpv.getInt("file-size").value_or(0);
 }
 
 void EventLoop::onEndFile(const mpv_event_end_file& end) {
@@ -179,6 +192,8 @@ void EventLoop::onProperty(const mpv_event_property& property) {
 }
 
 void EventLoop::onTime(double seconds) {
+    // A word from before a seek or step that is done would undo its position.
+    if (mState.phase() != Phase::Started) seconds = mMpv.getDouble("time-pos").value_or(seconds);
     mVideo.setPosition(static_cast<int64_t>(std::max(seconds, 0.0) * 1e6));
     mState.update([&](PlayerState::Values& v) { v.position = std::max(seconds, 0.0); });
 }
@@ -205,9 +220,10 @@ void EventLoop::onBuffered(double seconds) {
 void EventLoop::onEndReached() {
     // The word may be older than a seek away from the end.
     if (!mMpv.getFlag("eof-reached").value_or(false)) return;
-    if (!sourceFailed() && mEndHandler && mEndHandler()) return;
+    const bool broken = brokeOff();
+    if (!broken && mEndHandler && mEndHandler()) return;
     mMpv.set("pause", true);
-    if (sourceFailed()) return failWith(ORV_ERROR_IO);
+    if (broken) return failWith(ORV_ERROR_IO);
     const bool completed = mState.update([](PlayerState::Values& v) {
         if (v.phase != Phase::Started) return false;
         v.phase = Phase::Completed;
@@ -238,19 +254,30 @@ void EventLoop::failWith(android::status_t status) {
     mNotifier.post(android::MEDIA_ERROR, android::MEDIA_ERROR_UNKNOWN, status);
 }
 
+std::shared_ptr<MediaSource> EventLoop::source() {
+    std::lock_guard<std::mutex> lock(mSourceMutex);
+    return mSource;
+}
+
 // Seconds, by the source's own word.
 double EventLoop::sourceDuration() {
-    std::shared_ptr<MediaSource> source;
-    {
-        std::lock_guard<std::mutex> lock(mSourceMutex);
-        source = mSource;
-    }
-    return source != nullptr ? static_cast<double>(source->knownDuration()) / 1000 : 0;
+    const std::shared_ptr<MediaSource> media = source();
+    return media != nullptr ? static_cast<double>(media->knownDuration()) / 1000 : 0;
 }
 
 bool EventLoop::sourceFailed() {
-    std::lock_guard<std::mutex> lock(mSourceMutex);
-    return mSource != nullptr && mSource->readFailed();
+    const std::shared_ptr<MediaSource> media = source();
+    return media != nullptr && media->readFailed();
+}
+
+// Whether the media came to an end before their bytes did, because nobody
+// gives those any more.
+bool EventLoop::brokeOff() {
+    const std::shared_ptr<MediaSource> media = source();
+    if (media == nullptr) return false;
+    if (media->isOfBytes()) return media->readFailed();
+    const int64_t position = mMpv.getInt("stream-pos").value_or(0);
+    return !media->isLocal() && position < mFileSize && !isServed(*media, position, mFileSize);
 }
 
 }  // namespace orvtarn

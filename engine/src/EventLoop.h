@@ -41,6 +41,7 @@ public:
 private:
     void run();
     void handle(const mpv_event& event);
+    void onLoaded();
     void onEndFile(const mpv_event_end_file& end);
     void onRestart();
     void onProperty(const mpv_event_property& property);
@@ -51,7 +52,9 @@ private:
     void onVideoSize();
     void becomePreparedIfReady();
     void failWith(android::status_t status);
+    std::shared_ptr<MediaSource> source();
     double sourceDuration();
+    bool brokeOff();
     bool sourceFailed();
 
     MpvHandle& mMpv;
@@ -59,6 +62,7 @@ private:
     VideoOutput& mVideo;
     Notifier& mNotifier;
     std::function<bool()> mEndHandler;
+    int64_t mFileSize = 0;  // bytes, 0 when unknown
     std::mutex mSourceMutex;
     std::shared_ptr<MediaSource> mSource;
     std::atomic<bool> mQuit{false};

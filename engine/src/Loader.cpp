@@ -8,6 +8,7 @@
 #include <sys/stat.h>
 #include <unistd.h>
 
+#include <algorithm>
 #include <chrono>
 #include <utility>
 #include <vector>
@@ -39,6 +40,17 @@ const IORV_PB_CTRL_SET_MEDIA_INFO_T kUsualSamples = [] {
     return info;
 }();
 
+// A line break would smuggle in headers of its own.
+void dropBrokenHeaders(RequestHeaders& headers) {
+    const auto isBroken = [](const RequestHeaders::value_type& header) {
+        const bool broken =
+            (header.first + header.second).find_first_of("\r\n") != std::string::npos;
+        if (broken) ALOGW("setDataSource: header %s left out", header.first.c_str());
+        return broken;
+    };
+    headers.erase(std::remove_if(headers.begin(), headers.end(), isBroken), headers.end());
+}
+
 }  // namespace
 
 android::status_t Loader::setUrl(const char* url, RequestHeaders headers) {
@@ -47,6 +59,7 @@ android::status_t Loader::setUrl(const char* url, RequestHeaders headers) {
     if (status != android::NO_ERROR) {
         return failed(status, "setDataSource", url != nullptr ? url : "no name");
     }
+    dropBrokenHeaders(headers);
     return setSource("setDataSource", std::make_shared<UrlMediaSource>(name, std::move(headers)));
 }
 
@@ -181,9 +194,7 @@ void Loader::setHeaders() {
     std::vector<std::string> fields;
     std::string userAgent = "orvtarn";
     for (const auto& [name, value] : source()->headers()) {
-        if ((name + value).find_first_of("\r\n") != std::string::npos) {
-            ALOGW("setDataSource: header %s holds a line break, left out", name.c_str());
-        } else if (strcasecmp(name.c_str(), "User-Agent") == 0) {
+        if (strcasecmp(name.c_str(), "User-Agent") == 0) {
             userAgent = value;
         } else {
             fields.push_back(name + ": " + value);

@@ -27,7 +27,7 @@ private:
 // The path of a file name or "file:" URL; null for URLs of other kinds.
 const char* pathOf(const char* url) {
     if (strncasecmp(url, "file://", 7) == 0) return url + 7;
-    return strstr(url, "://") == nullptr ? url : nullptr;
+    return *url == '/' || strstr(url, "://") == nullptr ? url : nullptr;
 }
 
 int statusOfErrno(int error) {

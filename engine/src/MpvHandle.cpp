@@ -43,6 +43,8 @@ const Option kOptions[] = {
     // Brings back the line on screen when a subtitle track is turned on.
     {"demuxer-mkv-subtitle-preroll-secs-index", "60"},
     {"network-timeout", "20"},
+    // A connection that broke is taken up again, four times in seven seconds.
+    {"stream-lavf-o", "reconnect=1,reconnect_delay_max=4"},
     {"pause", "yes"},
     {"sid", "no"},
 };

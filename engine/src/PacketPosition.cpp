@@ -6,6 +6,7 @@ extern "C" {
 #include <libavformat/avformat.h>
 }
 
+#include <algorithm>
 #include <functional>
 
 namespace orvtarn {
@@ -13,6 +14,8 @@ namespace {
 
 // A frame that a time just misses by rounding is still meant.
 constexpr double kRounding = 0.0005;
+
+constexpr int64_t kFirstRunUp = 64 * 1024;  // bytes
 
 const AVStream* leadingStream(MediaFile& file) {
     AVFormatContext* context = file.context();
@@ -58,14 +61,39 @@ int64_t indexedTimeBefore(const AVStream& stream, int64_t position) {
     return time;
 }
 
-bool seekNearByte(MediaFile& file, const AVStream& stream, int64_t position) {
-    AVFormatContext* context = file.context();
-    const bool byBytes = (context->iformat->flags & AVFMT_TS_DISCONT) != 0 &&
-                         (context->iformat->flags & AVFMT_NO_BYTE_SEEK) == 0;
-    if (byBytes) return av_seek_frame(context, -1, position, AVSEEK_FLAG_BYTE) >= 0;
+bool seeksByBytes(const AVInputFormat& format) {
+    return (format.flags & AVFMT_TS_DISCONT) != 0 && (format.flags & AVFMT_NO_BYTE_SEEK) == 0;
+}
+
+bool seekByIndex(MediaFile& file, const AVStream& stream, int64_t position) {
     int64_t time = indexedTimeBefore(stream, position);
     if (time == INT64_MIN) time = stream.start_time == AV_NOPTS_VALUE ? 0 : stream.start_time;
-    return av_seek_frame(context, stream.index, time, AVSEEK_FLAG_BACKWARD) >= 0;
+    return av_seek_frame(file.context(), stream.index, time, AVSEEK_FLAG_BACKWARD) >= 0;
+}
+
+// The timestamp of the last packet from here on that lies at or before a byte.
+std::optional<int64_t> lastPacketBefore(MediaFile& file, const AVStream& stream, int64_t position) {
+    std::optional<int64_t> time;
+    eachPacket(file, stream, [&](const AVPacket& packet) {
+        if (packet.pos <= position) time = packet.pts;
+        return packet.pos <= position;
+    });
+    return time;
+}
+
+std::optional<int64_t> packetTimeAt(MediaFile& file, const AVStream& stream, int64_t position) {
+    if (!seeksByBytes(*file.context()->iformat)) {
+        if (!seekByIndex(file, stream, position)) return {};
+        return lastPacketBefore(file, stream, position);
+    }
+    // A seek arrives at the next whole packet: it begins further and further
+    // ahead until there is one before the byte.
+    for (int64_t ahead = kFirstRunUp;; ahead *= 8) {
+        const int64_t from = std::max<int64_t>(position - ahead, 0);
+        if (av_seek_frame(file.context(), -1, from, AVSEEK_FLAG_BYTE) < 0) return {};
+        const std::optional<int64_t> time = lastPacketBefore(file, stream, position);
+        if (time || from == 0) return time;
+    }
 }
 
 }  // namespace
@@ -91,16 +119,13 @@ std::optional<int64_t> byteAtTime(MediaFile& file, double seconds) {
 
 std::optional<double> timeAtByte(MediaFile& file, int64_t position) {
     const AVStream* stream = leadingStream(file);
-    if (stream == nullptr || !seekNearByte(file, *stream, position)) return {};
-    std::optional<int64_t> time;
-    eachPacket(file, *stream, [&](const AVPacket& packet) {
-        // Byte seeks may arrive a little behind; then the first packet counts.
-        if (!time || packet.pos <= position) time = packet.pts;
-        return packet.pos <= position;
-    });
+    if (stream == nullptr) return {};
+    std::optional<int64_t> time = packetTimeAt(file, *stream, position);
+    // What lies before the first packet belongs to it.
+    if (!time && stream->start_time != AV_NOPTS_VALUE) time = stream->start_time;
     if (!time) return {};
     const double seconds = static_cast<double>(*time) * av_q2d(stream->time_base);
-    return seconds > startOf(file) ? seconds - startOf(file) : 0;
+    return std::max(seconds - startOf(file), 0.0);
 }
 
 }  // namespace orvtarn

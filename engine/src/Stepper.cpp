@@ -19,10 +19,13 @@ bool Stepper::step(int amount) {
     if (mMpv.getInt("vid").value_or(0) <= 0) return refused("step", "no picture");
     mTransport.becomePaused();
     const bool towardsEnd = amount > 0;
-    for (; amount != 0; amount += towardsEnd ? -1 : 1) {
-        if (!(towardsEnd ? forward() : back())) return refused("step", "no such frame");
+    bool found = true;
+    for (; found && amount != 0; amount += towardsEnd ? -1 : 1) {
+        found = towardsEnd ? forward() : back();
     }
-    return true;
+    const double now = mMpv.getDouble("time-pos").value_or(0);
+    mState.update([now](PlayerState::Values& v) { v.position = now; });
+    return found || refused("step", "no such frame");
 }
 
 bool Stepper::forward() {

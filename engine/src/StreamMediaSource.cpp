@@ -29,6 +29,13 @@ private:
     IOrvStreamSource* const mStream;
 };
 
+// A source that says that it can seek and does not is one that cannot. What
+// cannot seek begins where it stands.
+bool seeksToStart(IOrvStreamSource* stream) {
+    SourceLock lock(stream);
+    return stream->isSeekable() && stream->byteSeek(E_ORV_STREAM_SEEK_SET, 0) == 0;
+}
+
 class Counted {
 public:
     explicit Counted(std::atomic<int>& count) : mCount(count) { mCount++; }
@@ -70,12 +77,9 @@ private:
 
 StreamMediaSource::StreamMediaSource(IOrvStreamSource* stream)
     : mStream(stream),
-      mSeekable(stream->isSeekable()),
+      mSeekable(seeksToStart(stream)),
       mStalling(stream->isStallingSupport()),
-      mSize(-1),
-      // What cannot seek begins where it stands.
-      mPosition(mSeekable ? std::max<int64_t>(stream->getCurrentPosition(), -1) : 0) {
-    mSize = measure();
+      mSize(measure()) {
     mStream->setThreadSelf();
 }
 
@@ -87,7 +91,7 @@ int64_t StreamMediaSource::measure() {
     if (!mSeekable) return low;
     SourceLock lock(mStream);
     const int64_t end = mStream->byteSeek(E_ORV_STREAM_SEEK_END, 0);
-    mPosition = end;
+    if (end >= 0) mPosition = end;
     return end > 0 && static_cast<uint32_t>(end) == low ? end : low;
 }
 
@@ -132,7 +136,8 @@ bool StreamMediaSource::moveTo(int64_t position) {
     if (!mSeekable) return false;
     Counted reading(mReading);
     const int64_t reached = mStream->byteSeek(E_ORV_STREAM_SEEK_SET, position);
-    mPosition = reached == position ? position : -1;
+    // A seek that failed leaves the source where it was.
+    if (reached >= 0) mPosition = reached;
     return reached == position || refused("seek", "the source does not go there");
 }
 

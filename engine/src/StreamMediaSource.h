@@ -43,8 +43,9 @@ private:
     const bool mSeekable;
     const bool mStalling;
     ReaderCount mReaders;
-    int64_t mSize;                   // -1 when unknown
-    std::atomic<int64_t> mPosition;  // the source's; -1 when only a seek can tell
+    // The source's; -1 when only a seek can tell.
+    std::atomic<int64_t> mPosition{0};
+    const int64_t mSize;  // -1 when unknown
 
     std::atomic<int> mReading{0};  // calls that may block in the source
     std::atomic<uint64_t> mCancels{0};

@@ -273,12 +273,13 @@ bool TarnPlayer::deselectTrack(int index) {
 
 bool TarnPlayer::addTimedTextSource(const char* path) {
     return mEngine->call(__func__, false,
-                         [&] { return mEngine->subtitles.add(__func__, path, false); });
+                         [&] { return mEngine->subtitles.add("addTimedTextSource", path, false); });
 }
 
 bool TarnPlayer::setSubtitleDataSource(const char* url) {
-    return mEngine->call(__func__, false,
-                         [&] { return mEngine->subtitles.add(__func__, url, true); });
+    return mEngine->call(__func__, false, [&] {
+        return mEngine->subtitles.add("setSubtitleDataSource", url, true);
+    });
 }
 
 bool TarnPlayer::setSubtitleDataSourceEx(const char* sub, const char* idx) {

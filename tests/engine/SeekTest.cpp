@@ -2,6 +2,7 @@
 // Moving the position, by times and by bytes.
 #include <media/MediaTrack.h>
 
+#include <sstream>
 #include <thread>
 
 #include "PlayerTest.h"
@@ -26,8 +27,8 @@ TEST_F(SeekTest, PreviousSyncGoesToTheKeyFrameBefore) {
     open("feature.mkv");
     EXPECT_EQ(4000, positionAfter(5500, Mode::SEEK_PREVIOUS_SYNC));
     EXPECT_EQ(6000, positionAfter(6000, Mode::SEEK_PREVIOUS_SYNC)) << "an exact hit stays";
-    EXPECT_EQ(0, positionAfter(1999, Mode::SEEK_PREVIOUS_SYNC));
-    EXPECT_EQ(3, events->count(MEDIA_SEEK_COMPLETE));
+    EXPECT_EQ(0, positionAfter(1990, Mode::SEEK_PREVIOUS_SYNC));
+    EXPECT_TRUE(events->waitFor(MEDIA_SEEK_COMPLETE, 3));
 }
 
 TEST_F(SeekTest, NextSyncGoesToTheKeyFrameBehind) {
@@ -112,17 +113,22 @@ struct Packet {
     long long position;
 };
 
+std::string probe(const std::string& name, const std::string& what) {
+    const std::vector<uint8_t> output =
+        outputOf("ffprobe -v error -select_streams v -show_entries " + what + " -of csv=p=0 '" +
+                 mediaPath(name) + "'");
+    return std::string(output.begin(), output.end());
+}
+
 std::vector<Packet> packetsOf(const std::string& name) {
-    const std::vector<uint8_t> output = outputOf(
-        "ffprobe -v error -select_streams v -show_entries packet=pts_time,pos -of csv=p=0 '" +
-        mediaPath(name) + "'");
-    const std::string text(output.begin(), output.end());
+    const double start = atof(probe(name, "format=start_time").c_str());
+    std::istringstream lines(probe(name, "packet=pts_time,pos"));
     std::vector<Packet> packets;
-    for (size_t at = 0; at < text.size(); at = text.find('\n', at) + 1) {
+    for (std::string line; std::getline(lines, line);) {
         Packet packet = {};
-        if (sscanf(text.c_str() + at, "%lf,%lld", &packet.time, &packet.position) == 2) {
-            packets.push_back(packet);
-        }
+        if (sscanf(line.c_str(), "%lf,%lld", &packet.time, &packet.position) != 2) continue;
+        packet.time -= start;
+        packets.push_back(packet);
     }
     return packets;
 }
@@ -131,13 +137,11 @@ class ByteSeekTest : public SeekTest, public testing::WithParamInterface<const c
 
 TEST_P(ByteSeekTest, GoesToTheFrameAtTheByteAndSaysSo) {
     const std::vector<Packet> packets = packetsOf(GetParam());
-    ASSERT_GT(packets.size(), 80u);
+    ASSERT_GT(packets.size(), 49u);
     open(GetParam());
-    // ffprobe's times of a transport stream do not begin at 0.
-    const double start = packets[0].time;
-    for (size_t i : {5u, 31u, 60u, 77u, 12u}) {
+    for (size_t i : {5u, 31u, 40u, 49u, 12u}) {
         ASSERT_TRUE(player->seekToPosition(packets[i].position + 1)) << i;
-        EXPECT_NEAR(1000 * (packets[i].time - start), position(), 2) << i;
+        EXPECT_NEAR(1000 * packets[i].time, position(), 2) << i;
         int bytes = 0;
         EXPECT_EQ(NO_ERROR, player->getCurrentBytePosition(&bytes));
         EXPECT_EQ(packets[i].position, bytes) << i;

@@ -1,0 +1,90 @@
+// SPDX-License-Identifier: Apache-2.0
+#include "FakeStream.h"
+
+#include <string.h>
+
+#include <algorithm>
+#include <chrono>
+
+#include "TestMedia.h"
+
+namespace orvtest {
+
+FakeStream::FakeStream(const std::string& path)
+    : mContent(bytesOf(path)), mDelivered(mContent.size()) {}
+
+void FakeStream::blockAt(int64_t position) {
+    std::lock_guard<std::mutex> lock(mMutex);
+    mBlocksAt = position;
+}
+
+void FakeStream::letGo() {
+    std::lock_guard<std::mutex> lock(mMutex);
+    mBlocksAt = INT64_MAX;
+    mChanged.notify_all();
+}
+
+bool FakeStream::waitUntilBlocked() {
+    std::unique_lock<std::mutex> lock(mMutex);
+    return mChanged.wait_for(lock, std::chrono::seconds(10), [this] { return mBlocked; });
+}
+
+void FakeStream::cancelRead() {
+    std::lock_guard<std::mutex> lock(mMutex);
+    mCancels++;
+    mCancelled = mBlocked;
+    mChanged.notify_all();
+}
+
+bool FakeStream::awaitGo(std::unique_lock<std::mutex>& lock) {
+    if (mPosition < mBlocksAt) return true;
+    mBlocked = true;
+    mChanged.notify_all();
+    mChanged.wait(lock, [this] { return mCancelled || mPosition < mBlocksAt; });
+    mBlocked = false;
+    return !std::exchange(mCancelled, false);
+}
+
+int FakeStream::read(char* buffer, int len, int& readLen) {
+    std::unique_lock<std::mutex> lock(mMutex);
+    mReads++;
+    readLen = 0;
+    if (!mValid) return ORV_STREAM_ERROR_CODE_EOF;
+    if (!awaitGo(lock)) return ORV_STREAM_ERROR_CODE_NOT_OK;
+    const int64_t position = mPosition;
+    const int64_t end =
+        std::min<int64_t>({static_cast<int64_t>(mContent.size()), mEndsAt, mEndsAtNow});
+    if (position >= mFailsAt) return ORV_STREAM_ERROR_CODE_NOT_OK;
+    if (position >= end) return ORV_STREAM_ERROR_CODE_EOF;
+    const int64_t count =
+        std::min<int64_t>({len, mLongestRead, end - position, mFailsAt - position});
+    memcpy(buffer, &mContent[position], static_cast<size_t>(count));
+    memcpy(&mDelivered[position], buffer, static_cast<size_t>(count));
+    const bool over = mOverreport > 0 && count == len;
+    readLen = static_cast<int>(count) + (over ? mOverreport : 0);
+    mPosition = std::min<int64_t>(position + readLen, mContent.size());
+    return ORV_STREAM_ERROR_CODE_OK;
+}
+
+long long FakeStream::byteSeek(E_Orv_Stream_Seek_Type type, long long offset) {
+    std::lock_guard<std::mutex> lock(mMutex);
+    mSeeks++;
+    if (!mSeekable || mSeeksFail || !mValid) return -1;
+    long long target = offset;
+    if (type == E_ORV_STREAM_SEEK_CUR) target += mPosition;
+    if (type == E_ORV_STREAM_SEEK_END) target += static_cast<long long>(mContent.size());
+    if (target < 0 || target > static_cast<long long>(mContent.size())) return -1;
+    mPosition = target;
+    return target;
+}
+
+uint32_t FakeStream::getFileLength() {
+    return mHasLength ? static_cast<uint32_t>(mContent.size()) : 0xFFFFFFFF;
+}
+
+std::vector<uint8_t> FakeStream::delivered() const {
+    std::lock_guard<std::mutex> lock(mMutex);
+    return mDelivered;
+}
+
+}  // namespace orvtest

@@ -1,0 +1,198 @@
+// SPDX-License-Identifier: Apache-2.0
+// Data sources: paths, URLs with headers, descriptors, and what they refuse.
+#include <fcntl.h>
+#include <orvtarn/PlayerTypes.h>
+#include <sys/stat.h>
+#include <unistd.h>
+
+#include "HttpServer.h"
+#include "PlayerTest.h"
+
+using namespace android;
+using namespace orvtest;
+
+namespace {
+
+class SourceTest : public PlayerTest {
+protected:
+    status_t setPath(const std::string& path) {
+        return player->setDataSource(path.c_str(), nullptr);
+    }
+
+    status_t prepareUrl(const std::string& url) {
+        EXPECT_EQ(NO_ERROR, setPath(url));
+        return player->prepare();
+    }
+};
+
+TEST_F(SourceTest, PathsAreCheckedAtOnce) {
+    EXPECT_EQ(NAME_NOT_FOUND, setPath("/nowhere/at/all.mkv"));
+    EXPECT_EQ(BAD_VALUE, setPath("/tmp"));
+    EXPECT_EQ(BAD_VALUE, setPath(""));
+    EXPECT_EQ(BAD_VALUE, setPath(""));
+    EXPECT_EQ(BAD_VALUE, player->setDataSource(static_cast<const char*>(nullptr), nullptr));
+    EXPECT_EQ(NO_ERROR, setPath("file://" + mediaPath("short.mp4")));
+    EXPECT_EQ(NO_ERROR, player->prepare());
+}
+
+TEST_F(SourceTest, UnreadableFilesAreTold) {
+    if (geteuid() == 0) GTEST_SKIP() << "root reads everything";
+    const std::string path = mediaPath("unreadable.bin");
+    outputOf("touch '" + path + "'; chmod 0 '" + path + "'");
+    EXPECT_EQ(PERMISSION_DENIED, setPath(path));
+}
+
+TEST_F(SourceTest, NamesMayLookLikeOptionsAndProtocols) {
+    const std::string strange = mediaPath("-- edl,a b'%41ü.mp4");
+    outputOf("cp '" + mediaPath("silent.mp4") + "' \"" + strange + "\"");
+    EXPECT_EQ(NO_ERROR, setPath(strange));
+    EXPECT_EQ(NO_ERROR, player->prepare());
+}
+
+struct BrokenFile {
+    const char* name;
+    int status;
+};
+
+class BrokenFileTest : public SourceTest, public testing::WithParamInterface<BrokenFile> {};
+
+TEST_P(BrokenFileTest, EndsPrepareWithItsStatus) {
+    ASSERT_EQ(NO_ERROR, setPath(mediaPath(GetParam().name)));
+    EXPECT_EQ(GetParam().status, player->prepare());
+    int msec = -1;
+    EXPECT_EQ(GetParam().status, player->getCurrentPosition(&msec));
+    EXPECT_TRUE(events->waitFor(MEDIA_ERROR));
+    EXPECT_EQ(INVALID_OPERATION, player->start());
+    EXPECT_EQ(INVALID_OPERATION, player->prepare());
+    // The player is as good as new after a reset.
+    player->reset();
+    open("short.mp4");
+}
+
+INSTANTIATE_TEST_SUITE_P(Kinds, BrokenFileTest,
+                         testing::Values(BrokenFile{"garbage.bin", ORV_ERROR_MALFORMED},
+                                         BrokenFile{"empty.bin", ORV_ERROR_MALFORMED},
+                                         BrokenFile{"cut.mp4", ORV_ERROR_MALFORMED},
+                                         BrokenFile{"subtitles-only.mkv", ORV_ERROR_UNSUPPORTED}),
+                         [](const auto& info) {
+                             std::string name = info.param.name;
+                             for (char& c : name) c = isalnum(c) ? c : '_';
+                             return name;
+                         });
+
+TEST_F(SourceTest, MediaCutShortPlayAsFarAsTheyGo) {
+    open("cut.mkv");
+    playToEnd();
+    EXPECT_EQ(duration(), position());
+}
+
+TEST_F(SourceTest, ADescriptorPlays) {
+    const int fd = ::open(mediaPath("short.mp4").c_str(), O_RDONLY);
+    struct stat status;
+    fstat(fd, &status);
+    ASSERT_EQ(NO_ERROR, player->setDataSource(fd, 0, status.st_size));
+    close(fd);
+    ASSERT_EQ(NO_ERROR, player->prepare());
+    EXPECT_NEAR(3000, duration(), 50);
+    EXPECT_EQ(NO_ERROR, player->seekTo(2000, 0));
+    EXPECT_EQ(2000, position());
+}
+
+TEST_F(SourceTest, ADescriptorsRangeIsAllThatIsRead) {
+    const std::string packed = mediaPath("packed.tmp");
+    outputOf("(head -c 12345 /dev/zero; cat '" + mediaPath("short.mp4") +
+             "'; head -c 5000 /dev/zero) >'" + packed + "'");
+    struct stat inner;
+    stat(mediaPath("short.mp4").c_str(), &inner);
+    const int fd = ::open(packed.c_str(), O_RDONLY);
+    lseek(fd, 777, SEEK_SET);
+    ASSERT_EQ(NO_ERROR, player->setDataSource(fd, 12345, inner.st_size));
+    ASSERT_EQ(NO_ERROR, player->prepare());
+    playToEnd();
+    EXPECT_EQ(777, lseek(fd, 0, SEEK_CUR)) << "the descriptor's own position is not used";
+    close(fd);
+}
+
+TEST_F(SourceTest, DescriptorsAreChecked) {
+    const int fd = ::open(mediaPath("short.mp4").c_str(), O_RDONLY);
+    EXPECT_EQ(BAD_VALUE, player->setDataSource(fd, -1, 100));
+    EXPECT_EQ(BAD_VALUE, player->setDataSource(fd, 0, -1));
+    EXPECT_EQ(BAD_VALUE, player->setDataSource(-1, 0, 100));
+    close(fd);
+    EXPECT_EQ(BAD_VALUE, player->setDataSource(fd, 0, 100)) << "closed";
+    int ends[2];
+    ASSERT_EQ(0, pipe(ends));
+    EXPECT_EQ(BAD_VALUE, player->setDataSource(ends[0], 0, 100)) << "no file";
+    close(ends[0]);
+    close(ends[1]);
+}
+
+TEST_F(SourceTest, ARangeBehindTheEndIsEmpty) {
+    const int fd = ::open(mediaPath("short.mp4").c_str(), O_RDONLY);
+    ASSERT_EQ(NO_ERROR, player->setDataSource(fd, int64_t{1} << 40, 1000));
+    EXPECT_EQ(ORV_ERROR_MALFORMED, player->prepare());
+    close(fd);
+}
+
+TEST_F(SourceTest, AUrlPlaysAndSeeks) {
+    HttpServer server(mediaPath("short.mp4"));
+    ASSERT_EQ(NO_ERROR, prepareUrl(server.url()));
+    EXPECT_NEAR(3000, duration(), 50);
+    EXPECT_EQ(NO_ERROR, player->seekTo(1500, 0));
+    EXPECT_EQ(1000, position());
+    playToEnd();
+}
+
+TEST_F(SourceTest, HeadersGoWithEachRequestAndNoFurther) {
+    HttpServer server(mediaPath("short.mp4"));
+    KeyedVector<String8, String8> headers;
+    headers.add(String8("X-Token"), String8("a,b; c=\"d\""));
+    headers.add(String8("User-Agent"), String8("Set Top/1.0"));
+    headers.add(String8("X-Evil"), String8("x\r\nX-Smuggled: yes"));
+    ASSERT_EQ(NO_ERROR, player->setDataSource(server.url("first").c_str(), &headers));
+    ASSERT_EQ(NO_ERROR, player->prepare());
+    player->reset();
+    ASSERT_EQ(NO_ERROR, prepareUrl(server.url("second")));
+    for (const std::string& request : server.requests()) {
+        const bool first = request.find("/first") != std::string::npos;
+        EXPECT_EQ(first, request.find("X-Token: a,b; c=\"d\"\r\n") != std::string::npos) << request;
+        EXPECT_EQ(first, request.find("User-Agent: Set Top/1.0\r\n") != std::string::npos)
+            << request;
+        EXPECT_EQ(std::string::npos, request.find("X-Smuggled")) << request;
+    }
+}
+
+TEST_F(SourceTest, UrlsThatFailAreInputErrors) {
+    HttpServer server(mediaPath("short.mp4"));
+    server.setStatus(404);
+    EXPECT_EQ(ORV_ERROR_IO, prepareUrl(server.url()));
+    player->reset();
+    EXPECT_EQ(ORV_ERROR_IO, prepareUrl("http://127.0.0.1:1/refused.mp4"));
+    player->reset();
+    EXPECT_EQ(ORV_ERROR_IO, prepareUrl("nosuch://scheme/media"));
+}
+
+TEST_F(SourceTest, AConnectionThatBreaksIsAnErrorNotTheEnd) {
+    HttpServer server(mediaPath("feature.mkv"));
+    server.breakAt(1500000);
+    ASSERT_EQ(NO_ERROR, prepareUrl(server.url()));
+    ASSERT_EQ(NO_ERROR, player->start());
+    ASSERT_TRUE(events->waitFor(MEDIA_ERROR));
+    int msec = 0;
+    EXPECT_EQ(ORV_ERROR_IO, player->getCurrentPosition(&msec));
+    EXPECT_EQ(0, events->count(MEDIA_PLAYBACK_COMPLETE));
+}
+
+TEST_F(SourceTest, AServerThatIsSilentCanBeLeft) {
+    HttpServer server(mediaPath("short.mp4"));
+    server.setSilent(true);
+    ASSERT_EQ(NO_ERROR, setPath(server.url()));
+    ASSERT_EQ(NO_ERROR, player->prepareAsync());
+    ASSERT_TRUE(eventually([&] { return !server.requests().empty(); }));
+    const auto begin = std::chrono::steady_clock::now();
+    EXPECT_EQ(NO_ERROR, player->reset());
+    EXPECT_LT(std::chrono::steady_clock::now() - begin, std::chrono::seconds(2));
+    open("short.mp4");
+}
+
+}  // namespace
