@@ -34,7 +34,7 @@ is_configured() {
 # Says nothing while all goes well, and then only the errors.
 ninja_quietly() {
     local log=$ORV_BUILD/log/ninja.log
-    ninja -C "$ORV_BUILD" "$@" >"$log" 2>&1 </dev/null && return
+    NINJA_STATUS='[%p] ' follow_to "$log" ninja -C "$ORV_BUILD" "$@" && return
     sed -n '/^FAILED\|^CMake Error\|^ninja: error/,$p' "$log" | head -n 60 >&2
     die "the build failed; all it said is in $log"
 }

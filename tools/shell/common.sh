@@ -23,16 +23,37 @@ use() {
     done
 }
 
-# run_logged LOG COMMAND…: quiet while it succeeds; on failure shows the end of
-# what it said and returns its status.
+# run_logged LOG COMMAND…: quiet while it succeeds, but for its progress on a
+# terminal; on failure shows the end of what it said and fails.
 run_logged() {
+    local log=$1
+    shift
+    follow_to "$log" "$@" && return
+    grep -v '^[dp][lm]status:' "$log" | tail -n 40 >&2
+    say "all of it is in $log"
+    return 1
+}
+
+# follow_to LOG COMMAND…: writes what it says to the log, and shows how far it is.
+follow_to() {
     local log=$1 status=0
     shift
     mkdir -p -- "$(dirname -- "$log")"
-    "$@" >"$log" 2>&1 </dev/null || status=$?
-    if [ "$status" -ne 0 ]; then
-        tail -n 40 -- "$log" >&2
-        say "all of it is in $log"
-    fi
+    "$@" 2>&1 </dev/null | show_progress "$log" || status=$?
+    [ ! -t 2 ] || printf '\r\033[K' >&2
     return "$status"
+}
+
+# The percentages that apt-get (its status lines) and ninja ([ 12%]) tell.
+show_progress() {
+    local log=$1 line percent
+    while IFS= read -r line; do
+        printf '%s\n' "$line"
+        case $line in
+        dlstatus:* | pmstatus:*) IFS=: read -r _ _ percent _ <<<"$line" ;;
+        '['*'%]'*) percent=${line#*[} && percent=${percent%%%*} ;;
+        *) continue ;;
+        esac
+        [ ! -t 2 ] || printf '\r     %3d%%' "${percent%%.*}" >&2
+    done >"$log"
 }

@@ -79,5 +79,6 @@ update_package_lists() {
 
 apt_get() {
     run_logged "$ORV_BUILD/log/apt.log" "${AS_ROOT[@]}" env DEBIAN_FRONTEND=noninteractive \
-        apt-get -y -q -o DPkg::Lock::Timeout=300 -o Dpkg::Use-Pty=0 -o Acquire::Retries=3 "$@"
+        apt-get -y -q -o DPkg::Lock::Timeout=300 -o Dpkg::Use-Pty=0 -o Acquire::Retries=3 \
+        -o APT::Status-Fd=1 "$@"
 }
