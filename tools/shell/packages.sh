@@ -52,7 +52,7 @@ install_packages() {
     [ -z "$lists_are_fresh" ] && update_package_lists &&
         apt_get install --no-install-recommends "$@" && return
     die "Debian's packages could not be installed; the lines above say what apt-get met." \
-        "Is the network up? ./orv can be started again at any time."
+        "Once that is mended, start ./orv again."
 }
 
 # Sets AS_ROOT to what a command needs in front to run as root.
@@ -71,10 +71,11 @@ package_lists_are_old() {
     [ -z "$(find /var/lib/apt/lists -maxdepth 1 -name '*_Packages*' -ctime -7 -print -quit 2>/dev/null)" ]
 }
 
+# A source of somebody else's may fail without harm: the installation will tell.
 update_package_lists() {
     say "reading Debian's package lists"
-    apt_get update || die \
-        "apt-get could not read the package lists. Is the network up, and are the sources in /etc/apt right?"
+    apt_get update -o APT::Update::Error-Mode=any || say \
+        "not every package list could be read. Is the network up, and are the sources in /etc/apt right?"
 }
 
 apt_get() {
