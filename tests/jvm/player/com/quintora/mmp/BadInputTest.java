@@ -13,6 +13,7 @@ import java.io.FileDescriptor;
 import java.io.FileInputStream;
 import java.io.IOException;
 import java.net.ServerSocket;
+import java.nio.charset.StandardCharsets;
 import java.nio.file.Files;
 import java.nio.file.Path;
 import java.nio.file.attribute.PosixFilePermissions;
@@ -248,8 +249,8 @@ class BadInputTest extends PlayerFixture {
     }
 
     private static byte[] replace(byte[] bytes, String from, String to) {
-        String text = new String(bytes, java.nio.charset.StandardCharsets.ISO_8859_1);
+        String text = new String(bytes, StandardCharsets.ISO_8859_1);
         assertTrue(text.contains(from), "the media does not hold " + from);
-        return text.replace(from, to).getBytes(java.nio.charset.StandardCharsets.ISO_8859_1);
+        return text.replace(from, to).getBytes(StandardCharsets.ISO_8859_1);
     }
 }

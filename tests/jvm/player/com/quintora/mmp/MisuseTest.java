@@ -7,6 +7,9 @@ import static org.junit.jupiter.api.Assertions.assertNotEquals;
 import static org.junit.jupiter.api.Assertions.assertThrows;
 import static org.junit.jupiter.api.Assertions.assertTrue;
 
+import com.quintora.SubtitleAttr;
+import com.quintora.mmp.util.PcmMediaInfo;
+import java.io.FileDescriptor;
 import java.lang.reflect.InvocationTargetException;
 import java.lang.reflect.Method;
 import java.lang.reflect.Modifier;
@@ -16,8 +19,10 @@ import java.util.Set;
 import java.util.concurrent.ExecutorService;
 import java.util.concurrent.Executors;
 import java.util.concurrent.Future;
+import java.util.concurrent.TimeUnit;
 import java.util.stream.Stream;
 import org.junit.jupiter.api.DynamicTest;
+import org.junit.jupiter.api.Tag;
 import org.junit.jupiter.api.Test;
 import org.junit.jupiter.api.TestFactory;
 import org.junit.jupiter.api.function.Executable;
@@ -101,7 +106,7 @@ class MisuseTest extends PlayerFixture {
         Wait.until("the engine reads", () -> source.reads.get() > 0);
         player.release();
         Exception thrown = assertThrows(Exception.class,
-                () -> preparing.get(Wait.LIMIT.toSeconds(), java.util.concurrent.TimeUnit.SECONDS));
+                () -> preparing.get(Wait.LIMIT.toSeconds(), TimeUnit.SECONDS));
         assertTrue(thrown.getCause() instanceof MediaException
                 || thrown.getCause() instanceof IllegalStateException, thrown.toString());
         assertEquals(PlayerState.RELEASED, player.getState());
@@ -122,6 +127,7 @@ class MisuseTest extends PlayerFixture {
         assertEquals(0, recorder.count("error"));
     }
 
+    @Tag("slow-on-emulator")
     @Test
     void threadsThatCallAtTheSameTimeDoNotDisturbEachOther() throws Exception {
         prepare("video.mp4");
@@ -152,7 +158,7 @@ class MisuseTest extends PlayerFixture {
         player.release();
         callers.shutdown();
         assertTrue(callers.awaitTermination(
-                Wait.LIMIT.toSeconds(), java.util.concurrent.TimeUnit.SECONDS));
+                Wait.LIMIT.toSeconds(), TimeUnit.SECONDS));
     }
 
     private static void repeat(int times, Runnable call) {
@@ -196,7 +202,7 @@ class MisuseTest extends PlayerFixture {
                 String.class, "x",
                 Map.class, Map.of(),
                 Set.class, Set.of(),
-                java.io.FileDescriptor.class, java.io.FileDescriptor.in);
+                FileDescriptor.class, FileDescriptor.in);
         if (values.containsKey(type)) {
             return values.get(type);
         }
@@ -212,11 +218,11 @@ class MisuseTest extends PlayerFixture {
             if (type == PlayerListener.class) {
                 return new Recorder();
             }
-            if (type == com.quintora.mmp.util.PcmMediaInfo.class) {
-                return com.quintora.mmp.util.PcmMediaInfo.of(48_000, 2, 16);
+            if (type == PcmMediaInfo.class) {
+                return PcmMediaInfo.of(48_000, 2, 16);
             }
-            if (type == com.quintora.SubtitleAttr.class) {
-                return com.quintora.SubtitleAttr.builder().build();
+            if (type == SubtitleAttr.class) {
+                return SubtitleAttr.builder().build();
             }
             return null;
         }

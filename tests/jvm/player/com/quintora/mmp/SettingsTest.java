@@ -8,6 +8,7 @@ import static org.junit.jupiter.api.Assertions.assertTrue;
 
 import android.os.Parcel;
 import com.quintora.mmp.util.DivxLastMemoryFilePosition;
+import java.io.IOException;
 import java.util.Optional;
 import java.util.Set;
 import org.junit.jupiter.api.Test;
@@ -38,7 +39,7 @@ class SettingsTest extends PlayerFixture {
         player.audio().setSessionId(17);
         assertEquals(17, player.audio().getSessionId());
         assertThrows(IllegalArgumentException.class, () -> player.audio().setSessionId(-1));
-        assertThrows(java.io.IOException.class, () -> player.native_setAudioSessionId(-1));
+        assertThrows(IOException.class, () -> player.native_setAudioSessionId(-1));
         assertEquals(17, player.audio().getSessionId());
         player.reset();
         assertEquals(17, player.audio().getSessionId());
