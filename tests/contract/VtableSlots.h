@@ -1,6 +1,7 @@
 // SPDX-License-Identifier: Apache-2.0
 #pragma once
 
+#include <stddef.h>
 #include <utils/RefBase.h>
 
 #include <new>
@@ -37,6 +38,7 @@ public:
     }
     ~Counted() override { ++destroyed; }
 
+    static void* operator new(size_t size) { return ::operator new(size); }
     static void operator delete(void* memory) {
         ++deleted;
         ::operator delete(memory);
@@ -51,11 +53,10 @@ template <typename T, typename... Arguments>
 bool hasDestructorsAt(int slot, Arguments... arguments) {
     using Object = Counted<T>;
     Object::destroyed = Object::deleted = 0;
-    T* object = new Object(arguments...);
-    void* memory = object;
-    callSlot(memory, slot);
+    alignas(Object) unsigned char memory[sizeof(Object)];
+    T* object = ::new (static_cast<void*>(memory)) Object(arguments...);
+    callSlot(object, slot);
     const bool complete = Object::destroyed == 1 && Object::deleted == 0;
-    ::operator delete(memory);
 
     object = new Object(arguments...);
     callSlot(object, slot + 1);
