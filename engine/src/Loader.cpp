@@ -84,7 +84,8 @@ android::status_t Loader::setStream(IOrvStreamSource* stream) {
     return setSource("setDataSource", std::make_shared<StreamMediaSource>(stream));
 }
 
-android::status_t Loader::setSource(const char* operation, std::shared_ptr<MediaSource> source) {
+android::status_t Loader::setSource(const char* operation,
+                                    const std::shared_ptr<MediaSource>& source) {
     std::lock_guard<std::mutex> load(mLoadMutex);
     const Phase phase = mState.phase();
     if (phase != Phase::Idle) return PlayerState::wrongPhase(operation, phase);

@@ -61,7 +61,7 @@ public:
     std::shared_ptr<MediaDetails> details() const;
 
 private:
-    android::status_t setSource(const char* operation, std::shared_ptr<MediaSource> source);
+    android::status_t setSource(const char* operation, const std::shared_ptr<MediaSource>& source);
     android::status_t beginPrepare(const char* operation, uint64_t& session);
     android::status_t load();
     void setHeaders();

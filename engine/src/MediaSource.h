@@ -21,7 +21,7 @@ using RequestHeaders = std::vector<std::pair<std::string, std::string>>;
 // media libraries open themselves, or bytes that this engine reads for them.
 class MediaSource {
 public:
-    virtual ~MediaSource() {}
+    virtual ~MediaSource() = default;
 
     // A path or URL; for sources of bytes the name under which StreamProtocol
     // finds them.

@@ -24,7 +24,7 @@ TarnPlayer::TarnPlayer(int decoder)
     : mEngine(new Engine(decoder,
                          [this](int msg, int ext1, int ext2) { sendEvent(msg, ext1, ext2); })) {}
 
-TarnPlayer::~TarnPlayer() {}
+TarnPlayer::~TarnPlayer() = default;
 
 status_t TarnPlayer::release() {
     mEngine->release();

@@ -34,23 +34,22 @@ bool Tracks::tables(const char* operation, TrackTables& tables) {
 }
 
 bool Tracks::videoCount(int& count) {
-    TrackTables all;
-    if (!tables("getVideoTrackCount", all)) return false;
-    count = static_cast<int>(all.video.size());
-    return true;
+    return countOf("getVideoTrackCount", &TrackTables::video, count);
 }
 
 bool Tracks::audioCount(int& count) {
-    TrackTables all;
-    if (!tables("getAudioTrackCount", all)) return false;
-    count = static_cast<int>(all.audio.size());
-    return true;
+    return countOf("getAudioTrackCount", &TrackTables::audio, count);
 }
 
 bool Tracks::subtitleCount(int& count) {
+    return countOf("getSubtitleTrackCount", &TrackTables::subtitles, count);
+}
+
+template <class Table>
+bool Tracks::countOf(const char* operation, Table TrackTables::*table, int& count) {
     TrackTables all;
-    if (!tables("getSubtitleTrackCount", all)) return false;
-    count = static_cast<int>(all.subtitles.size());
+    if (!tables(operation, all)) return false;
+    count = static_cast<int>((all.*table).size());
     return true;
 }
 
@@ -101,18 +100,19 @@ bool Tracks::chapterInfo(int chapter, SubtitleTrackInfo& info) {
 }
 
 bool Tracks::currentAudio(int* index) {
-    TrackTables all;
-    if (index == nullptr) return refused("getCurrentAudioIndex", "null argument");
-    if (!tables("getCurrentAudioIndex", all)) return false;
-    *index = selectedIn(all.audio);
-    return true;
+    return currentOf("getCurrentAudioIndex", &TrackTables::audio, index);
 }
 
 bool Tracks::currentSubtitle(int* index) {
+    return currentOf("getCurrentSubtitleIndex", &TrackTables::subtitles, index);
+}
+
+template <class Table>
+bool Tracks::currentOf(const char* operation, Table TrackTables::*table, int* index) {
     TrackTables all;
-    if (index == nullptr) return refused("getCurrentSubtitleIndex", "null argument");
-    if (!tables("getCurrentSubtitleIndex", all)) return false;
-    *index = selectedIn(all.subtitles);
+    if (index == nullptr) return refused(operation, "null argument");
+    if (!tables(operation, all)) return false;
+    *index = selectedIn(all.*table);
     return true;
 }
 

@@ -46,6 +46,10 @@ public:
     bool showSubtitle(const char* operation, int64_t id);
 
 private:
+    template <class Table>
+    bool countOf(const char* operation, Table TrackTables::*table, int& count);
+    template <class Table>
+    bool currentOf(const char* operation, Table TrackTables::*table, int* index);
     bool choose(const char* operation, const char* property, int64_t id);
     bool chapterInfo(int chapter, SubtitleTrackInfo& info);
 
