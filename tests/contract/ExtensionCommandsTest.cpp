@@ -6,6 +6,7 @@
 #include <functional>
 
 #include "JniFixture.h"
+#include "ServiceFailure.h"
 
 namespace orvtest {
 namespace {
@@ -381,6 +382,18 @@ TEST_F(ExtensionCommandsTest, DecoderCommandIsAcceptedAndItsCharactersStay) {
         send(string("status")),
         Returns("0")
             .logs({enter(kSend), serviceInfo("OrvMediaService::mString(status)"), leave(kSend)})
+            .leavesUnreleased({"GetStringUTFChars"}));
+    leftUnreleased = {"GetStringUTFChars"};
+}
+
+TEST_F(ExtensionCommandsTest, RefusedDecoderCommandIsMinusOne) {
+    setUpPlayer();
+    const ServiceFailure failure(-19);
+    EXPECT_THAT(
+        send(string("status")),
+        Returns("-1")
+            .logs({enter(kSend), serviceInfo("OrvMediaService::mString(status)"),
+                   bridgeInfo(std::string(kSend) + "(): service get failed\n"), leave(kSend)})
             .leavesUnreleased({"GetStringUTFChars"}));
     leftUnreleased = {"GetStringUTFChars"};
 }

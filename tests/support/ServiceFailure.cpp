@@ -19,8 +19,8 @@ ServiceFailure::~ServiceFailure() { sStatus = android::NO_ERROR; }
 
 }  // namespace orvtest
 
-// What the linker's --wrap makes of attachAuxEffect(int) and
-// setAuxEffectSendLevel(float).
+// What the linker's --wrap makes of attachAuxEffect(int),
+// setAuxEffectSendLevel(float) and ServiceSendCliCommand(unsigned char*, int).
 extern "C" {
 
 status_t __real__ZN7android15OrvMediaService15attachAuxEffectEi(OrvMediaService* service, int id);
@@ -37,6 +37,16 @@ status_t __wrap__ZN7android15OrvMediaService21setAuxEffectSendLevelEf(OrvMediaSe
     const status_t status =
         __real__ZN7android15OrvMediaService21setAuxEffectSendLevelEf(service, level);
     return sStatus != android::NO_ERROR ? sStatus : status;
+}
+
+bool __real__ZN7android15OrvMediaService21ServiceSendCliCommandEPhi(OrvMediaService* service,
+                                                                    unsigned char* cmd, int len);
+
+bool __wrap__ZN7android15OrvMediaService21ServiceSendCliCommandEPhi(OrvMediaService* service,
+                                                                    unsigned char* cmd, int len) {
+    const bool good =
+        __real__ZN7android15OrvMediaService21ServiceSendCliCommandEPhi(service, cmd, len);
+    return good && sStatus == android::NO_ERROR;
 }
 
 }  // extern "C"

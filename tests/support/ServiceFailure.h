@@ -5,9 +5,10 @@
 
 namespace orvtest {
 
-// While one lives, the service's two effect operations fail with its status.
-// They cannot fail by themselves: the engine has no such operation. The test
-// program's linker leads their callers here. One at a time.
+// While one lives, the service's two effect operations fail with its status,
+// and its decoder command with false. They cannot fail by themselves: the
+// engine has no such operations. The test program's linker leads their callers
+// here. One at a time.
 class ServiceFailure {
 public:
     explicit ServiceFailure(android::status_t status);
