@@ -6,8 +6,6 @@
 namespace orvtest {
 namespace {
 
-using fakejni::Value;
-
 const ExpectedLine kMissingService = bridgeError("service not exist. Line:%d\n");
 const std::string kPosition = "com/quintora/mmp/util/DivxLastMemoryFilePosition";
 
@@ -206,7 +204,7 @@ TEST_F(DivxLastMemoryTest, EveryFieldIsReadInOrderInItsOwnWidth) {
     std::vector<std::string> ints;
     for (const PositionField& field : kPositionFields) {
         lookups.push_back(std::string(field.name) + " " + field.signature);
-        (field.signature[0] == 'J' ? longs : ints).push_back(field.name);
+        (field.signature[0] == 'J' ? longs : ints).emplace_back(field.name);
     }
     EXPECT_EQ(vm.callsOf("GetFieldID"), lookups);
     EXPECT_EQ(vm.callsOf("GetLongField"), longs);

@@ -210,9 +210,9 @@ TEST_F(JavaFieldReadersTest, ReadsAByte) {
     for (int value : {0, 1, 127, -1, -128}) {
         holder->set("mByte", Value::ofByte(static_cast<jbyte>(value)));
         // A char is signed or not as the platform has it, and so is its line.
-        const int shown = static_cast<char>(value);
+        const char shown = static_cast<char>(value);
         expectRead(byteReader, std::to_string(value),
-                   {readerInfo("getByteValueFromJava(): chRet=" + std::to_string(shown))});
+                   {readerInfo("getByteValueFromJava(): chRet=" + std::to_string(+shown))});
     }
 }
 

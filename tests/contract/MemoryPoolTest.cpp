@@ -169,9 +169,9 @@ TEST_F(MemoryPoolTest, FailedMappingIsReportedAndLeavesTheListAsItWas) {
 }
 
 TEST_F(MemoryPoolTest, ManyThreadsAllocateAndFree) {
-    std::vector<std::thread> threads;
-    for (int t = 0; t < 4; t++) {
-        threads.emplace_back([] {
+    std::vector<std::thread> threads(4);
+    for (std::thread& thread : threads) {
+        thread = std::thread([] {
             for (int i = 0; i < 200; i++) {
                 void* first = mem_alloc(i);
                 void* second = mem_alloc(i);

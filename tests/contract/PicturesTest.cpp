@@ -10,7 +10,6 @@ namespace orvtest {
 namespace {
 
 using fakejni::Value;
-using testing::IsEmpty;
 
 using Bytes = std::vector<uint8_t>;
 
@@ -49,7 +48,7 @@ protected:
             }
         }
         return observe([&] {
-            const auto result = fakejni::callNative<jbyteArray>(
+            auto result = fakejni::callNative<jbyteArray>(
                 vm, playerClass, vm.local(player), "native_getThumbnailInfo",
                 "(Lcom/quintora/mmp/util/ThumbnailInfo;)[B", vm.local(request));
             if (result.value.object != nullptr) bytes = result.value.object->bytes;
@@ -268,7 +267,7 @@ class EmbeddedPictureTest : public JniFixture {
 protected:
     Outcome get() {
         return observe([&] {
-            const auto result = fakejni::callNative<jbyteArray>(
+            auto result = fakejni::callNative<jbyteArray>(
                 vm, playerClass, vm.local(player), "native_getEmbeddedPicture", "(I)[B", jint{3});
             if (result.value.object != nullptr) bytes = result.value.object->bytes;
             return result;

@@ -144,7 +144,7 @@ class SubtitleMaskTest : public SubtitleAttrTest, public testing::WithParamInter
 TEST_P(SubtitleMaskTest, OnlyItsSixBitsCount) {
     setUpPlayer();
     std::vector<std::string> expected = GetParam().engine;
-    expected.push_back("flushSubtitleAttr()");
+    expected.emplace_back("flushSubtitleAttr()");
     EXPECT_EQ(set(GetParam().mask).engine, expected);
 }
 

@@ -129,7 +129,7 @@ public:
 };
 
 TarnPlayer::TarnPlayer(int decoder) : mEngine(new Engine(ScriptedEngine::make(this, decoder))) {}
-TarnPlayer::~TarnPlayer() {}
+TarnPlayer::~TarnPlayer() = default;
 
 void TarnPlayer::configPlayer(bool ssif) { mEngine->status("configPlayer", ssif); }
 
