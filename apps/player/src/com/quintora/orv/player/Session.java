@@ -8,6 +8,8 @@ import com.quintora.mmp.OrvMediaPlayer;
 import com.quintora.mmp.PlayerListener;
 import com.quintora.mmp.VideoTrack;
 import java.io.IOException;
+import java.nio.file.AccessDeniedException;
+import java.nio.file.NoSuchFileException;
 import java.nio.file.Path;
 import java.util.Locale;
 import java.util.concurrent.CountDownLatch;
@@ -157,9 +159,19 @@ public final class Session implements AutoCloseable {
             player.setPcmFormat(options.pcm);
         }
         if (options.stream) {
-            player.setDataSource(ChannelStreamSource.open(Path.of(options.source)));
+            player.setDataSource(openStream(options.source));
         } else {
             player.setDataSource(options.source);
+        }
+    }
+
+    private static ChannelStreamSource openStream(String file) throws IOException {
+        try {
+            return ChannelStreamSource.open(Path.of(file));
+        } catch (NoSuchFileException e) {
+            throw new IOException(file + ": no such file", e);
+        } catch (AccessDeniedException e) {
+            throw new IOException(file + ": may not be read", e);
         }
     }
 
