@@ -1,6 +1,8 @@
 // SPDX-License-Identifier: Apache-2.0
 #include "PosixCalls.h"
 
+#include <string.h>
+
 // The linker sends the program's calls to the wrappers and resolves the real
 // names here.
 extern "C" {
@@ -58,6 +60,12 @@ void* __wrap_mmap(void* address, size_t length, int protection, int flags, int f
     return orvtest::mmapCall(address, length, protection, flags, fd, offset);
 }
 void* __wrap_malloc(size_t size) { return orvtest::mallocCall(size); }
+// The compiler makes one calloc of a malloc and the zeroing behind it.
+void* __wrap_calloc(size_t count, size_t size) {
+    void* block = orvtest::mallocCall(count * size);
+    if (block != nullptr) memset(block, 0, count * size);
+    return block;
+}
 void __wrap_free(void* block) { orvtest::freeCall(block); }
 
 }  // extern "C"
