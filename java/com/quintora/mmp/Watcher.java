@@ -162,8 +162,6 @@ final class Watcher {
         int duration = player.native_getDuration();
         if (position < duration) {
             player.events().info(epoch, PlayerListener.INFO_BUFFERING_STARTED, 0);
-        } else if (player.stream().failure() != null) {
-            player.events().failed(epoch, new IOException("the source ended early"));
         } else {
             player.events().completed(epoch);
         }

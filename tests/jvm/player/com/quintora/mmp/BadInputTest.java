@@ -39,7 +39,11 @@ class BadInputTest extends PlayerFixture {
     @Test
     void aPathThatIsNull() {
         String none = null;
-        assertThrows(IllegalArgumentException.class, () -> player.setDataSource(none));
+        IllegalArgumentException e = assertThrows(
+                IllegalArgumentException.class, () -> player.setDataSource(none));
+        assertEquals("the path or URL is null", e.getMessage());
+        assertThrows(IllegalArgumentException.class,
+                () -> player.setDataSource(none, Map.of("a", "b")));
         assertThrows(IllegalArgumentException.class, () -> player.native_setDataSource(none));
         assertThrows(IllegalArgumentException.class,
                 () -> player.native_setDataSource(none, null, null));

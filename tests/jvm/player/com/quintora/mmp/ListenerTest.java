@@ -250,6 +250,16 @@ class ListenerTest extends PlayerFixture {
     }
 
     @Test
+    void theNativeHalfsThreadCallsNoListener() throws Exception {
+        try (OrvMediaPlayer other = new OrvMediaPlayer(Runnable::run)) {
+            other.addListener(recorder);
+            post(new WeakReference<>(other), 200, 960, 0, null);
+            recorder.await("info 960 0");
+            assertFalse(recorder.threads.contains(Thread.currentThread()));
+        }
+    }
+
+    @Test
     void anErrorOfTheNativeHalfIsToldOnce() throws Exception {
         prepare("silent.mkv");
         post(100, 1, -1004, null);

@@ -153,6 +153,35 @@ class StreamSourceTest extends PlayerFixture {
     }
 
     @Test
+    void aStreamThatIsNeverPreparedIsClosed() throws Exception {
+        ScriptedSource source = new ScriptedSource(new byte[100]);
+        player.setDataSource(source);
+        player.reset();
+        assertEquals(1, source.closes.get());
+        ScriptedSource another = new ScriptedSource(new byte[100]);
+        player.setDataSource(another);
+        player.release();
+        assertEquals(1, another.closes.get());
+    }
+
+    @Test
+    void aStreamThatTheEngineLeavesOpenIsClosed() throws Exception {
+        ScriptedSource source = new ScriptedSource(new byte[100]);
+        player.useStream(new StreamAdapter(source)); // The engine does not know of it.
+        player.reset();
+        assertEquals(1, source.closes.get());
+    }
+
+    @Test
+    void aStreamThatIsRefusedIsClosed() throws Exception {
+        prepare("silent.mkv");
+        ScriptedSource source = new ScriptedSource(new byte[100]);
+        assertThrows(IllegalStateException.class, () -> player.setDataSource(source));
+        assertEquals(1, source.closes.get());
+        assertEquals(0, source.reads.get());
+    }
+
+    @Test
     void anEmptyStreamIsNoMedia() throws Exception {
         player.setDataSource(new ScriptedSource(new byte[0]));
         assertThrows(MediaException.class, player::prepare);

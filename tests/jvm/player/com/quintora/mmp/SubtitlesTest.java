@@ -6,12 +6,15 @@ import static org.junit.jupiter.api.Assertions.assertThrows;
 import static org.junit.jupiter.api.Assertions.assertTrue;
 
 import com.quintora.SubtitleAttr;
+import java.nio.file.Files;
+import java.nio.file.Path;
 import java.util.OptionalInt;
 import java.util.function.IntPredicate;
 import java.util.function.Predicate;
 import org.junit.jupiter.api.AfterEach;
 import org.junit.jupiter.api.BeforeEach;
 import org.junit.jupiter.api.Test;
+import org.junit.jupiter.api.io.TempDir;
 
 /** Subtitles and their looks, seen in the picture: a still grey one of 640 x 360. */
 class SubtitlesTest extends PlayerFixture {
@@ -201,6 +204,17 @@ class SubtitlesTest extends PlayerFixture {
         player.subtitles().add(Media.path("words.sub"), Media.path("words.idx"));
         awaitText();
         assertEquals(3, player.tracks().subtitles().size());
+    }
+
+    @Test
+    void aPairOfFilesMayHaveDifferentNames(@TempDir Path folder) throws Exception {
+        Path pictures = folder.resolve("pictures");
+        Path index = folder.resolve("times");
+        Files.copy(Path.of(Media.path("words.sub")), pictures);
+        Files.copy(Path.of(Media.path("words.idx")), index);
+        player.subtitles().add(pictures.toString(), index.toString());
+        awaitText();
+        assertEquals("en", player.tracks().subtitles().get(2).language(), "as the index says");
     }
 
     @Test
