@@ -10,7 +10,7 @@ namespace android {
 
 TarnPlayer::Engine::Engine(int decoder, orvtarn::Notifier::Deliver deliver)
     : notifier(std::move(deliver)),
-      video([this] { events.onFrame(); }),
+      video([this] { events.onFrame(); }, [this] { return transport.frameTime(); }),
       events(mpv, state, video, notifier),
       loader(mpv, state, video, events, protocol),
       seeker(mpv, state, notifier),

@@ -194,7 +194,6 @@ void EventLoop::onProperty(const mpv_event_property& property) {
 void EventLoop::onTime(double seconds) {
     // A word from before a seek or step that is done would undo its position.
     if (mState.phase() != Phase::Started) seconds = mMpv.getDouble("time-pos").value_or(seconds);
-    mVideo.setPosition(static_cast<int64_t>(std::max(seconds, 0.0) * 1e6));
     mState.update([&](PlayerState::Values& v) { v.position = std::max(seconds, 0.0); });
 }
 

@@ -19,6 +19,12 @@ using std::chrono::seconds;
 constexpr seconds kSeekLimit{10};
 // Positions closer than this are the same frame's.
 constexpr double kSameFrame = 0.001;
+// An exact seek ends at the next frame at the latest, usually.
+constexpr double kLate = 0.1;
+
+constexpr char kExact[] = "absolute+exact";
+constexpr char kKeyFrame[] = "absolute+keyframes";
+constexpr char kForward[] = "relative+keyframes";
 
 bool isSeekMode(int mode) {
     return mode >= SeekMode::SEEK_PREVIOUS_SYNC && mode <= SeekMode::SEEK_CLOSEST;
@@ -28,39 +34,38 @@ bool isSeekMode(int mode) {
 
 status_t Seeker::seekTo(int msec, int mode) {
     if (!isSeekMode(mode)) return failed(android::BAD_VALUE, "seekTo", "no such seek mode");
-    uint64_t session = 0;
-    const status_t begun = begin("seekTo", session);
-    if (begun != android::NO_ERROR) return begun;
     const double duration = mState.read([](const PlayerState::Values& v) { return v.duration; });
     double target = std::max(msec, 0) / 1000.0;
     if (duration > 0) target = std::min(target, duration);
-    const status_t status = seekAs(mode, target);
-    mState.update([](PlayerState::Values& v) { v.seeking = false; });
-    if (status == android::NO_ERROR) mNotifier.post(android::MEDIA_SEEK_COMPLETE);
-    return status;
+    return told(inTurn("seekTo", [&](uint64_t session) { return seekAs(mode, target, session); }));
 }
 
 status_t Seeker::seekToTime(const char* operation, double target) {
-    uint64_t session = 0;
-    status_t status = begin(operation, session);
-    if (status != android::NO_ERROR) return status;
-    status = moveTo(target, "absolute+exact");
-    mState.update([](PlayerState::Values& v) { v.seeking = false; });
-    if (status == android::NO_ERROR) mNotifier.post(android::MEDIA_SEEK_COMPLETE);
-    return status;
+    return told(
+        inTurn(operation, [&](uint64_t session) { return moveTo(target, kExact, session); }));
 }
 
 status_t Seeker::refresh() {
     const bool seekable = mState.read([](const PlayerState::Values& v) { return v.seekable; });
     if (!seekable) return android::NO_ERROR;
-    return runAndAwait("refresh", [this] { return mMpv.seek(0, "relative+exact"); });
+    return inTurn("refresh",
+                  [this](uint64_t session) { return moveTo(position(), kExact, session); });
 }
 
 status_t Seeker::runAndAwait(const char* operation, const std::function<int()>& command) {
+    return inTurn(operation, [&](uint64_t session) { return await(operation, session, command); });
+}
+
+status_t Seeker::told(status_t status) {
+    if (status == android::NO_ERROR) mNotifier.post(android::MEDIA_SEEK_COMPLETE);
+    return status;
+}
+
+status_t Seeker::inTurn(const char* operation, const std::function<status_t(uint64_t)>& task) {
     uint64_t session = 0;
     status_t status = begin(operation, session);
     if (status != android::NO_ERROR) return status;
-    status = await(operation, session, command);
+    status = task(session);
     mState.update([](PlayerState::Values& v) { v.seeking = false; });
     return status;
 }
@@ -84,41 +89,45 @@ status_t Seeker::begin(const char* operation, uint64_t& session) {
                   seekable ? "ended by another operation" : "the media cannot seek");
 }
 
-status_t Seeker::seekAs(int mode, double target) {
+status_t Seeker::seekAs(int mode, double target, uint64_t session) {
     switch (mode) {
         case SeekMode::SEEK_NEXT_SYNC:
-            return seekToNextSync(target);
+            return seekToNextSync(target, session);
         case SeekMode::SEEK_CLOSEST_SYNC:
-            return seekToClosestSync(target);
+            return seekToClosestSync(target, session);
         case SeekMode::SEEK_CLOSEST:
-            return moveTo(target, "absolute+exact");
+            return moveTo(target, kExact, session);
         default:
-            return moveTo(target, "absolute+keyframes");
+            return moveTo(target, kKeyFrame, session);
     }
 }
 
 // The core has a seek to the key frame before a time, and one to the key frame
 // after a distance from here.
-status_t Seeker::seekToNextSync(double target) {
-    const status_t status = moveTo(target, "absolute+keyframes");
+status_t Seeker::seekToNextSync(double target, uint64_t session) {
+    const status_t status = moveTo(target, kKeyFrame, session);
     const double distance = target - position();
     if (status != android::NO_ERROR || distance < kSameFrame) return status;
-    return moveTo(distance, "relative+keyframes");
+    return moveTo(distance, kForward, session);
 }
 
-status_t Seeker::seekToClosestSync(double target) {
-    status_t status = moveTo(target, "absolute+keyframes");
+status_t Seeker::seekToClosestSync(double target, uint64_t session) {
+    status_t status = moveTo(target, kKeyFrame, session);
     const double previous = position();
     if (status != android::NO_ERROR || target - previous < kSameFrame) return status;
-    status = moveTo(target - previous, "relative+keyframes");
+    status = moveTo(target - previous, kForward, session);
     const double next = position();
     if (status != android::NO_ERROR || next - target <= target - previous) return status;
-    return moveTo(previous, "absolute+keyframes");
+    return moveTo(previous, kKeyFrame, session);
 }
 
-status_t Seeker::moveTo(double target, const char* flags) {
-    const uint64_t session = mState.read([](const PlayerState::Values& v) { return v.session; });
-    return await("seekTo", session, [&] { return mMpv.seek(target, flags); });
+// A seek that comes right behind one of the core's own, as when a track was
+// chosen, may lose its key frame and arrive at the next one: it is repeated.
+status_t Seeker::moveTo(double target, const char* flags, uint64_t session) {
+    const auto seek = [&] { return mMpv.seek(target, flags); };
+    const status_t status = await("seekTo", session, seek);
+    const bool late = flags != kForward && position() > target + kLate;
+    return status == android::NO_ERROR && late ? await("seekTo", session, seek) : status;
 }
 
 status_t Seeker::await(const char* operation, uint64_t session,

@@ -31,11 +31,15 @@ public:
     android::status_t runAndAwait(const char* operation, const std::function<int()>& command);
 
 private:
+    // Runs a task as the only one that seeks; it gets the session it began in.
+    android::status_t inTurn(const char* operation,
+                             const std::function<android::status_t(uint64_t)>& task);
     android::status_t begin(const char* operation, uint64_t& session);
-    android::status_t seekAs(int mode, double seconds);
-    android::status_t seekToNextSync(double seconds);
-    android::status_t seekToClosestSync(double seconds);
-    android::status_t moveTo(double seconds, const char* flags);
+    android::status_t told(android::status_t status);
+    android::status_t seekAs(int mode, double seconds, uint64_t session);
+    android::status_t seekToNextSync(double seconds, uint64_t session);
+    android::status_t seekToClosestSync(double seconds, uint64_t session);
+    android::status_t moveTo(double seconds, const char* flags, uint64_t session);
     android::status_t await(const char* operation, uint64_t session,
                             const std::function<int()>& command);
     double position() const;

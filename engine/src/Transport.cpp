@@ -120,6 +120,16 @@ status_t Transport::setLooping(bool looping) {
     return android::NO_ERROR;
 }
 
+// While playing, the core's own time may be that of the frame to come; paused,
+// the state may still be that of the frame before.
+int64_t Transport::frameTime() const {
+    const PlayerState::Values now = mState.read([](const PlayerState::Values& v) { return v; });
+    const double seconds = now.phase == Phase::Started
+                               ? now.position
+                               : mMpv.getDouble("time-pos").value_or(now.position);
+    return llround(std::max(seconds, 0.0) * 1e6);
+}
+
 int Transport::bufferPercent() const {
     return mState.read([](const PlayerState::Values& v) { return v.bufferPercent; });
 }

@@ -26,6 +26,8 @@ public:
     android::status_t getVideoHeight(int* height) const;
     android::status_t setLooping(bool looping);
     int bufferPercent() const;
+    // Of the frame on screen, microseconds.
+    int64_t frameTime() const;
 
     // Pauses as an effect of another operation.
     void becomePaused();

@@ -105,6 +105,7 @@ bool VideoOutput::render(bool newFrame) {
     {
         std::lock_guard<std::mutex> lock(mSurfaceMutex);
         const bool shown = mProducer != nullptr && mVisible;
+        mTimeIsDue = mTimeIsDue || newFrame;
         status = shown ? draw() : android::NO_INIT;
         if (status == android::NO_ERROR) {
             mDelivered++;
@@ -143,7 +144,10 @@ android::status_t VideoOutput::draw() {
         return status;
     }
     mDrawnSize = size;
-    return mProducer->queueBuffer(buffer.slot, mPositionUs);
+    // Asked for only now: until its frame is drawn, the core may wait for it.
+    if (mTimeIsDue) mTimeUs = mFrameTime();
+    mTimeIsDue = false;
+    return mProducer->queueBuffer(buffer.slot, mTimeUs);
 }
 
 android::status_t VideoOutput::drawInto(

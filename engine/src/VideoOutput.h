@@ -25,7 +25,10 @@ public:
     };
 
     // onFrame: after each picture that was drawn or had no surface to go to.
-    explicit VideoOutput(std::function<void()> onFrame) : mOnFrame(std::move(onFrame)) {}
+    // frameTime: the media time of the frame that was just drawn, microseconds.
+    // Both are called on the rendering thread.
+    VideoOutput(std::function<void()> onFrame, std::function<int64_t()> frameTime)
+        : mOnFrame(std::move(onFrame)), mFrameTime(std::move(frameTime)) {}
     ~VideoOutput() { destroy(); }
 
     bool create(mpv_handle* mpv);
@@ -38,8 +41,6 @@ public:
     // Whether frames go to the surface at all.
     void setVisible(bool visible);
     void setVideoSize(int width, int height) { mVideoSize = {width, height}; }
-    // The time that frames are marked with.
-    void setPosition(int64_t microseconds) { mPositionUs = microseconds; }
     // The media is closed: nothing is drawn again before the next frame.
     void forgetPicture() { mHasPicture = false; }
 
@@ -64,6 +65,7 @@ private:
     void skip();
 
     const std::function<void()> mOnFrame;
+    const std::function<int64_t()> mFrameTime;
     mpv_render_context* mContext = nullptr;
     std::thread mThread;
 
@@ -73,14 +75,15 @@ private:
     bool mRedraw = false;
     bool mQuit = false;
 
-    // Held while a frame is drawn. No thread that holds it calls the core.
+    // Held while a frame is drawn.
     std::mutex mSurfaceMutex;
     android::sp<android::IGraphicBufferProducer> mProducer;
     bool mVisible = true;
     Size mDrawnSize;
+    bool mTimeIsDue = false;  // the core's frame has no time yet
+    int64_t mTimeUs = 0;
 
     std::atomic<Size> mVideoSize{Size()};
-    std::atomic<int64_t> mPositionUs{0};
     std::atomic<bool> mHasPicture{false};
     std::atomic<uint64_t> mDelivered{0};
     std::atomic<uint64_t> mMissed{0};

@@ -61,7 +61,7 @@ protected:
 
     const std::string file = mediaPath("heard.pcm");
     MpvHandle mpv;
-    VideoOutput video{[] {}};
+    VideoOutput video{[] {}, [] { return int64_t{0}; }};
     Audio audio{mpv, video};
 };
 

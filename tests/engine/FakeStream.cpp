@@ -4,7 +4,6 @@
 #include <string.h>
 
 #include <algorithm>
-#include <chrono>
 
 #include "TestMedia.h"
 
@@ -29,6 +28,11 @@ bool FakeStream::waitUntilBlocked() {
     return mChanged.wait_for(lock, std::chrono::seconds(10), [this] { return mBlocked; });
 }
 
+std::chrono::steady_clock::time_point FakeStream::unblockedAt() const {
+    std::lock_guard<std::mutex> lock(mMutex);
+    return mUnblockedAt;
+}
+
 void FakeStream::cancelRead() {
     std::lock_guard<std::mutex> lock(mMutex);
     mCancels++;
@@ -42,6 +46,7 @@ bool FakeStream::awaitGo(std::unique_lock<std::mutex>& lock) {
     mChanged.notify_all();
     mChanged.wait(lock, [this] { return mCancelled || mPosition < mBlocksAt; });
     mBlocked = false;
+    mUnblockedAt = std::chrono::steady_clock::now();
     return !std::exchange(mCancelled, false);
 }
 

@@ -4,6 +4,7 @@
 #include <stream/IOrvStreamSource.h>
 
 #include <atomic>
+#include <chrono>
 #include <condition_variable>
 #include <mutex>
 #include <string>
@@ -30,6 +31,8 @@ public:
     void blockAt(int64_t position);
     void letGo();
     bool waitUntilBlocked();
+    // When the last read that blocked went on.
+    std::chrono::steady_clock::time_point unblockedAt() const;
 
     int read(char* buffer, int len, int& readLen) override;
     long long byteSeek(E_Orv_Stream_Seek_Type type, long long offset) override;
@@ -74,6 +77,7 @@ private:
     std::condition_variable mChanged;
     int64_t mBlocksAt = INT64_MAX;
     bool mBlocked = false;
+    std::chrono::steady_clock::time_point mUnblockedAt;
     bool mCancelled = false;
 };
 

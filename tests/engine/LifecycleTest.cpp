@@ -175,6 +175,7 @@ TEST_F(LifecycleTest, ReleaseEndsASeekUnderWay) {
 
 // Threads call everything at once, one of them resets, then all end.
 TEST_F(LifecycleTest, AnyThreadAtAnyTime) {
+    LogCapture quiet;
     std::atomic<bool> quit{false};
     std::vector<std::thread> threads;
     const auto loop = [&](const std::function<void(int)>& body) {
@@ -208,7 +209,6 @@ TEST_F(LifecycleTest, AnyThreadAtAnyTime) {
         int value = 0;
         player->getCurrentPosition(&value);
     });
-    LogCapture quiet;
     EXPECT_TRUE(remains([] { return true; }));
     EXPECT_TRUE(remains([] { return true; }));
     quit = true;

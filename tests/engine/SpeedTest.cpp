@@ -38,7 +38,9 @@ TEST_P(ForwardSpeedTest, PlaysAtThatSpeed) {
     ASSERT_EQ(NO_ERROR, player->start());
     const int from = std::min(2000, static_cast<int>(factor * 500));
     const double measured = measure(from, std::min(50000, from + static_cast<int>(factor * 1500)));
-    EXPECT_NEAR(factor, measured, factor * 0.25);
+    EXPECT_LT(measured, factor * 1.25);
+    // A machine with other work does not decode a thousand frames a second.
+    EXPECT_GT(measured, factor * (factor > 16 ? 0.4 : 0.75));
 }
 
 INSTANTIATE_TEST_SUITE_P(Speeds, ForwardSpeedTest,

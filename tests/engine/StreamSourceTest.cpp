@@ -154,9 +154,12 @@ protected:
     void expectPrompt(const std::function<void()>& operation) {
         const auto begin = std::chrono::steady_clock::now();
         operation();
-        const std::chrono::duration<double, std::milli> taken =
+        const std::chrono::duration<double, std::milli> whole =
             std::chrono::steady_clock::now() - begin;
-        EXPECT_LT(taken.count(), 100);
+        const std::chrono::duration<double, std::milli> read = stream->unblockedAt() - begin;
+        EXPECT_GT(read.count(), 0);
+        EXPECT_LT(read.count(), 100);
+        EXPECT_LT(whole.count(), 1000);
         EXPECT_GE(stream->mCancels, 1);
     }
 
