@@ -8,16 +8,16 @@ import java.io.IOException;
  * Media bytes that a program produces itself.
  *
  * <p>The player calls {@link #read}, {@link #seek} and {@link #seekTime} on the engine's threads,
- * never two of them at a time; they may block. {@link #cancel} comes from any thread, also while one
- * of the others blocks, and must not block. The descriptive methods are called once, on the thread
- * that sets the data source. {@link #close} is called once, when the player has no more use for the
- * source: at its reset or release.
+ * never two of them at a time; they may block. {@link #cancel} comes from any thread, also while
+ * one of those three blocks, and must not block. The descriptive methods are called on any thread,
+ * the first time while the data source is set. {@link #close} is called once, when the player has
+ * no more use for the source: at its reset or release, after a cancel if a read still blocks.
  *
  * <p>What a method throws ends the media with an error whose cause it is; see {@link
  * PlayerListener#onError}.
  *
- * <p>A player that was given a source must be released or closed by its owner: the native half keeps
- * hold of it, so it is never collected.
+ * <p>A player that was given a source must be released or closed by its owner: the native half
+ * keeps hold of it, so it is never collected.
  */
 public interface MediaStreamSource extends Closeable {
     /**

@@ -218,8 +218,8 @@ abstract sealed class Playback extends PlayerCore implements AutoCloseable permi
     }
 
     /**
-     * Stops; the player must be prepared again before it can play. State: PREPARED, STARTED, PAUSED,
-     * COMPLETED or STOPPED; then STOPPED.
+     * Stops; the player must be prepared again before it can play. State: PREPARED, STARTED,
+     * PAUSED, COMPLETED or STOPPED; then STOPPED.
      *
      * @throws IllegalStateException in another state, or when the engine refuses
      */

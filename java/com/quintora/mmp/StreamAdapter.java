@@ -129,7 +129,7 @@ final class StreamAdapter {
         }
     }
 
-    /** The first thing that the source threw, or null. What a cancelled read throws is no failure. */
+    /** The first thing that the source threw, or null, but for reads that were cancelled. */
     Throwable failure() {
         return failure;
     }

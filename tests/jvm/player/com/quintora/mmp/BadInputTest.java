@@ -111,7 +111,8 @@ class BadInputTest extends PlayerFixture {
     void aCodecThatIsUnknown() throws Exception {
         byte[] media = Files.readAllBytes(Path.of(Media.path("silent.mkv")));
         Path file = Files.write(
-                folder.resolve("unknown.mkv"), replace(media, "V_MPEG4/ISO/AVC", "V_QQQQQ/QQQ/QQQ"));
+                folder.resolve("unknown.mkv"),
+                replace(media, "V_MPEG4/ISO/AVC", "V_QQQQQ/QQQ/QQQ"));
         MediaException e = refusedByPrepare(file);
         assertEquals(MediaException.STATUS_UNSUPPORTED, e.status());
         assertEquals(file + ": has no track that can be played", e.getMessage());

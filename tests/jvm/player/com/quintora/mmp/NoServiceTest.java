@@ -66,6 +66,9 @@ class NoServiceTest {
             Map.entry("native_setDivxFilePosition", "-1"),
             Map.entry("native_setUnLockPin", "-1"));
 
+    // They do not need a service, or make one.
+    private static final List<String> NOT_CALLED = List.of("native_init", "native_setup");
+
     @TestFactory
     Stream<DynamicTest> beforeSetup() {
         return everyNative("before setup", NoServiceTest::withoutConstructor);
@@ -79,7 +82,7 @@ class NoServiceTest {
     private static Stream<DynamicTest> everyNative(String when, Supplier<OrvMediaPlayer> maker) {
         return Arrays.stream(OrvMediaPlayer.class.getDeclaredMethods())
                 .filter(method -> Modifier.isNative(method.getModifiers()))
-                .filter(method -> !List.of("native_init", "native_setup").contains(method.getName()))
+                .filter(method -> !NOT_CALLED.contains(method.getName()))
                 .map(method -> DynamicTest.dynamicTest(
                         method.getName() + method.getParameterCount() + " " + when,
                         () -> answersAsWithoutService(method, maker.get())));
