@@ -22,7 +22,7 @@ double Picture::brightness(int left, int top, int right, int bottom) const {
             sum += pixels[(size_t(y) * width + x) * 4 + 1];
         }
     }
-    return count == 0 ? 0 : double(sum) / count;
+    return count == 0 ? 0 : static_cast<double>(sum) / static_cast<double>(count);
 }
 
 int Picture::differences(const Picture& other) const {

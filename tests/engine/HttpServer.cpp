@@ -2,6 +2,7 @@
 #include "HttpServer.h"
 
 #include <arpa/inet.h>
+#include <gtest/gtest.h>
 #include <netinet/in.h>
 #include <poll.h>
 #include <stdlib.h>
@@ -46,8 +47,10 @@ HttpServer::HttpServer(const std::string& path) {
     address.sin_family = AF_INET;
     address.sin_addr.s_addr = htonl(INADDR_LOOPBACK);
     socklen_t length = sizeof(address);
-    bind(mListener, reinterpret_cast<sockaddr*>(&address), length);
-    listen(mListener, 16);
+    if (bind(mListener, reinterpret_cast<sockaddr*>(&address), length) != 0 ||
+        listen(mListener, 16) != 0) {
+        ADD_FAILURE() << "no port to serve on";
+    }
     getsockname(mListener, reinterpret_cast<sockaddr*>(&address), &length);
     mPort = ntohs(address.sin_port);
     mAcceptor = std::thread([this] { serve(); });

@@ -200,7 +200,7 @@ TEST_F(LifecycleTest, AnyThreadAtAnyTime) {
         MetaDataInfo info;
         player->getMetaDataInfo(info);
         player->onSubtitleTrack(i % 2);
-        player->setVolume(0.5f, (i % 10) / 10.0f);
+        player->setVolume(0.5f, static_cast<float>(i % 10) / 10);
     });
     loop([&](int i) {
         player->setVideoSurfaceTexture(i % 2 ? sink : nullptr);

@@ -88,6 +88,7 @@ TEST_F(SeekTest, FromTheEndGoesBackWithoutPlaying) {
 TEST_F(SeekTest, ManyAtOnceAllArrive) {
     open("long.mkv");
     std::vector<std::thread> threads;
+    threads.reserve(4);
     for (int i = 0; i < 4; i++) {
         threads.emplace_back([&, i] {
             for (int n = 0; n < 5; n++) {
