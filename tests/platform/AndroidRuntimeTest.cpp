@@ -29,7 +29,7 @@ public:
         };
         mEnvTable.DeleteLocalRef = [](JNIEnv* env, jobject reference) {
             EXPECT_EQ(reference, self(env)->theClass());
-            self(env)->mCalls.push_back("DeleteLocalRef");
+            self(env)->mCalls.emplace_back("DeleteLocalRef");
         };
         mEnvTable.GetJavaVM = [](JNIEnv* env, JavaVM** vm) -> jint {
             *vm = &self(env)->mVm;

@@ -33,7 +33,7 @@ std::vector<std::string> stringsOf(JNIEnv* env, jobjectArray array) {
     std::vector<std::string> strings;
     for (jsize i = 0; i < env->GetArrayLength(array); ++i) {
         jstring const element = static_cast<jstring>(env->GetObjectArrayElement(array, i));
-        strings.push_back(ScopedUtfChars(env, element).c_str());
+        strings.emplace_back(ScopedUtfChars(env, element).c_str());
         env->DeleteLocalRef(element);
     }
     return strings;
