@@ -5,18 +5,17 @@ import android.media.Image;
 import android.media.ImageReader;
 import java.util.function.Consumer;
 
-/**
- * Takes the frames that the player draws, on a thread of its own, and counts them. Frames that
- * the media has but that never came are seen as gaps between the frames' times.
- */
+/** Takes the frames that the player draws, on a thread of its own, and counts them. */
 final class FramePump implements AutoCloseable {
     private static final int WAIT_MS = 100;
 
     private final ImageReader reader = ImageReader.newInstance(0, 0);
     private final Thread thread = new Thread(this::run, "frames");
     private final Consumer<Image> screen;
-    private volatile long framePeriodNs;
-    private volatile boolean continuous;
+
+    // What the pump's thread is told, and what it tells.
+    private volatile double framesPerSecond;
+    private volatile boolean jumped;
     private volatile long shown;
     private volatile long dropped;
     private volatile long firstFrameAt;
@@ -36,14 +35,15 @@ final class FramePump implements AutoCloseable {
         thread.start();
     }
 
-    /** The media's frames per second at normal speed; 0 when unknown, and then none is missed. */
+    /** How many frames a second shall come; 0 when unknown, and then none is missed. */
     void expect(double framesPerSecond) {
-        framePeriodNs = framesPerSecond > 0 ? (long) (1e9 / framesPerSecond) : 0;
+        this.framesPerSecond = framesPerSecond;
+        jumped = true;
     }
 
-    /** The next frame may have any time: after a seek, or at another speed than normal. */
+    /** The next frame may have any time, as after a seek. */
     void expectJump() {
-        continuous = false;
+        jumped = true;
     }
 
     long shown() {
@@ -60,17 +60,9 @@ final class FramePump implements AutoCloseable {
     }
 
     private void run() {
-        long previous = 0;
         try {
             while (!closed) {
-                try (Image image = reader.awaitImage(WAIT_MS)) {
-                    if (image == null) {
-                        continue;
-                    }
-                    count(previous, image.getTimestamp());
-                    previous = image.getTimestamp();
-                    screen.accept(image);
-                }
+                takeFrames(new MissedFrames(framesPerSecond), dropped, framesPerSecond);
             }
         } catch (InterruptedException | IllegalStateException e) {
             // Both mean that the reader was closed while this thread waited.
@@ -78,16 +70,27 @@ final class FramePump implements AutoCloseable {
         }
     }
 
-    private void count(long previous, long now) {
-        if (firstFrameAt == 0) {
-            firstFrameAt = System.currentTimeMillis();
+    /** Goes on while that many frames a second are expected. */
+    private void takeFrames(MissedFrames missed, long droppedBefore, double rate)
+            throws InterruptedException {
+        while (!closed && rate == framesPerSecond) {
+            try (Image image = reader.awaitImage(WAIT_MS)) {
+                if (image == null) {
+                    continue;
+                }
+                if (firstFrameAt == 0) {
+                    firstFrameAt = System.currentTimeMillis();
+                }
+                if (jumped) {
+                    jumped = false;
+                    missed.jump();
+                }
+                missed.add(image.getTimestamp());
+                dropped = droppedBefore + missed.count();
+                shown = shown + 1;
+                screen.accept(image);
+            }
         }
-        shown = shown + 1;
-        long gap = now - previous;
-        if (continuous && framePeriodNs > 0 && gap > framePeriodNs * 3 / 2) {
-            dropped = dropped + Math.round((double) gap / framePeriodNs) - 1;
-        }
-        continuous = true;
     }
 
     @Override

@@ -25,6 +25,7 @@ public final class Session implements AutoCloseable {
     private final FramePump frames;
     private final CountDownLatch ended = new CountDownLatch(1);
     private final Stopwatch stopwatch = new Stopwatch();
+    private volatile double frameRate;
     private volatile Failure failure;
 
     /** The screen is called with each frame, on a thread of its own, and must not keep it. */
@@ -53,7 +54,8 @@ public final class Session implements AutoCloseable {
             if (options.start > 0) {
                 player.seekTo(options.start);
             }
-            frames.expect(player.tracks().currentVideo().map(VideoTrack::frameRate).orElse(0.0));
+            frameRate = player.tracks().currentVideo().map(VideoTrack::frameRate).orElse(0.0);
+            frames.expect(frameRate);
             applyOptions();
         } catch (IOException | SecurityException | IllegalStateException e) {
             throw new Failure(e.getMessage(), e);
@@ -76,11 +78,10 @@ public final class Session implements AutoCloseable {
 
     public void setSpeed(double speed) throws Failure {
         try {
-            frames.expectJump();
+            // At other speeds frames are left out on purpose.
+            frames.expect(0);
             player.trickPlay().setSpeed(speed);
-            if (speed != 1) {
-                frames.expect(0);
-            }
+            frames.expect(speed == 1 ? frameRate : 0);
         } catch (IllegalArgumentException e) {
             throw new Failure(e.getMessage(), e);
         }
