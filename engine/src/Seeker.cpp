@@ -74,14 +74,16 @@ status_t Seeker::inTurn(const char* operation, const std::function<status_t(uint
 status_t Seeker::begin(const char* operation, uint64_t& session) {
     const status_t open = mState.requireOpen(operation);
     if (open != android::NO_ERROR) return open;
-    mState.wait(kSeekLimit, [](const PlayerState::Values& v) { return !v.seeking || !v.isOpen(); });
     bool seekable = true;
-    const bool begun = mState.update([&](PlayerState::Values& v) {
+    bool begun = false;
+    // The turn is taken inside the wait: of two that wake up, one waits on.
+    mState.wait(kSeekLimit, [&](PlayerState::Values& v) {
         seekable = v.seekable;
         session = v.session;
-        if (v.seeking || !v.isOpen() || !seekable) return false;
+        if (!v.isOpen() || !seekable) return true;
+        begun = !v.seeking;
         v.seeking = true;
-        return true;
+        return begun;
     });
     if (begun) return android::NO_ERROR;
     if (!seekable) mNotifier.post(android::MEDIA_INFO, android::MEDIA_INFO_NOT_SEEKABLE);
