@@ -23,6 +23,7 @@ test_native() {
     build_targets on all
     [ -z "$with_lint" ] || [ -n "$filter" ] || lint_everything
     on_some_display ctest --test-dir "$ORV_BUILD" --output-on-failure --no-tests=error \
+        --parallel "$(nproc)" \
         ${filter:+--tests-regex "$filter"}
 }
 
