@@ -35,25 +35,32 @@ run_logged() {
 }
 
 # follow_to LOG COMMAND…: writes what it says to the log, and shows how far it is.
+# Straight into the file: apt makes its output non-blocking, and in a pipe the
+# scripts of packages then fail on a machine that is slow to read it.
 follow_to() {
-    local log=$1 status=0
+    local log=$1 status=0 watcher=
     shift
     mkdir -p -- "$(dirname -- "$log")"
-    "$@" 2>&1 </dev/null | show_progress "$log" || status=$?
+    : >"$log"
+    if [ -t 2 ]; then
+        show_progress < <(tail -n +1 -f --pid=$$ "$log") &
+        watcher=$!
+    fi
+    "$@" >>"$log" 2>&1 </dev/null || status=$?
+    [ -z "$watcher" ] || { kill "$watcher" && wait "$watcher"; } 2>/dev/null || true
     [ ! -t 2 ] || printf '\r\033[K' >&2
     return "$status"
 }
 
 # The percentages that apt-get (its status lines) and ninja ([ 12%]) tell.
 show_progress() {
-    local log=$1 line percent
+    local line percent
     while IFS= read -r line; do
-        printf '%s\n' "$line"
         case $line in
         dlstatus:* | pmstatus:*) IFS=: read -r _ _ percent _ <<<"$line" ;;
         '['*'%]'*) percent=${line#*[} && percent=${percent%%%*} ;;
         *) continue ;;
         esac
-        [ ! -t 2 ] || printf '\r     %3d%%' "${percent%%.*}" >&2
-    done >"$log"
+        printf '\r     %3d%%' "${percent%%.*}" >&2
+    done
 }
