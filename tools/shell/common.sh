@@ -43,7 +43,7 @@ follow_to() {
     mkdir -p -- "$(dirname -- "$log")"
     : >"$log"
     if [ -t 2 ]; then
-        show_progress < <(tail -n +1 -f --pid=$$ "$log") &
+        tail -n +1 -f --pid=$$ "$log" > >(show_progress) 2>/dev/null &
         watcher=$!
     fi
     "$@" >>"$log" 2>&1 </dev/null || status=$?
@@ -63,4 +63,5 @@ show_progress() {
         esac
         printf '\r     %3d%%' "${percent%%.*}" >&2
     done
+    printf '\r\033[K' >&2
 }
