@@ -35,8 +35,6 @@ run_logged() {
 }
 
 # follow_to LOG COMMAND…: writes what it says to the log, and shows how far it is.
-# Straight into the file: apt makes its output non-blocking, and in a pipe the
-# scripts of packages then fail on a machine that is slow to read it.
 follow_to() {
     local log=$1 status=0 watcher=
     shift

@@ -78,8 +78,10 @@ update_package_lists() {
         "not every package list could be read. Is the network up, and are the sources in /etc/apt right?"
 }
 
+# The status lines have a descriptor of their own, for apt closes it to the programs
+# that it starts: with the standard output's, the installers' scripts would fail.
 apt_get() {
     run_logged "$ORV_BUILD/log/apt.log" "${AS_ROOT[@]}" env DEBIAN_FRONTEND=noninteractive \
-        apt-get -y -q -o DPkg::Lock::Timeout=300 -o Dpkg::Use-Pty=0 -o Acquire::Retries=3 \
-        -o APT::Status-Fd=1 "$@"
+        sh -c 'exec apt-get "$@" 9>&1' apt-get -o APT::Status-Fd=9 -y -q \
+        -o DPkg::Lock::Timeout=300 -o Dpkg::Use-Pty=0 -o Acquire::Retries=3 "$@"
 }
