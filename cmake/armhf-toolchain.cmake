@@ -43,9 +43,12 @@ set(CMAKE_CROSSCOMPILING_EMULATOR
 # folders of the usual file systems in the emulator, so its temporary files go
 # to memory. It starts other programs without its helper program, which only the
 # emulator could run; and not by vfork, which the emulator carries out as a fork
-# that leaves the locks of other threads held: the child hangs.
+# that leaves the locks of other threads held: the child hangs. The emulator
+# places everything in the lowest gibibyte, of which Java would reserve nearly
+# all for its heap by itself.
 set(ORV_JAVA_RUNTIME
   ${CMAKE_CROSSCOMPILING_EMULATOR} ${ORV_SYSROOT}/usr/lib/jvm/java-17-openjdk-armhf/bin/java
+  -Xmx256m -XX:ReservedCodeCacheSize=48m -XX:TieredStopAtLevel=1
   -Djava.io.tmpdir=/dev/shm -Djdk.lang.Process.launchMechanism=FORK)
 # Emulated programs are slow to start: their tests are listed when ctest runs.
 set(CMAKE_GTEST_DISCOVER_TESTS_DISCOVERY_MODE PRE_TEST)
