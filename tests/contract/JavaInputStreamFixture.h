@@ -25,7 +25,7 @@ protected:
     Outcome make() {
         stream.reset();
         jobject thiz = vm.local(player);
-        return observeAction([=] { stream.reset(new JavaInputStream(vm.env(), thiz)); });
+        return observeAction([=] { stream = std::make_unique<JavaInputStream>(vm.env(), thiz); });
     }
 
     // On a thread of the engine's kind: native and not attached.

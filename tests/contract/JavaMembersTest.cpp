@@ -135,9 +135,9 @@ protected:
 
     void addNativeMethods() {
         using namespace android;
-#define ROW(name, signature, function)                                                    \
-    agreeable.needs.add(kPlayerClass, std::string(isStatic(&function) ? "static " : "") + \
-                                          "native " + name + " " + signature);
+#define ROW(name, signature, function)                                                      \
+    agreeable.needs.add(kPlayerClass, std::string(isStatic(&(function)) ? "static " : "") + \
+                                          "native " + (name) + " " + (signature));
         ORV_NATIVE_METHODS(ROW)
 #undef ROW
     }

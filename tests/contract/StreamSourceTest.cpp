@@ -6,8 +6,6 @@
 namespace orvtest {
 namespace {
 
-using testing::ElementsAre;
-
 constexpr char kFunction[] = "OrvMediaClient_setDataSourceByInputStream";
 
 class StreamSourceTest : public JavaInputStreamFixture {

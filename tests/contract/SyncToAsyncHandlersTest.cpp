@@ -10,9 +10,7 @@ namespace orvtest {
 namespace {
 
 using android::OrvMediaService;
-using testing::AllOf;
 using testing::ElementsAre;
-using testing::HasSubstr;
 using testing::IsEmpty;
 
 class SyncToAsyncHandlersTest : public DispatcherFixture {
