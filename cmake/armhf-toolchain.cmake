@@ -43,9 +43,9 @@ set(CMAKE_CROSSCOMPILING_EMULATOR
 # folders of the usual file systems in the emulator, so its temporary files go
 # to memory. It starts other programs without its helper program, which only the
 # emulator could run; and not by vfork, which the emulator carries out as a fork
-# that leaves the locks of other threads held: the child hangs. The emulator
-# places everything in the lowest gibibyte, of which Java would reserve nearly
-# all for its heap by itself.
+# that leaves the locks of other threads held: the child hangs. With Java's own
+# choice of heap and compilers, the emulated optimizing compiler now and then ran
+# out of memory with most of the address space free; smaller ones do not.
 set(ORV_JAVA_RUNTIME
   ${CMAKE_CROSSCOMPILING_EMULATOR} ${ORV_SYSROOT}/usr/lib/jvm/java-17-openjdk-armhf/bin/java
   -Xmx256m -XX:ReservedCodeCacheSize=48m -XX:TieredStopAtLevel=1
