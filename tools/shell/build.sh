@@ -35,6 +35,6 @@ is_configured() {
 ninja_quietly() {
     local log=$ORV_BUILD/log/ninja.log
     NINJA_STATUS='[%p] ' follow_to "$log" ninja -C "$ORV_BUILD" "$@" && return
-    sed -n '/^FAILED\|^CMake Error\|^ninja: error/,$p' "$log" | head -n 60 >&2
+    sed -n '/^FAILED\|^CMake Error\|^ninja: error/,$p' "$log" | awk 'NR <= 60' >&2
     die "the build failed; all it said is in $log"
 }

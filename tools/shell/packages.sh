@@ -27,7 +27,8 @@ need_packages() {
     shift
     [ -z "${ORV_NO_INSTALL:-}" ] || return 0
     command -v apt-get >/dev/null || die \
-        "this system has no apt-get. Install what tools/packages-$1.txt names in your system's way, then set ORV_NO_INSTALL=1."
+        "this system has no apt-get. Install what these name in your system's way," \
+        "then set ORV_NO_INSTALL=1: $(printf ' tools/packages-%s.txt' "$@")"
     missing=$(missing_packages "$@")
     [ -n "$missing" ] || return 0
     mapfile -t names < <(awk '{print $1}' <<<"$missing")
@@ -43,6 +44,7 @@ describe_packages() {
 install_packages() {
     local lists_are_fresh=
     become_root "$@"
+    finish_interrupted_installation
     if package_lists_are_old; then
         update_package_lists
         lists_are_fresh=yes
@@ -53,6 +55,14 @@ install_packages() {
         apt_get install --no-install-recommends "$@" && return
     die "Debian's packages could not be installed; the lines above say what apt-get met." \
         "Once that is mended, start ./orv again."
+}
+
+# apt-get refuses to go on from there; what dpkg cannot mend, apt-get will tell.
+finish_interrupted_installation() {
+    [ -n "$(find /var/lib/dpkg/updates -name '[0-9]*' -print -quit 2>/dev/null)" ] || return 0
+    say "finishing an installation that was interrupted"
+    run_logged "$ORV_BUILD/log/dpkg.log" "${AS_ROOT[@]}" env DEBIAN_FRONTEND=noninteractive \
+        dpkg --configure -a || true
 }
 
 # Sets AS_ROOT to what a command needs in front to run as root.

@@ -18,7 +18,8 @@ run_player() {
 # and the program's classes from an archive.
 set_java_command() {
     local jars=$ORV_BUILD/java share=/usr/share/java
-    CLASS_ARCHIVE=$jars/player.jsa
+    # An archive is one Java's; after an update of Java another is made.
+    CLASS_ARCHIVE=$jars/player-$(stat -Lc '%Z-%s' -- "$(command -v java)").jsa
     JAVA_COMMAND=(java -XX:TieredStopAtLevel=1 -XX:+UseSerialGC
         -Xshare:auto "-XX:SharedArchiveFile=$CLASS_ARCHIVE" -Xlog:disable -Xlog:all=error:stderr
         "-Djava.library.path=$ORV_BUILD/lib"
@@ -29,8 +30,9 @@ set_java_command() {
 
 # Made by a run that loads the classes; without an archive the player starts too.
 archive_classes() {
-    [ "$CLASS_ARCHIVE" -ot "$ORV_BUILD/java/orv_player.jar" ] ||
-        [ "$CLASS_ARCHIVE" -ot "$ORV_BUILD/java/mediaplayer_orv_java.jar" ] || return 0
+    [ -n "$(find "$ORV_BUILD/java" -name '*.jar' -newer "$CLASS_ARCHIVE" -print -quit 2>&1)" ] ||
+        return 0
+    rm -f -- "$ORV_BUILD"/java/player-*.jsa
     local draft=$CLASS_ARCHIVE.$$
     if "${JAVA_COMMAND[@]/#-XX:SharedArchiveFile=*/-XX:ArchiveClassesAtExit=$draft}" play --help \
         >/dev/null 2>&1; then
