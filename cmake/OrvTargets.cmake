@@ -1,3 +1,4 @@
+# SPDX-License-Identifier: Apache-2.0
 # What every native target of this project is compiled with, and the platform
 # libraries that Debian packages.
 

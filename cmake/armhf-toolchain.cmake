@@ -1,3 +1,4 @@
+# SPDX-License-Identifier: Apache-2.0
 # Builds for 32-bit ARM Linux (armhf) with Debian's cross compiler, against the
 # sysroot that tools/sysroot makes, and runs what is built in the emulator.
 
@@ -21,8 +22,8 @@ set(orv_runtime_dirs
   ${orv_library_dir}/blas
   ${orv_library_dir}/lapack)
 foreach(directory ${orv_library_dir} ${orv_runtime_dirs})
-  string(APPEND CMAKE_EXE_LINKER_FLAGS_INIT " -Wl,-rpath-link,${directory}")
-  string(APPEND CMAKE_SHARED_LINKER_FLAGS_INIT " -Wl,-rpath-link,${directory}")
+  string(APPEND CMAKE_EXE_LINKER_FLAGS_INIT " \"-Wl,-rpath-link,${directory}\"")
+  string(APPEND CMAKE_SHARED_LINKER_FLAGS_INIT " \"-Wl,-rpath-link,${directory}\"")
 endforeach()
 
 # The compiler would note at every vector that its calls changed in version 7.

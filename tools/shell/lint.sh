@@ -4,7 +4,7 @@
 
 lint_everything() {
     local failed=() check
-    for check in format scripts tidy; do
+    for check in licence format scripts tidy; do
         "lint_$check" || failed+=("$check")
     done
     [ ${#failed[@]} -eq 0 ] || die "lint failed: ${failed[*]}"
@@ -15,8 +15,15 @@ lint_everything() {
 find_sources() {
     local names=() name
     for name in "$@"; do names+=(-o -name "$name"); done
-    find "$ORV_ROOT" \( -name .git -o -name 'build*' -type d \) -prune -o \
+    find "$ORV_ROOT" -mindepth 1 \( -name .git -o -name 'build*' -type d \) -prune -o \
         -type f \( "${names[@]:1}" \) -print0
+}
+
+lint_licence() {
+    local lacking
+    lacking=$(find_sources '*.cpp' '*.h' '*.java' '*.sh' '*.py' '*.cmake' '*.map' '*.bp' CMakeLists.txt |
+        xargs -0 grep -L '^[#/*]* *SPDX-License-Identifier: Apache-2.0$' || true)
+    [ -z "$lacking" ] || { say "no licence identifier in: $lacking" && return 1; }
 }
 
 lint_format() {
@@ -24,18 +31,22 @@ lint_format() {
 }
 
 lint_scripts() {
-    { find_sources '*.sh' && grep -rlIZ --exclude-dir='build*' --exclude-dir=.git \
-        -m 1 -e '^#!/usr/bin/env bash' -e '^#!/bin/sh' -e '^#!/bin/bash' "$ORV_ROOT"; } |
-        sort -zu | xargs -0 shellcheck --external-sources
+    {
+        find_sources '*.sh'
+        cd "$ORV_ROOT" || return
+        grep -rlIZ --exclude-dir='build*' --exclude-dir=.git \
+            -m 1 -e '^#!/usr/bin/env bash' -e '^#!/bin/sh' -e '^#!/bin/bash' .
+    } | xargs -0 realpath -z | sort -zu | xargs -0 shellcheck --external-sources
 }
 
 # The compiler's precompiled headers are not clang's: its commands go without.
 lint_tidy() {
     local log=$ORV_BUILD/log/tidy.log database=$ORV_BUILD/tidy
     mkdir -p "$database"
-    sed -E 's/-Winvalid-pch -include [^ "]+//' "$ORV_BUILD/compile_commands.json" \
+    sed -E 's/-Winvalid-pch -include ([^ "\\]+|\\"[^"]*\\")//' "$ORV_BUILD/compile_commands.json" \
         >"$database/compile_commands.json"
-    run-clang-tidy -quiet -p "$database" '^((?!cmake_pch).)*$' >"$log" 2>/dev/null && return
+    run-clang-tidy -quiet -p "$database" '^((?!cmake_pch).)*$' >"$log" 2>&1 && return
     grep -E '(warning|error):' "$log" | sort -u
+    say "all that clang-tidy said is in $log"
     return 1
 }
