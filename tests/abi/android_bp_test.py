@@ -20,11 +20,24 @@ class AndroidBpTest(unittest.TestCase):
     def test_the_sources_are_those_of_cmake(self):
         self.assertEqual(strings_of("srcs"), environment.cmake_sources())
 
-    def test_the_flags_are_those_of_cmake(self):
-        text = (environment.PRODUCT_SOURCE / "CMakeLists.txt").read_text()
-        for flag in strings_of("cppflags") + ["-funsigned-char"]:
-            self.assertIn(flag, text + " -fvisibility=hidden -fvisibility-inlines-hidden")
-        self.assertIn("-funsigned-char", strings_of("cflags"))
+    def test_the_flags_are_those_of_the_desktop_build(self):
+        flags = set(strings_of("cflags") + strings_of("cppflags"))
+        self.assertEqual(flags, {
+            "-Wall", "-Wextra", "-Werror", "-fno-exceptions", "-fno-rtti", "-funsigned-char",
+            "-fvisibility=hidden", "-fvisibility-inlines-hidden"})
+        text = BLUEPRINT.read_text()
+        self.assertRegex(text, r'(?m)^    compile_multilib: "32",$')
+        self.assertRegex(text, r'(?m)^    cpp_std: "c\+\+17",$')
+
+    def test_the_page_names_every_module_and_header(self):
+        page = (environment.SOURCE / "docs/platform-tree.md").read_text()
+        table = dict(re.findall(r"^\| `(lib\w+)` \| (.*) \|$", page, re.MULTILINE))
+        self.assertEqual(sorted(table), sorted(strings_of("shared_libs") + strings_of("header_libs")))
+        include = re.compile(r"#include <((?!sys/|orvtarn/)\w+/[\w/]+\.h|jni\.h)>")
+        used = {header for file in environment.PRODUCT_SOURCE.rglob("*.[ch]*")
+                for header in include.findall(file.read_text())}
+        named = set(re.findall(r"`([\w/]+\.h)`", " ".join(table.values())))
+        self.assertEqual(used, named - {"orvtarn/TarnPlayer.h"})
 
     def test_the_export_list_is_there(self):
         script = re.search(r'version_script: "(.*)"', BLUEPRINT.read_text()).group(1)

@@ -7,8 +7,10 @@ import pathlib
 import subprocess
 import tempfile
 import unittest
+from unittest import mock
 
 import environment
+import engine
 
 WHOLE = os.environ["ORV_ENGINE_WHOLE"]
 LACKING = os.environ["ORV_ENGINE_LACKING"]
@@ -52,6 +54,20 @@ class DoctorEngineTest(unittest.TestCase):
         self.assertEqual(status, 1)
         self.assertEqual(lines[:-1], ["virtual slot 10 is not start() but stop()",
                                       "virtual slot 11 is not stop() but start()"])
+
+    # Its operations are exported, but the table does not lead to them.
+    def test_a_table_with_gaps_is_told(self):
+        needed = engine.read_needs(environment.SOURCE / "abi/engine.x86_64.txt")[0]
+        whole = [needed[number] for number in range(len(needed))]
+
+        def findings(slots):
+            library = mock.Mock(exported=lambda: set(whole), slots=lambda _: slots)
+            return list(engine.slot_findings(library, needed))
+
+        self.assertEqual(findings(whole), [])
+        self.assertEqual(len(findings(whole[:20])), len(whole) - 20)
+        self.assertEqual(findings(whole[:10] + [""] + whole[11:]),
+                         ["virtual slot 10 is not start()"])
 
     def test_another_library_lacks_everything(self):
         status, lines, _ = check(environment.PRODUCT)

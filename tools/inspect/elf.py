@@ -92,7 +92,9 @@ class Library:
         return collections.Counter(kind for _, kind, _, _ in self.relocations())
 
     def read_word(self, address):
-        offset = next(self.elf.address_offsets(address, self.word))
+        offset = next(self.elf.address_offsets(address, self.word), None)
+        if offset is None:
+            raise Refusal(f"{self.path}: the library is damaged or cut off")
         self.elf.stream.seek(offset)
         return int.from_bytes(self.elf.stream.read(self.word), "little")
 

@@ -60,8 +60,11 @@ def slot_findings(library, needed):
         if here and operation(names[here]) != operation(names[name]):
             yield (f"virtual slot {number} is not {operation(names[name])} but "
                    f"{operation(names[here])}")
-        elif not here and name not in exported and number not in HOOKS:
-            yield f"virtual slot {number}: {names[name]} is not exported"
+        elif not here and number not in HOOKS:
+            if name not in exported:
+                yield f"virtual slot {number}: {names[name]} is not exported"
+            elif found is not None:
+                yield f"virtual slot {number} is not {operation(names[name])}"
 
 
 def check(path, lists):

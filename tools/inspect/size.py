@@ -57,7 +57,7 @@ def addresses_in(library, code):
         if library.architecture == "armhf" and word < 0x10000:
             try:
                 yield library.read_word(table + word)
-            except StopIteration:
+            except elf.Refusal:
                 pass
 
 
