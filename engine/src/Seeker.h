@@ -25,7 +25,7 @@ public:
     // To the frame at that time, telling the listener.
     android::status_t seekToTime(const char* operation, double seconds);
     // Shows the current frame anew, with subtitles as they are chosen now.
-    // Media that cannot seek are left alone.
+    // Media that cannot seek or are at their end are left alone.
     android::status_t refresh();
     // Runs a command that makes the core seek, and waits for its arrival.
     android::status_t runAndAwait(const char* operation, const std::function<int()>& command);
