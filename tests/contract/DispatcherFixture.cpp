@@ -12,6 +12,11 @@ struct DispatcherMutex {
 };
 template struct PrivateMember<DispatcherMutex, &ORV::SyncToAsync::m_mutex>;
 
+struct DispatcherActions {
+    friend auto memberOf(DispatcherActions);
+};
+template struct PrivateMember<DispatcherActions, &ORV::SyncToAsync::m_actions>;
+
 DispatcherFixture::DispatcherFixture()
     : dispatcher(ORV::SyncToAsync::getInstance()),
       mNoSleep(nanosleepCall, [this](const timespec* duration, timespec*) {
@@ -28,6 +33,11 @@ void DispatcherFixture::SetUp() {
 }
 
 os::Mutex& DispatcherFixture::dispatcherMutex() { return dispatcher->*memberOf(DispatcherMutex{}); }
+
+size_t DispatcherFixture::pending() {
+    const Hold held = hold();
+    return (dispatcher->*memberOf(DispatcherActions{})).size();
+}
 
 void DispatcherFixture::addHandler(const Service& service, const std::string& name) {
     JNIEnv* env = vm.env();

@@ -38,6 +38,8 @@ protected:
     };
     Hold hold() { return Hold(dispatcherMutex()); }
     os::Mutex& dispatcherMutex();
+    // How many actions were added and not yet deleted.
+    size_t pending();
 
     // Waits until that line was logged so often and the worker is done with
     // the action that it was about.

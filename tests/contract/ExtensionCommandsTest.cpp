@@ -370,10 +370,26 @@ TEST_F(ExtensionCommandsTest, FailedBytePositionGoesThroughTheStatusMapping) {
     }
 }
 
-// An index command whose engine writes nothing returns its own zero.
-TEST_F(ExtensionCommandsTest, IndexStartsAtZero) {
-    setUpPlayer().answer("getCurrentAudioIndex", {1});
-    EXPECT_EQ(call<jint>("native_getCurrentAudioIndex", "()I").returned, "0");
+// A command whose engine writes nothing returns its own zero.
+TEST_F(ExtensionCommandsTest, ValuesStartAtZero) {
+    setUpPlayer();
+    for (const char* index : {"getCurrentAudioIndex", "getCurrentSubtitleIndex"}) {
+        engine->answer(index, {1});
+        EXPECT_EQ(call<jint>(std::string("native_") + index, "()I").returned, "0") << index;
+    }
+    EXPECT_EQ(call<jint>("native_getPlayMode", "()I").returned, "0");
+}
+
+TEST_F(ExtensionCommandsTest, ServiceOutlivesAReleaseDuringTheCall) {
+    setUpPlayer().answer("setSpeed", {7});
+    engine->whenCalled("setSpeed", [&] {
+        vm.onJavaThread([&] {
+            fakejni::callNative<void>(vm, playerClass, vm.local(player), "native_release", "()V");
+        });
+        EXPECT_EQ(ScriptedEngine::live(), 1);
+    });
+    EXPECT_EQ(call<jint>("native_setPlayMode", "(I)I", 2000).returned, "7");
+    EXPECT_EQ(ScriptedEngine::live(), 0);
 }
 
 TEST_F(ExtensionCommandsTest, DecoderCommandIsAcceptedAndItsCharactersStay) {

@@ -162,6 +162,38 @@ TEST_F(JavaInputStreamReadTest, ValidityIsCheckedFirst) {
     g__JavaVM = vm.javaVm();
 }
 
+TEST_F(JavaInputStreamReadTest, BufferIsCheckedBeforeTheMachine) {
+    make();
+    g__JavaVM = nullptr;
+    EXPECT_THAT(onEngine([&] { status = stream->read(nullptr, 10, readLen); }),
+                ReturnsNothing().logs({bridgeError("JavaInputStream::read(): buffer==NULL\n")}));
+    EXPECT_EQ(status, -1);
+    g__JavaVM = vm.javaVm();
+}
+
+// What Java returned is judged before the flag: such a read detaches.
+TEST_F(JavaInputStreamReadTest, InvalidatedDuringAReadOfNothingDetaches) {
+    int count = 0;
+    replace("readStream", "(I)I", [&](const fakejni::Invocation&) {
+        stream->setInvalid();
+        return Value::ofInt(count);
+    });
+    const auto readInvalidated = [&](int javaCount) {
+        count = javaCount;
+        make();
+        std::vector<LogLine> lines =
+            onEngine([&] { status = stream->read(buffer.data(), 10, readLen); }).log;
+        EXPECT_EQ(vm.attachedThreads(), 0);
+        return lines.empty() ? std::string() : lines.back().text;
+    };
+    EXPECT_EQ(readInvalidated(0),
+              "JavaInputStream::read(): just return ORV_STREAM_ERROR_CODE_EOF!\n");
+    EXPECT_EQ(status, -2);
+    EXPECT_EQ(readInvalidated(-5),
+              "JavaInputStream::read(): just return ORV_STREAM_ERROR_CODE_NOT_OK!\n");
+    EXPECT_EQ(status, -1);
+}
+
 // A stream that is invalidated while Java reads ends without detaching.
 TEST_F(JavaInputStreamReadTest, InvalidatedDuringTheReadStaysAttached) {
     replace("readStream", "(I)I", [&](const fakejni::Invocation&) {

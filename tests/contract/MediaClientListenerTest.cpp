@@ -5,9 +5,21 @@
 
 #include <algorithm>
 
+#include "PrivateMember.h"
 #include "ServiceFixture.h"
 
 namespace orvtest {
+
+struct ListenedActions {
+    friend auto memberOf(ListenedActions);
+};
+template struct PrivateMember<ListenedActions, &ORV::SyncToAsync::m_actions>;
+
+struct ListenedMutex {
+    friend auto memberOf(ListenedMutex);
+};
+template struct PrivateMember<ListenedMutex, &ORV::SyncToAsync::m_mutex>;
+
 namespace {
 
 using android::sp;
@@ -58,6 +70,30 @@ TEST_F(MediaClientListenerTest, EventsGoToTheDispatcherWhichFindsNoPoster) {
                 LinesAre({info("MediaClientListener::notify(): Enter\n").tagged(kTag),
                           info("MediaClientListener::notify(): Leave\n").tagged(kTag)}));
     EXPECT_THAT(linesOf(false), LinesAre(discarded));
+}
+
+// Seen while the worker is kept from it, which the listener does not wait for.
+TEST_F(MediaClientListenerTest, ActionCarriesTheEventAndNoService) {
+    ORV::SyncToAsync& dispatcher = *ORV::SyncToAsync::getInstance();
+    sp<MediaClientListener> listener = new MediaClientListener;
+    const android::Parcel parcel;
+    {
+        os::ScopedMutex hold(dispatcher.*memberOf(ListenedMutex{}));
+        listener->notify(3, -42, 7, &parcel);
+        const auto& pending = dispatcher.*memberOf(ListenedActions{});
+        ASSERT_EQ(pending.size(), 1u);
+        const ORV::SyncToAsyncAction& action = *pending.front();
+        EXPECT_EQ(action.kind, 0);
+        EXPECT_EQ(action.cancelled, 0);
+        EXPECT_TRUE(action.valid);
+        EXPECT_EQ(action.service.get(), nullptr);
+        ASSERT_NE(action.payload, nullptr);
+        EXPECT_EQ(action.payload->msg, 3);
+        EXPECT_EQ(action.payload->ext1, -42);
+        EXPECT_EQ(action.payload->ext2, 7);
+        EXPECT_EQ(action.payload->obj, &parcel);
+    }
+    EXPECT_TRUE(log.waitFor(discarded[1]));
 }
 
 TEST_F(MediaClientListenerTest, EveryEventOfAServiceIsDiscarded) {

@@ -150,6 +150,13 @@ TEST_F(MsgDispatcherTest, ParcelReachesJavaAsItsRawBytes) {
     EXPECT_EQ(vm.javaCalls()[0].args[4].object->bytes, expected);
     EXPECT_THAT(vm.callsOf("DeleteLocalRef"), ElementsAre("byte[12]"));
     EXPECT_THAT(vm.callsOf("ReleaseByteArrayElements"), ElementsAre("0"));
+    // The bytes are Java's before the event is posted.
+    std::vector<std::string> functions;
+    for (const fakejni::JniCall& call : vm.calls()) functions.push_back(call.function);
+    EXPECT_THAT(functions,
+                ElementsAre("GetEnv", "AttachCurrentThread", "NewByteArray", "GetByteArrayElements",
+                            "ReleaseByteArrayElements", "CallStaticVoidMethod", "DeleteLocalRef",
+                            "DetachCurrentThread"));
 }
 
 TEST_F(MsgDispatcherTest, AttachesAndDetachesItsThread) {

@@ -2,6 +2,7 @@
 // Events in the service: its lines, its listener, and the death of the server.
 #include <binder/Parcel.h>
 #include <jni/media-service/OrvMediaServiceListener.h>
+#include <unistd.h>
 
 #include <functional>
 #include <sstream>
@@ -119,6 +120,22 @@ TEST_F(ServiceEventsTest, ParcelIsHandedOnAsItCame) {
     EXPECT_THAT(events, ElementsAre("99 1 2 " + pointerText(&parcel), "done"));
 }
 
+// The service's metadata filters and updates are no matter of its events.
+TEST_F(ServiceEventsTest, EventsPassTheMetadataFiltersAndLeaveNoUpdate) {
+    attachPlayer();
+    listen();
+    Parcel filter;
+    for (int32_t word : {0, 3, 200, 802, 0}) filter.writeInt32(word);
+    filter.setDataPosition(0);
+    ASSERT_EQ(service->setMetadataFilter(filter), android::NO_ERROR);
+    service->notify(200, 802, 0, nullptr);
+    EXPECT_THAT(events, ElementsAre("200 802 0 null", "done"));
+    engine->takeCalls();
+    Parcel reply;
+    service->getMetadata(true, false, &reply);
+    EXPECT_THAT(engine->calls(), ElementsAre("getMetadata({})"));
+}
+
 TEST_F(ServiceEventsTest, ListenerLivesThroughItsOwnRemoval) {
     sp<RecordingListener> listener = listen();
     listener->whenNotified = [this] { service->setListener(nullptr); };
@@ -190,6 +207,21 @@ TEST_F(DiedTest, IsNotSentAfterAnyServiceLostItsListener) {
     log.clear();
     expectUnnoticed();
     EXPECT_THAT(events, IsEmpty());
+}
+
+// In a process of its own, where no service was ever wired.
+TEST(FirstDiedTest, IsNotSentBeforeAnyServiceWasWired) {
+    testing::FLAGS_gtest_death_test_style = "threadsafe";
+    const auto die = [] {
+        LogCapture log;
+        sp<OrvMediaService> service = new OrvMediaService;
+        log.clear();
+        service->died();
+        const auto unnoticed = LinesAre({info("OrvMediaService::died(): died"),
+                                         debug("OrvMediaService Issue Handle. Line:1192")});
+        _exit(testing::Value(log.take(), unnoticed) ? 0 : 1);
+    };
+    EXPECT_EXIT(die(), testing::ExitedWithCode(0), "");
 }
 
 }  // namespace

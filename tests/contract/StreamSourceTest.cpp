@@ -62,14 +62,12 @@ TEST_F(StreamSourceTest, MissingServiceThrowsNothingDespiteItsText) {
 TEST_F(StreamSourceTest, MissingMemoryThrows) {
     setUpPlayer();
     AllocationFailure failure = AllocationFailure::of<JavaInputStream>();
-    const Outcome outcome = set();
-    EXPECT_EQ(outcome.log[1].text,
-              "OrvMediaClient_setDataSourceByInputStream(): out of memory, new JavaInputStream "
-              "failed, throw exception\n");
-    EXPECT_EQ(outcome.log[1].priority, 6);
-    EXPECT_THAT(outcome.thrown, testing::Optional(fakejni::Thrown{kRuntime, "Out of memory"}));
-    EXPECT_TRUE(outcome.engine.empty());
-    EXPECT_EQ(outcome.globals, 0);
+    EXPECT_THAT(set(), ReturnsNothing()
+                           .logs({enter(kFunction),
+                                  bridgeError(std::string(kFunction) +
+                                              "(): out of memory, new JavaInputStream failed, "
+                                              "throw exception\n")})
+                           .throws(kRuntime, "Out of memory"));
 }
 
 }  // namespace

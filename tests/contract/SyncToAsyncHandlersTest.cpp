@@ -1,12 +1,21 @@
 // SPDX-License-Identifier: Apache-2.0
 // The dispatcher's handlers, its refusals, and its life.
+#include <errno.h>
 #include <jni/PlayerContext.h>
 #include <stdlib.h>
 #include <unistd.h>
 
 #include "DispatcherFixture.h"
+#include "MutexProbe.h"
+#include "PrivateMember.h"
 
 namespace orvtest {
+
+struct GlobalMutex {
+    friend auto memberOf(GlobalMutex);
+};
+template struct PrivateMember<GlobalMutex, &ORV::SyncToAsync::s_mutexGlobal>;
+
 namespace {
 
 using android::OrvMediaService;
@@ -162,6 +171,38 @@ TEST_F(SyncToAsyncLifeTest, StartsOnFirstUseAndEndsWithTheProcess) {
                                       "[^\n]*SyncToAsync::SyncToAsync\\(\\): Leave\n"
                                       "[^\n]*SyncToAsync::~SyncToAsync\\(\\): Enter\n"
                                       "[^\n]*SyncToAsync::~SyncToAsync\\(\\): Leave\n"));
+}
+
+// The worker is started by the constructor.
+TEST_F(SyncToAsyncLifeTest, IsMadeUnderTheGlobalMutex) {
+    const auto use = [] {
+        int tried = -1;
+        const auto look = pthreadCreateCall.replace([&](auto... arguments) {
+            tried = tryFromAnotherThread(*memberOf(GlobalMutex{}));
+            return pthreadCreateCall.real(arguments...);
+        });
+        ORV::SyncToAsync::getInstance();
+        _exit(tried == EBUSY ? 0 : 1);
+    };
+    EXPECT_EXIT(use(), testing::ExitedWithCode(0), "");
+}
+
+// The worker is through with all that was added before the last line comes.
+TEST_F(SyncToAsyncLifeTest, EndWaitsForTheWorker) {
+    const auto use = [] {
+        for (int i = 0; i < 200; i++) {
+            ORV::SyncToAsync::getInstance()->addAction(new ORV::SyncToAsyncAction);
+        }
+        exit(0);
+    };
+    const auto isWhole = [](const std::string& text) {
+        const std::string line = "action is not valid";
+        const size_t end = text.find("~SyncToAsync(): Leave");
+        size_t count = 0;
+        for (size_t at = text.find(line); at < end; at = text.find(line, at + 1)) count++;
+        return end != std::string::npos && count == 200;
+    };
+    EXPECT_EXIT(use(), testing::ExitedWithCode(0), testing::Truly(isWhole));
 }
 
 }  // namespace

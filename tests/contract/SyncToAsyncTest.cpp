@@ -35,6 +35,7 @@ protected:
     }
     void TearDown() override {
         dispatcher->delMsgHandler(service);
+        EXPECT_EQ(pending(), 0u) << "a deleted action is still listed";
         EXPECT_EQ(service->getStrongCount(), 1) << "an action or a handler was not deleted";
         DispatcherFixture::TearDown();
     }
@@ -197,6 +198,25 @@ TEST_F(SyncToAsyncTest, AbortAllMakesThemInvalidAndTheyGoWithoutPause) {
                   dispatcherInfo("SyncToAsync::abortAllActions(): Leave"), kNotValid, kNotValid}));
 }
 
+// It sets both marks, whatever they were before.
+TEST_F(SyncToAsyncTest, AbortAllMarksEachPendingAction) {
+    {
+        const Hold held = hold();
+        auto* marked = action(service, 1);
+        marked->valid = false;
+        dispatcher->addAction(marked);
+        for (const bool keepValid : {false, true}) {
+            marked->cancelled = 0;
+            dispatcher->abortAllActions(service, keepValid);
+            EXPECT_EQ(marked->cancelled, 1);
+            EXPECT_EQ(marked->valid, keepValid);
+        }
+        log.clear();
+    }
+    waitForPauses(1);
+    EXPECT_THAT(dispatcherLines(), LinesAre({kCancelled}));
+}
+
 TEST_F(SyncToAsyncTest, AbortAllLeavesOtherServicesAndLaterActionsAlone) {
     Service other = new OrvMediaService;
     addHandler(other, "two");
@@ -229,6 +249,7 @@ TEST_F(SyncToAsyncTest, AbortOfADeliveredActionChangesNothing) {
     auto* delivered = action(service, 1);
     dispatcher->addAction(delivered);
     waitForPauses(1);
+    ASSERT_EQ(pending(), 0u);  // else the next line writes to what was deleted
     dispatcher->abortAction(delivered);
     EXPECT_THAT(posted(), ElementsAre("\"one\" 1"));
     EXPECT_THAT(dispatcherLines(), IsEmpty());

@@ -13,8 +13,9 @@ using Lock = std::lock_guard<std::recursive_mutex>;
 
 Vm& vmOf(JavaVM* vm) { return *static_cast<FakeJavaVm*>(vm)->vm; }
 
-jint attachCurrentThread(JavaVM* vm, JNIEnv** env, void*) {
+jint attachCurrentThread(JavaVM* vm, JNIEnv** env, void* arguments) {
     Lock lock(vmOf(vm).mutex());
+    if (arguments != nullptr) vmOf(vm).violation("AttachCurrentThread: with arguments");
     vmOf(vm).record("AttachCurrentThread", "");
     if (vmOf(vm).mustFail("AttachCurrentThread")) return JNI_ERR;
     return vmOf(vm).attach(env, false);
@@ -39,6 +40,11 @@ jint getEnv(JavaVM* vm, void** env, jint version) {
     return *env == nullptr ? JNI_EDETACHED : JNI_OK;
 }
 
+jint attachAsDaemon(JavaVM* vm, JNIEnv**, void*) {
+    vmOf(vm).violation("AttachCurrentThreadAsDaemon: called by native code");
+    return JNI_ERR;
+}
+
 jint destroyJavaVm(JavaVM* vm) {
     vmOf(vm).violation("DestroyJavaVM: called by native code");
     return JNI_ERR;
@@ -48,14 +54,8 @@ jint destroyJavaVm(JavaVM* vm) {
 
 const JNIInvokeInterface* vmTable() {
     static const JNIInvokeInterface table = {
-        nullptr,
-        nullptr,
-        nullptr,
-        destroyJavaVm,
-        attachCurrentThread,
-        detachCurrentThread,
-        getEnv,
-        attachCurrentThread,
+        nullptr, nullptr,        nullptr, destroyJavaVm, attachCurrentThread, detachCurrentThread,
+        getEnv,  attachAsDaemon,
     };
     return &table;
 }

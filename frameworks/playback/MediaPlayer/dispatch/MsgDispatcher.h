@@ -12,8 +12,8 @@ class Parcel;
 
 namespace ORV {
 
-// Posts events to one Java player's class. Made and destroyed on Java threads;
-// notify attaches the calling thread for the call and blocks until Java is
+// Posts events to one Java player's class. Made on a Java thread, destroyed on
+// any; notify attaches the calling thread for the call and blocks until Java is
 // done with the event.
 class ORV_EXPORT MsgDispatcher : public virtual android::RefBase {
 public:

@@ -14,8 +14,8 @@ namespace android {
 
 namespace {
 
-// The rule of this file: another text than elsewhere, and line numbers that are
-// fixed numbers of the log's readers.
+// Most throwing commands here log another text than serviceOrThrow does. All
+// line numbers of this file are fixed: the log's readers know them.
 sp<OrvMediaService> serviceOrThrowAt(JNIEnv* env, jobject thiz, int line) {
     sp<OrvMediaService> service = getMediaService(env, thiz);
     if (service == nullptr) {
@@ -201,12 +201,8 @@ jint OrvMediaClient_QTVDEC_SendCliCommand(JNIEnv* env, jobject thiz, jstring com
 
 jint OrvMediaClient_getCurrentAudioIndex(JNIEnv* env, jobject thiz) {
     logEnter(__func__);
-    sp<OrvMediaService> service = getMediaService(env, thiz);
-    if (service == nullptr) {
-        logMissingService(1408);
-        jniThrowException(env, "java/lang/IllegalStateException", nullptr);
-        return 0;
-    }
+    sp<OrvMediaService> service = serviceOrThrow(env, thiz, 1408);
+    if (service == nullptr) return 0;
     int index = 0;
     const bool known = service->getCurrentAudioIndex(&index) != 0;  // 0 is the failure here
     if (!known) ALOGE("OrvMediaClient_getCurrentAudioIndex(): getCurrentAudioIndex failed");
@@ -216,12 +212,8 @@ jint OrvMediaClient_getCurrentAudioIndex(JNIEnv* env, jobject thiz) {
 
 jint OrvMediaClient_getCurrentSubtitleIndex(JNIEnv* env, jobject thiz) {
     logEnter(__func__);
-    sp<OrvMediaService> service = getMediaService(env, thiz);
-    if (service == nullptr) {
-        logMissingService(1435);
-        jniThrowException(env, "java/lang/IllegalStateException", nullptr);
-        return 0;
-    }
+    sp<OrvMediaService> service = serviceOrThrow(env, thiz, 1435);
+    if (service == nullptr) return 0;
     int index = 0;
     const bool known = service->getCurrentSubtitleIndex(&index) != 0;  // 0 is the failure here
     if (!known) ALOGE("OrvMediaClient_getCurrentSubtitleIndex(): getCurrentAudioIndex failed");

@@ -1,0 +1,119 @@
+// SPDX-License-Identifier: Apache-2.0
+// The stream's two mutexes: which operation holds which while Java is asked.
+#include <errno.h>
+
+#include "FakeJni/EnvSupport.h"
+#include "JavaInputStreamFixture.h"
+#include "MutexProbe.h"
+#include "PrivateMember.h"
+
+namespace orvtest {
+
+struct CallMutex {
+    friend auto memberOf(CallMutex);
+};
+template struct PrivateMember<CallMutex, &JavaInputStream::mCallMutex>;
+
+struct StreamMutex {
+    friend auto memberOf(StreamMutex);
+};
+template struct PrivateMember<StreamMutex, &JavaInputStream::mStreamMutex>;
+
+namespace {
+
+using fakejni::Value;
+using testing::Each;
+using testing::SizeIs;
+
+// What another thread gets of the call mutex and of the stream mutex.
+using Tried = std::pair<int, int>;
+
+std::function<void()> gLook;
+const JNINativeInterface* gOriginal;
+
+class JavaInputStreamLocksTest : public JavaInputStreamFixture {
+protected:
+    void SetUp() override {
+        JavaInputStreamFixture::SetUp();
+        make();
+        gLook = [this] {
+            tried.emplace_back(tryFromAnotherThread(callMutex()),
+                               tryFromAnotherThread(streamMutex()));
+        };
+    }
+    void TearDown() override {
+        gLook = nullptr;
+        JavaInputStreamFixture::TearDown();
+    }
+
+    os::Mutex& callMutex() { return (*stream).*memberOf(CallMutex{}); }
+    os::Mutex& streamMutex() { return (*stream).*memberOf(StreamMutex{}); }
+
+    // On an engine's thread, with a look whenever a long field is read.
+    void lookAtFields(const std::function<void()>& body) {
+        vm.onNativeThread([&] {
+            JNIEnv* env = &vm.thisThread().env;
+            gOriginal = env->functions;
+            JNINativeInterface table = *gOriginal;
+            table.GetLongField = [](JNIEnv* e, jobject object, jfieldID field) {
+                gLook();
+                return gOriginal->GetLongField(e, object, field);
+            };
+            env->functions = &table;
+            body();
+            env->functions = gOriginal;
+        });
+    }
+    void lookIn(const std::string& name, const std::string& signature, Value result) {
+        replace(name, signature, [=](const fakejni::Invocation&) {
+            gLook();
+            return result;
+        });
+    }
+
+    std::vector<Tried> tried;
+};
+
+TEST_F(JavaInputStreamLocksTest, SizePositionAndDurationAreSerialised) {
+    lookAtFields([&] {
+        stream->getFileLength();
+        stream->getCurrentPosition();
+        stream->getDuration();
+    });
+    EXPECT_THAT(tried, SizeIs(3));
+    EXPECT_THAT(tried, Each(Tried(EBUSY, 0)));
+    EXPECT_EQ(tryFromAnotherThread(callMutex()), 0);
+}
+
+TEST_F(JavaInputStreamLocksTest, ReadsAndSeeksHoldNoMutex) {
+    lookIn("readStream", "(I)I", Value::ofInt(0));
+    lookIn("seekStream", "(IJ)J", Value::ofLong(0));
+    lookIn("timeSeekStream", "(JJ)J", Value::ofLong(0));
+    lookIn("cancelRead", "()V", Value());
+    lookIn("closeStream", "()V", Value());
+    vm.onNativeThread([&] {
+        char byte;
+        int count;
+        stream->read(&byte, 1, count);
+        stream->byteSeek(E_ORV_STREAM_SEEK_SET, 0);
+        stream->timeSeek(0, 0);
+        stream->cancelRead();
+        stream->closeStream();
+    });
+    EXPECT_THAT(tried, SizeIs(5));
+    EXPECT_THAT(tried, Each(Tried(0, 0)));
+}
+
+TEST_F(JavaInputStreamLocksTest, LockAndUnlockAreTheEnginesOwn) {
+    stream->lock();
+    stream->lock();
+    EXPECT_EQ(tryFromAnotherThread(streamMutex()), EBUSY);
+    EXPECT_EQ(tryFromAnotherThread(callMutex()), 0);
+    stream->unlock();
+    EXPECT_EQ(tryFromAnotherThread(streamMutex()), EBUSY);
+    stream->unlock();
+    EXPECT_EQ(tryFromAnotherThread(streamMutex()), 0);
+}
+
+}  // namespace
+}  // namespace orvtest
