@@ -1,5 +1,8 @@
 // SPDX-License-Identifier: Apache-2.0
 // DivX navigation between Java and the service, which answers it by itself.
+#include <string.h>
+
+#include "DivxService.h"
 #include "JniFixture.h"
 #include "jni/PlayerContext.h"
 
@@ -209,6 +212,28 @@ TEST_F(DivxLastMemoryTest, EveryFieldIsReadInOrderInItsOwnWidth) {
     EXPECT_EQ(vm.callsOf("GetFieldID"), lookups);
     EXPECT_EQ(vm.callsOf("GetLongField"), longs);
     EXPECT_EQ(vm.callsOf("GetIntField"), ints);
+}
+
+TEST_F(DivxLastMemoryTest, EveryWordIsTheLow32BitsOfItsField) {
+    setUpPlayer();
+    DivxService answering;
+    uint32_t expected[17];
+    for (uint32_t i = 0; i < 17; ++i) {
+        const PositionField& field = kPositionFields[i];
+        expected[i] = 0xA0000001 + i;  // negative as an int
+        position->set(field.name, field.signature[0] == 'J'
+                                      ? fakejni::Value::ofLong(0x700000000 + expected[i])
+                                      : fakejni::Value::ofInt(static_cast<jint>(expected[i])));
+    }
+    EXPECT_THAT(set(), Returns("1").logs({enter(name), leave(name)}));
+    uint32_t words[17];
+    static_assert(sizeof(words) == sizeof(answering.receivedPosition));
+    memcpy(words, &answering.receivedPosition, sizeof(words));
+    EXPECT_THAT(words, testing::ElementsAreArray(expected));
+
+    position->set("ui8_stc", fakejni::Value::ofLong(0x100000005));
+    set();
+    EXPECT_EQ(answering.receivedPosition.ui8_stc, 5u);
 }
 
 TEST_F(DivxLastMemoryTest, FailsWithAPlayer) {

@@ -71,6 +71,7 @@ TEST_F(MemoryPoolTest, BlockBeginsWithItsMapping) {
     int protection = 0;
     int flags = 0;
     auto record = mmapCall.replace([&](void* a, size_t l, int p, int f, int fd, off_t o) {
+        EXPECT_EQ(semaphoreValue(), 0);
         EXPECT_EQ(a, nullptr);
         EXPECT_EQ(fd, -1);
         EXPECT_EQ(o, 0);
@@ -124,6 +125,22 @@ TEST_F(MemoryPoolTest, FreeGivesTheMappingBack) {
     mem_free(memory);
     EXPECT_EQ(msync(reinterpret_cast<void*>(page), 1, MS_ASYNC), -1);
     EXPECT_EQ(errno, ENOMEM);
+}
+
+TEST_F(MemoryPoolTest, FreeGivesTheWholeMappingBackUnderTheSemaphore) {
+    void* memory = mem_alloc(10000);
+    MemoryBlock* const block = blockOf(memory);
+    size_t length = 0;
+    auto record = munmapCall.replace([&](void* address, size_t l) {
+        if (address == block) {
+            length = l;
+            EXPECT_EQ(semaphoreValue(), 0);
+            EXPECT_TRUE(liveBlocks().empty());
+        }
+        return munmapCall.real(address, l);
+    });
+    mem_free(memory);
+    EXPECT_EQ(length, 10000 + MEMORY_HEADER_SIZE);
 }
 
 TEST_F(MemoryPoolTest, SizeZeroIsAMappingOfTheHeaderAlone) {
@@ -202,6 +219,24 @@ TEST(MemoryPoolSemaphoreTest, AllocationWaitsForTheSemaphore) {
     mem_free(memory.get());
     EXPECT_EQ(semaphoreValue(), 1);
     mem_uninit();
+}
+
+TEST(MemoryPoolSemaphoreTest, UninitialisationDestroysTheSemaphoreAndKeepsTheBlocks) {
+    ASSERT_EQ(mem_init(), 0);
+    void* kept = mem_alloc(1);
+    sem_t* destroyed = nullptr;
+    {
+        auto failure = semDestroyCall.replace([&](sem_t* s) {
+            destroyed = s;
+            return -1;
+        });
+        EXPECT_EQ(mem_uninit(), -1);
+    }
+    EXPECT_EQ(destroyed, &sem);
+    EXPECT_EQ(liveBlocks(), std::vector<MemoryBlock*>{blockOf(kept)});
+    EXPECT_EQ(blockOf(kept)->size, 1);
+    mem_free(kept);
+    EXPECT_EQ(mem_uninit(), 0);
 }
 
 TEST(MemoryPoolSemaphoreTest, FailedInitialisationIsPrintedAndGivesTheLinesLength) {

@@ -71,6 +71,10 @@ TEST_F(MetaDataInfoTest, EveryTextIsClearedInFullBeforeTheCall) {
     EXPECT_TRUE(isClear(info.mContainer));
     EXPECT_TRUE(isClear(info.mComment));
     EXPECT_EQ(info.mDuration, 0);
+    EXPECT_EQ(info.mBitRate, 0);
+    EXPECT_EQ(info.mYear, 0);
+    EXPECT_EQ(info.mDiscNumber, 0);
+    EXPECT_EQ(info.mTrackNumber, 0);
     EXPECT_EQ(info.mTrackTotal, 0);
     EXPECT_EQ(info.mChapterCount, 0);
 }

@@ -68,6 +68,29 @@ TEST(OsSemaphoreTest, IsNotSharedBetweenProcesses) {
     EXPECT_EQ(value, 7u);
 }
 
+TEST(OsSemaphoreTest, ResultsAreTheSystems) {
+    os::Semaphore semaphore(1);
+    {
+        auto failure = semWaitCall.replace([](sem_t*) { return -1; });
+        EXPECT_EQ(semaphore.acquire(), -1);
+    }
+    auto failure = semPostCall.replace([](sem_t*) { return -1; });
+    EXPECT_EQ(semaphore.release(), -1);
+}
+
+TEST(OsSemaphoreTest, IsDestroyedWithItsObject) {
+    int destroyed = 0;
+    auto record = semDestroyCall.replace([&](sem_t* sem) {
+        destroyed++;
+        return semDestroyCall.real(sem);
+    });
+    {
+        os::Semaphore semaphore(1);
+        EXPECT_EQ(destroyed, 0);
+    }
+    EXPECT_EQ(destroyed, 1);
+}
+
 class TimedAcquireTest : public testing::TestWithParam<int> {};
 
 // The fraction of the current second is not in the deadline: 1500 ms asked for

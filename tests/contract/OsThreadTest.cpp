@@ -12,8 +12,15 @@
 #include <vector>
 
 #include "PosixCalls.h"
+#include "PrivateMember.h"
 
 namespace orvtest {
+
+struct EndSignal {
+    friend auto memberOf(EndSignal);
+};
+template struct PrivateMember<EndSignal, &os::Thread::mImplmentation>;
+
 namespace {
 
 using testing::internal::CaptureStdout;
@@ -106,7 +113,9 @@ TEST(OsThreadTest, BlocksSigtermForItselfOnly) {
     EXPECT_EQ(sigismember(&here, SIGTERM), 0);
 }
 
+// The restoring comes last, behind the signal that Run has returned.
 TEST(OsThreadTest, IgnoresTheFirstRealTimeSignalWhileItRuns) {
+    const std::thread::id self = std::this_thread::get_id();
     const int kMarker = SA_NODEFER;
     std::mutex mutex;
     std::vector<std::string> order;
@@ -135,15 +144,57 @@ TEST(OsThreadTest, IgnoresTheFirstRealTimeSignalWhileItRuns) {
             previous->sa_flags = kMarker;
             return 0;
         });
+    auto end = semPostCall.replace([&](sem_t* sem) {
+        if (std::this_thread::get_id() != self) note("signal");
+        return semPostCall.real(sem);
+    });
     Worker worker("worker", [&] { note("run"); });
     worker.Start();
     worker.Wait();
     ASSERT_EQ(done.get_future().wait_for(std::chrono::seconds(10)), std::future_status::ready);
-    EXPECT_EQ(order, (std::vector<std::string>{"install", "run", "restore"}));
+    EXPECT_EQ(order, (std::vector<std::string>{"install", "run", "signal", "restore"}));
     EXPECT_EQ(installed.sa_handler, SIG_IGN);
     EXPECT_EQ(installed.sa_flags, 0);
     EXPECT_EQ(sigismember(&installed.sa_mask, SIGTERM), 0);
     EXPECT_EQ(restored.sa_flags, kMarker);
+}
+
+TEST(OsThreadTest, WaitGivesTheSystemsResultAndMinusOneWithoutASignal) {
+    Worker worker("idle", [] {});
+    {
+        auto interrupted = semWaitCall.replace([](sem_t*) { return -1; });
+        EXPECT_EQ(worker.Wait(), -1);
+    }
+    auto& signal = worker.*memberOf(EndSignal{});
+    auto* const kept = signal;
+    signal = nullptr;
+    EXPECT_EQ(worker.Wait(), -1);
+    signal = kept;
+}
+
+TEST(OsThreadTest, DestructionGivesItsSignalAndItsAttributesBack) {
+    int semaphores = 0;
+    int attributes = 0;
+    auto signals = semDestroyCall.replace([&](sem_t* sem) {
+        semaphores++;
+        return semDestroyCall.real(sem);
+    });
+    auto blocks = pthreadAttrDestroyCall.replace([&](pthread_attr_t* block) {
+        attributes++;
+        return pthreadAttrDestroyCall.real(block);
+    });
+    {
+        Worker idle("idle", [] {});
+    }
+    EXPECT_EQ(semaphores, 1);
+    EXPECT_EQ(attributes, 0);
+    {
+        Worker worker("worker", [] {});
+        worker.Start();
+        worker.Wait();
+    }
+    EXPECT_EQ(semaphores, 2);
+    EXPECT_EQ(attributes, 1);
 }
 
 TEST(OsThreadTest, IsJoinableWithDefaultAttributes) {

@@ -117,6 +117,20 @@ TEST_F(PcmMediaInfoTest, FieldsAreReadInTheirOrder) {
                                      "bitsPerSample I", "bigEndian I"));
 }
 
+// The nested object is not examined: the reads themselves then meet the null.
+TEST_F(PcmMediaInfoTest, NullPcmInfoIsTakenToTheFieldReads) {
+    vm.tolerate("Field: null argument");
+    setUpPlayer();
+    outer->set("audioPcmInfo", Value::of(nullptr));
+    ASSERT_EQ(set().engine, std::vector<std::string>{"setPCMMediaInfo()"});
+    EXPECT_THAT(vm.callsOf("GetIntField"),
+                testing::ElementsAre("mediaType", "totalDuration", "fgSynchronized", "audioCodec",
+                                     "pcm_type", "channelNumber", "sampleRate", "bitsPerSample",
+                                     "bigEndian"));
+    EXPECT_THAT(vm.callsOf("GetShortField"), testing::ElementsAre("blockAlign"));
+    EXPECT_EQ(received().eMediaType, 1);
+}
+
 TEST_F(PcmMediaInfoTest, FlagsAreOneOrZero) {
     setUpPlayer();
     setInts(outer, {{"fgSynchronized", 0}});

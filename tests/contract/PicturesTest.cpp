@@ -1,10 +1,11 @@
 // SPDX-License-Identifier: Apache-2.0
 // Thumbnails and embedded pictures as Java byte arrays.
+#include <string.h>
+
 #include <numeric>
 
 #include "JniFixture.h"
 #include "PosixCalls.h"
-#include "RecordTexts.h"
 
 namespace orvtest {
 namespace {
@@ -119,7 +120,6 @@ TEST_F(ThumbnailTest, HeightOf255RowsIsTheMost) {
 
 TEST_F(ThumbnailTest, BufferIsZeroedBeforeTheEngineDraws) {
     setUpPlayer();
-    poisonStack();
     Bytes before;
     engine->drawThumbnail = [&](_Media_Thumbnail_Info_T* thumbnail) {
         before.assign(thumbnail->pBuffer, thumbnail->pBuffer + thumbnail->u4BufferSize);

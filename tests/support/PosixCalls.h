@@ -65,13 +65,17 @@ private:
 };
 
 extern PosixCall<int(sem_t*, int, unsigned)> semInitCall;
+extern PosixCall<int(sem_t*)> semDestroyCall;
+extern PosixCall<int(sem_t*)> semWaitCall;
 extern PosixCall<int(sem_t*)> semPostCall;
 extern PosixCall<int(sem_t*, const timespec*)> semTimedwaitCall;
 extern PosixCall<int(const timespec*, timespec*)> nanosleepCall;
 extern PosixCall<int(int, const struct sigaction*, struct sigaction*)> sigactionCall;
 extern PosixCall<int(pthread_attr_t*)> pthreadAttrInitCall;
+extern PosixCall<int(pthread_attr_t*)> pthreadAttrDestroyCall;
 extern PosixCall<int(pthread_t*, const pthread_attr_t*, void* (*)(void*), void*)> pthreadCreateCall;
 extern PosixCall<void*(void*, size_t, int, int, int, off_t)> mmapCall;
+extern PosixCall<int(void*, size_t)> munmapCall;
 extern PosixCall<void*(size_t)> mallocCall;
 extern PosixCall<void(void*)> freeCall;
 

@@ -41,7 +41,7 @@ uint32_t bytesPerPixel(int32_t colorMode) {
     }
 }
 
-bool readSize(JNIEnv* env, jobject info, const char* field, int32_t& out) {
+bool readField(JNIEnv* env, jobject info, const char* field, int32_t& out) {
     if (getIntValueFromJava(env, kThumbnailInfoClass, info, field, out)) return true;
     ALOGE("OrvMediaCliengetThumbnailInfo(): get %s, %s, error happen\n", field,
           kThumbnailInfoClass);
@@ -81,9 +81,9 @@ jbyteArray OrvMediaClient_getThumbnailInfo(JNIEnv* env, jobject thiz, jobject th
     if (service == nullptr) return nullptr;
 
     _Media_Thumbnail_Info_T request = {};
-    if (!readSize(env, thumbnailInfo, "mCanvasColormode", request.i4CanvasColormode) ||
-        !readSize(env, thumbnailInfo, "mThumbnailWidth", request.i4Width) ||
-        !readSize(env, thumbnailInfo, "mThumbnailHeight", request.i4Height)) {
+    if (!readField(env, thumbnailInfo, "mCanvasColormode", request.i4CanvasColormode) ||
+        !readField(env, thumbnailInfo, "mThumbnailWidth", request.i4Width) ||
+        !readField(env, thumbnailInfo, "mThumbnailHeight", request.i4Height)) {
         return nullptr;
     }
     const uint32_t pixelBytes = bytesPerPixel(request.i4CanvasColormode);
@@ -124,7 +124,7 @@ jbyteArray OrvMediaClient_getEmbeddedPicture(JNIEnv* env, jobject thiz, jint) {
     ALOGI("getEmbeddedPicture(): Enter\n");
     sp<OrvMediaService> service = getMediaService(env, thiz);
     if (service == nullptr) {
-        ALOGE("OrvMediaClient_prepare(): service not exist, throw exception\n");  // its text
+        ALOGE("OrvMediaClient_prepare(): service not exist, throw exception\n");  // another name
         jniThrowException(env, "java/lang/IllegalStateException", nullptr);
         return nullptr;
     }

@@ -11,7 +11,7 @@
 // at least one page each. Live blocks stand on one circular list.
 
 // The head of each mapping; the caller's memory begins MEMORY_HEADER_SIZE
-// bytes behind it.
+// bytes from its start.
 struct MemoryBlock {
     int32_t size;  // bytes, as asked for
     int32_t reserved;
