@@ -23,10 +23,11 @@ TarnPlayer::Engine::Engine(int decoder, orvtarn::Notifier::Deliver deliver)
       subtitles(mpv, state, tracks),
       bytes(mpv, state, loader, seeker),
       metaData(mpv, state, loader),
-      parameters(mpv, video, tracks, subtitles) {
+      parameters(mpv, state, video, tracks, subtitles) {
     loader.setBeforeLoad([this] { beforeLoad(); });
     loader.setOnForget([this] { subtitles.reset(); });
     events.setEndHandler([this] { return speed.onEndReached(); });
+    events.setOpenedHandler([this] { subtitles.addToMedia(); });
     if (!create(decoder >= 0)) release();
 }
 
@@ -50,9 +51,9 @@ void TarnPlayer::Engine::beforeLoad() {
     mpv.set("pause", true);
     mpv.set("aid", "auto");
     mpv.set("vid", "auto");
+    mpv.set("sid", "no");
     speed.reset();
     abRepeat.reset();
-    subtitles.beforeLoad();
 }
 
 bool TarnPlayer::Engine::drawThumbnail(const _Media_Thumbnail_Info_T* thumbnail) {

@@ -57,6 +57,8 @@ bool EventLoop::start() {
             mpv_observe_property(mMpv.get(), property.id, property.name, property.format);
         if (error < 0) return refused("observe", mpv_error_string(error));
     }
+    const int error = mpv_hook_add(mMpv.get(), 0, "on_preloaded", 0);
+    if (error < 0) return refused("observe", mpv_error_string(error));
     mpv_request_log_messages(mMpv.get(), "error");
     mThread = std::thread(&EventLoop::run, this);
     return true;
@@ -87,6 +89,9 @@ void EventLoop::handle(const mpv_event& event) {
         case MPV_EVENT_END_FILE:
             onEndFile(*static_cast<const mpv_event_end_file*>(event.data));
             break;
+        case MPV_EVENT_HOOK:
+            onOpened(*static_cast<const mpv_event_hook*>(event.data));
+            break;
         case MPV_EVENT_FILE_LOADED:
             onLoaded();
             break;
@@ -111,6 +116,11 @@ void EventLoop::handle(const mpv_event& event) {
         default:
             break;
     }
+}
+
+void EventLoop::onOpened(const mpv_event_hook& hook) {
+    if (mOpenedHandler) mOpenedHandler();
+    mpv_hook_continue(mMpv.get(), hook.id);
 }
 
 // Formats without an index find key frames by guessing, sometimes behind the

@@ -35,12 +35,16 @@ public:
     // Called at the end of the media, on the loop's thread; true when it went
     // on instead (as rewinding does at the start).
     void setEndHandler(std::function<bool()> handler) { mEndHandler = std::move(handler); }
+    // Called when media are opened and their tracks are about to be chosen, on the
+    // loop's thread; the load goes on when it returns.
+    void setOpenedHandler(std::function<void()> handler) { mOpenedHandler = std::move(handler); }
     // A new picture was drawn, or had no surface to go to.
     void onFrame();
 
 private:
     void run();
     void handle(const mpv_event& event);
+    void onOpened(const mpv_event_hook& hook);
     void onLoaded();
     void onEndFile(const mpv_event_end_file& end);
     void onRestart();
@@ -62,6 +66,7 @@ private:
     VideoOutput& mVideo;
     Notifier& mNotifier;
     std::function<bool()> mEndHandler;
+    std::function<void()> mOpenedHandler;
     int64_t mFileSize = 0;  // bytes, 0 when unknown
     std::mutex mSourceMutex;
     std::shared_ptr<MediaSource> mSource;

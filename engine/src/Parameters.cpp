@@ -1,6 +1,7 @@
 // SPDX-License-Identifier: Apache-2.0
 #include "Parameters.h"
 
+#include <iconv.h>
 #include <math.h>
 #include <orvtarn/Parameters.h>
 #include <utils/String16.h>
@@ -49,6 +50,17 @@ status_t textOf(const Parcel& request, std::string& text) {
     return status;
 }
 
+// The core takes any name and fails only when it opens a file. An empty one is
+// iconv's for the locale's encoding.
+bool isEncoding(const std::string& name) {
+    if (name.empty()) return false;
+    if (name == "auto") return true;
+    const iconv_t converter = iconv_open("UTF-8", name.c_str());
+    if (converter == reinterpret_cast<iconv_t>(-1)) return false;
+    iconv_close(converter);
+    return true;
+}
+
 }  // namespace
 
 status_t Parameters::set(int key, const Parcel& request) {
@@ -78,8 +90,10 @@ status_t Parameters::setText(const Parcel& request) {
     std::string text;
     const status_t status = textOf(request, text);
     if (status != android::NO_ERROR) return failed(status, "setParameter", "no value");
-    if (mMpv.set(kSubtitleEncoding, text) >= 0) return android::NO_ERROR;
-    return failed(android::BAD_VALUE, "setParameter", "no such encoding");
+    if (!isEncoding(text)) return failed(android::BAD_VALUE, "setParameter", "no such encoding");
+    const int error = mMpv.set(kSubtitleEncoding, text);
+    if (error >= 0) return android::NO_ERROR;
+    return failed(android::UNKNOWN_ERROR, "setParameter", mpv_error_string(error));
 }
 
 status_t Parameters::get(int key, Parcel* reply) {
@@ -153,13 +167,15 @@ status_t Parameters::addSubtitles(const Parcel& request) {
     std::string path;
     const status_t status = textOf(request, path);
     if (status != android::NO_ERROR) return failed(status, "invoke", "no path");
-    return mSubtitles.add("invoke", path.c_str(), false) ? android::NO_ERROR : android::BAD_VALUE;
+    return mSubtitles.add("invoke", path.c_str(), false);
 }
 
 status_t Parameters::selectOrDeselect(int method, const Parcel& request) {
     int32_t number = 0;
     const status_t status = request.readInt32(&number);
     if (status != android::NO_ERROR) return failed(status, "invoke", "no track number");
+    const status_t open = mState.requireOpen("invoke");
+    if (open != android::NO_ERROR) return open;
     const bool done =
         method == ORV_INVOKE_SELECT_TRACK ? mTracks.select(number) : mTracks.deselect(number);
     return done ? android::NO_ERROR : android::BAD_VALUE;

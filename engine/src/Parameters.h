@@ -5,6 +5,7 @@
 #include <utils/Errors.h>
 
 #include "MpvHandle.h"
+#include "PlayerState.h"
 #include "Subtitles.h"
 #include "Tracks.h"
 #include "VideoOutput.h"
@@ -14,8 +15,9 @@ namespace orvtarn {
 // The settings and methods of orvtarn/Parameters.h.
 class Parameters {
 public:
-    Parameters(MpvHandle& mpv, VideoOutput& video, Tracks& tracks, Subtitles& subtitles)
-        : mMpv(mpv), mVideo(video), mTracks(tracks), mSubtitles(subtitles) {}
+    Parameters(MpvHandle& mpv, PlayerState& state, VideoOutput& video, Tracks& tracks,
+               Subtitles& subtitles)
+        : mMpv(mpv), mState(state), mVideo(video), mTracks(tracks), mSubtitles(subtitles) {}
 
     android::status_t set(int key, const android::Parcel& request);
     android::status_t get(int key, android::Parcel* reply);
@@ -30,6 +32,7 @@ private:
     android::status_t addSubtitles(const android::Parcel& request);
 
     MpvHandle& mMpv;
+    PlayerState& mState;
     VideoOutput& mVideo;
     Tracks& mTracks;
     Subtitles& mSubtitles;

@@ -46,9 +46,8 @@ status_t Seeker::seekToTime(const char* operation, double target) {
 }
 
 status_t Seeker::refresh() {
-    const bool wanted = mState.read([](const PlayerState::Values& v) {
-        return v.seekable && v.phase != Phase::Completed;
-    });
+    const bool wanted = mState.read(
+        [](const PlayerState::Values& v) { return v.seekable && v.phase != Phase::Completed; });
     if (!wanted) return android::NO_ERROR;
     return inTurn("refresh",
                   [this](uint64_t session) { return moveTo(position(), kExact, session); });

@@ -1,61 +1,85 @@
 // SPDX-License-Identifier: Apache-2.0
 #include "Subtitles.h"
 
-#include <algorithm>
-
 #include "EngineLog.h"
 #include "MediaSource.h"
 
 namespace orvtarn {
 namespace {
 
+using android::status_t;
+
 // The demuxer for VobSub finds the pictures beside the index, unless told.
 constexpr char kDemuxerOptions[] = "demuxer-lavf-o";
 
 }  // namespace
 
-bool Subtitles::add(const char* operation, const char* url, bool turnOn) {
+status_t Subtitles::add(const char* operation, const char* url, bool turnOn) {
     std::string name;
-    if (resolveName(url, name) != android::NO_ERROR) return refused(operation, "no such file");
-    return addNamed(operation, name, turnOn);
+    const status_t status = resolveName(url, name);
+    if (status != android::NO_ERROR) return failed(status, operation, "no such file");
+    return addFile(operation, {name, "", turnOn});
 }
 
-bool Subtitles::addPair(const char* sub, const char* idx) {
+status_t Subtitles::addPair(const char* sub, const char* idx) {
+    constexpr char kName[] = "setSubtitleDataSourceEx";
     std::string pictures;
     std::string index;
-    if (resolveName(sub, pictures) != android::NO_ERROR ||
-        resolveName(idx, index) != android::NO_ERROR) {
-        return refused("setSubtitleDataSourceEx", "no such file");
-    }
-    setPictureFile(pictures);
-    return addNamed("setSubtitleDataSourceEx", index, true);
+    status_t status = resolveName(sub, pictures);
+    if (status == android::NO_ERROR) status = resolveName(idx, index);
+    if (status != android::NO_ERROR) return failed(status, kName, "no such file");
+    return addFile(kName, {index, pictures, true});
 }
 
-void Subtitles::setPictureFile(const std::string& sub) {
-    // A quoted value: the length in bytes, then the text as it is.
-    const std::string option = "sub_name=%" + std::to_string(sub.size()) + "%" + sub;
-    mMpv.set(kDemuxerOptions, option);
-}
-
-bool Subtitles::addNamed(const char* operation, const std::string& name, bool turnOn) {
+status_t Subtitles::addFile(const char* operation, const File& file) {
     const bool open = mState.read([](const PlayerState::Values& v) { return v.isOpen(); });
-    if (open) return addNow(operation, name, turnOn);
+    if (open) return addNow(operation, file);
     const Phase phase = mState.phase();
     if (phase != Phase::Initialized && phase != Phase::Stopped) {
-        return PlayerState::wrongPhase(operation, phase) == android::NO_ERROR;
+        return PlayerState::wrongPhase(operation, phase);
     }
-    std::lock_guard<std::mutex> lock(mMutex);
-    mPending.push_back({name, turnOn});
-    return true;
+    remember(file);
+    return android::NO_ERROR;
 }
 
-bool Subtitles::addNow(const char* operation, const std::string& name, bool turnOn) {
-    const int error = mMpv.command({"sub-add", name.c_str(), "auto"});
-    mMpv.set(kDemuxerOptions, "");
-    if (error < 0) return refused(operation, mpv_error_string(error));
-    int count = 0;
-    if (!turnOn) return true;
-    return mTracks.subtitleCount(count) && mTracks.selectSubtitle(count - 1);
+status_t Subtitles::addNow(const char* operation, const File& file) {
+    const int error = open(file);
+    if (error < 0) return failed(android::BAD_VALUE, operation, mpv_error_string(error));
+    remember(file);
+    if (!file.turnOn) return android::NO_ERROR;
+    const bool shown = mTracks.showSubtitle(operation, mMpv.getInt("sid").value_or(0));
+    return shown ? android::NO_ERROR : android::INVALID_OPERATION;
+}
+
+// The core turns on the first of several languages.
+int Subtitles::open(const File& file) {
+    std::lock_guard<std::mutex> lock(mOpenMutex);
+    if (!file.pictures.empty()) {
+        // A quoted value: the length in bytes, then the text as it is.
+        mMpv.set(kDemuxerOptions,
+                 "sub_name=%" + std::to_string(file.pictures.size()) + "%" + file.pictures);
+    }
+    const int error = mMpv.command({"sub-add", file.name.c_str(), file.turnOn ? "select" : "auto"});
+    // The options are those of whatever is opened next.
+    if (!file.pictures.empty()) mMpv.set(kDemuxerOptions, "");
+    return error;
+}
+
+void Subtitles::remember(const File& file) {
+    std::lock_guard<std::mutex> lock(mMutex);
+    mFiles.push_back(file);
+}
+
+void Subtitles::addToMedia() {
+    std::vector<File> files;
+    {
+        std::lock_guard<std::mutex> lock(mMutex);
+        files = mFiles;
+    }
+    for (const File& file : files) {
+        const int error = open(file);
+        if (error < 0) refused("prepare", ("no subtitles from " + file.name).c_str());
+    }
 }
 
 bool Subtitles::stage(int type, const void* record) {
@@ -73,22 +97,10 @@ bool Subtitles::flush() {
     return done;
 }
 
-void Subtitles::beforeLoad() {
-    std::lock_guard<std::mutex> lock(mMutex);
-    std::vector<std::string> files;
-    for (const Pending& pending : mPending) files.push_back(pending.file);
-    mMpv.set("sub-files", files);
-    // The core's own choice prefers files to the media's tracks.
-    const bool turnOn = std::any_of(mPending.begin(), mPending.end(),
-                                    [](const Pending& pending) { return pending.turnOn; });
-    mMpv.set("sid", turnOn ? "auto" : "no");
-}
-
 void Subtitles::reset() {
     std::lock_guard<std::mutex> lock(mMutex);
-    mPending.clear();
+    mFiles.clear();
     mStyle.clear();
-    mMpv.set(kDemuxerOptions, "");
     for (const MpvAssignment& assignment : SubtitleStyle::defaults()) {
         assign(mMpv.get(), assignment);
     }

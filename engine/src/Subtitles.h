@@ -1,6 +1,8 @@
 // SPDX-License-Identifier: Apache-2.0
 #pragma once
 
+#include <utils/Errors.h>
+
 #include <mutex>
 #include <string>
 #include <vector>
@@ -13,40 +15,46 @@
 namespace orvtarn {
 
 // Subtitles from other files, and how subtitles look. Files that are named
-// before the media is prepared are opened with it.
+// before the media is prepared are opened with it, and all again when it is
+// prepared again.
 class Subtitles {
 public:
     Subtitles(MpvHandle& mpv, PlayerState& state, Tracks& tracks)
         : mMpv(mpv), mState(state), mTracks(tracks) {}
 
-    // Adds a file's subtitles, turned on or left for later selection.
-    bool add(const char* operation, const char* url, bool turnOn);
+    // Adds a file's subtitles, the first of them turned on or all left for later
+    // selection. A name is refused as resolveName says it; INVALID_OPERATION
+    // without media, BAD_VALUE for what are no subtitles.
+    android::status_t add(const char* operation, const char* url, bool turnOn);
     // A VobSub pair; the two may lie in different folders.
-    bool addPair(const char* sub, const char* idx);
+    android::status_t addPair(const char* sub, const char* idx);
 
     bool stage(int type, const void* record);
     bool flush();
 
-    // For the load that is about to begin.
-    void beforeLoad();
+    // The files, for the media that the core is opening: before it chooses tracks.
+    void addToMedia();
     // Forgets the files and the look.
     void reset();
 
 private:
-    struct Pending {
-        std::string file;
+    struct File {
+        std::string name;
+        std::string pictures;  // of a VobSub index; empty for those beside it
         bool turnOn;
     };
 
-    bool addNamed(const char* operation, const std::string& name, bool turnOn);
-    bool addNow(const char* operation, const std::string& name, bool turnOn);
-    void setPictureFile(const std::string& sub);
+    android::status_t addFile(const char* operation, const File& file);
+    android::status_t addNow(const char* operation, const File& file);
+    int open(const File& file);
+    void remember(const File& file);
 
     MpvHandle& mMpv;
     PlayerState& mState;
     Tracks& mTracks;
-    std::mutex mMutex;
-    std::vector<Pending> mPending;
+    std::mutex mOpenMutex;  // one file at a time
+    std::mutex mMutex;      // never held while a file is opened
+    std::vector<File> mFiles;
     SubtitleStyle mStyle;
 };
 

@@ -272,18 +272,20 @@ bool TarnPlayer::deselectTrack(int index) {
 }
 
 bool TarnPlayer::addTimedTextSource(const char* path) {
-    return mEngine->call(__func__, false,
-                         [&] { return mEngine->subtitles.add("addTimedTextSource", path, false); });
+    return mEngine->call(__func__, false, [&] {
+        return mEngine->subtitles.add("addTimedTextSource", path, false) == NO_ERROR;
+    });
 }
 
 bool TarnPlayer::setSubtitleDataSource(const char* url) {
     return mEngine->call(__func__, false, [&] {
-        return mEngine->subtitles.add("setSubtitleDataSource", url, true);
+        return mEngine->subtitles.add("setSubtitleDataSource", url, true) == NO_ERROR;
     });
 }
 
 bool TarnPlayer::setSubtitleDataSourceEx(const char* sub, const char* idx) {
-    return mEngine->call(__func__, false, [&] { return mEngine->subtitles.addPair(sub, idx); });
+    return mEngine->call(__func__, false,
+                         [&] { return mEngine->subtitles.addPair(sub, idx) == NO_ERROR; });
 }
 
 bool TarnPlayer::setSubtitleAttr(int type, void* attr) {

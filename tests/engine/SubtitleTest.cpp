@@ -49,6 +49,54 @@ protected:
     }
     bool seesNothing() { return sees(isPlain); }
 
+    // The bar that the pictures of make-vobsub.py are, of one language's width.
+    bool seesBar(int width) {
+        return sees([width](const Picture& p) {
+            const Extent bar = extentOf(p);
+            return std::abs(bar.left - 220) <= 2 && std::abs(bar.top - 300) <= 2 &&
+                   std::abs(bar.width() - width) <= 4 && std::abs(bar.height() - 30) <= 4;
+        });
+    }
+
+    // Copies of a pair that do not find each other by name or place.
+    struct Pair {
+        std::string pictures, index;
+    };
+    static Pair pairApart(const std::string& name) {
+        const std::string test = testing::UnitTest::GetInstance()->current_test_info()->name();
+        const Pair pair = {mediaPath(test + name + " pictures.sub"),
+                           mediaPath(test + name + "-apart.idx")};
+        outputOf("cp '" + mediaPath(name + ".sub") + "' '" + pair.pictures + "'");
+        outputOf("cp '" + mediaPath(name + ".idx") + "' '" + pair.index + "'");
+        return pair;
+    }
+    bool setPair(const Pair& pair) {
+        return player->setSubtitleDataSourceEx(pair.pictures.c_str(), pair.index.c_str());
+    }
+    bool setFile(const char* name) {
+        return player->setSubtitleDataSource(mediaPath(name).c_str());
+    }
+    bool addFile(const char* name) { return player->addTimedTextSource(mediaPath(name).c_str()); }
+
+    void setMedia(const char* name) {
+        ASSERT_EQ(NO_ERROR, player->setDataSource(mediaPath(name).c_str(), nullptr));
+    }
+    // Playing: a paused core may have drawn its frame before pictures were there.
+    void prepareAndStart() {
+        ASSERT_EQ(NO_ERROR, player->prepare());
+        ASSERT_EQ(NO_ERROR, player->start());
+    }
+    int trackCount() {
+        int count = -1;
+        EXPECT_TRUE(player->getSubtitleTrackCount(count));
+        return count;
+    }
+    int selected() {
+        int index = -2;
+        EXPECT_NE(0, player->getCurrentSubtitleIndex(&index));
+        return index;
+    }
+
     // Paused in the middle of a subtitle.
     void openAtLine(const char* name) {
         open(name);
@@ -90,9 +138,7 @@ TEST_P(ExternalSubtitleTest, IsDrawn) {
     openAtLine("plain.mp4");
     ASSERT_TRUE(player->setSubtitleDataSource(mediaPath(GetParam()).c_str()));
     EXPECT_TRUE(seesText());
-    int count = 0;
-    EXPECT_TRUE(player->getSubtitleTrackCount(count));
-    EXPECT_EQ(1, count);
+    EXPECT_EQ(1, trackCount());
     SubtitleTrackInfo info;
     ASSERT_TRUE(player->getSubtitleTrackInfo(0, info));
     EXPECT_TRUE(info.mFlags & ORV_TRACK_FLAG_EXTERNAL);
@@ -109,18 +155,48 @@ INSTANTIATE_TEST_SUITE_P(Formats, ExternalSubtitleTest,
 
 TEST_F(SubtitleTest, APairMayLieInTwoPlaces) {
     openAtLine("plain.mp4");
-    const std::string other = mediaPath("other name.sub");
-    outputOf("cp '" + mediaPath("words.sub") + "' '" + other + "'");
-    const std::string index = mediaPath("apart.idx");
-    outputOf("cp '" + mediaPath("words.idx") + "' '" + index + "'");
-    ASSERT_TRUE(player->setSubtitleDataSourceEx(other.c_str(), index.c_str()));
-    ASSERT_TRUE(seesText());
-    // The bar that the pictures are.
-    const Extent bar = extentOf(sink->newest());
-    EXPECT_NEAR(220, bar.left, 2);
-    EXPECT_NEAR(300, bar.top, 2);
-    EXPECT_NEAR(200, bar.width(), 4);
-    EXPECT_NEAR(30, bar.height(), 4);
+    ASSERT_TRUE(setPair(pairApart("words")));
+    EXPECT_TRUE(seesBar(200));
+}
+
+TEST_F(SubtitleTest, APairNamedBeforePreparingComesWithTheMedia) {
+    setMedia("plain.mp4");
+    ASSERT_TRUE(setPair(pairApart("words")));
+    prepareAndStart();
+    EXPECT_TRUE(seesBar(200));
+}
+
+TEST_F(SubtitleTest, EachPairHasItsOwnPictures) {
+    setMedia("plain.mp4");
+    ASSERT_TRUE(setPair(pairApart("languages")));
+    ASSERT_TRUE(setPair(pairApart("words")));
+    ASSERT_TRUE(addFile("words.idx"));
+    prepareAndStart();
+    EXPECT_EQ(4, trackCount());
+    EXPECT_EQ(2, selected()) << "the last one to be turned on";
+    EXPECT_TRUE(seesBar(200));
+    ASSERT_TRUE(player->onSubtitleTrack(1));
+    EXPECT_TRUE(seesBar(100)) << "only the first pair has a second language";
+    ASSERT_TRUE(player->onSubtitleTrack(3));
+    EXPECT_TRUE(seesBar(200)) << "the pictures beside the index";
+}
+
+TEST_F(SubtitleTest, APairThatIsRefusedLeavesNothingBehind) {
+    const Pair pair = pairApart("words");
+    EXPECT_FALSE(setPair(pair)) << "no media yet";
+    openAtLine("plain.mp4");
+    EXPECT_FALSE(player->setSubtitleDataSource(pair.index.c_str())) << "no pictures beside it";
+    EXPECT_EQ(0, trackCount());
+}
+
+TEST_F(SubtitleTest, TheFirstOfSeveralLanguagesIsTurnedOn) {
+    openAtLine("plain.mp4");
+    ASSERT_TRUE(setFile("languages.idx"));
+    EXPECT_EQ(2, trackCount());
+    EXPECT_EQ(0, selected());
+    EXPECT_TRUE(seesBar(200));
+    ASSERT_TRUE(player->onSubtitleTrack(1));
+    EXPECT_TRUE(seesBar(100));
 }
 
 TEST_F(SubtitleTest, ATimedTextSourceWaitsToBeSelected) {
@@ -138,6 +214,61 @@ TEST_F(SubtitleTest, AFileNamedBeforePreparingComesWithTheMedia) {
     EXPECT_TRUE(seesText());
 }
 
+TEST_F(SubtitleTest, OfSeveralFilesNamedBeforeTheOneToBeOnIsOn) {
+    for (const bool first : {false, true}) {
+        SCOPED_TRACE(first);
+        setMedia("plain.mp4");
+        ASSERT_TRUE(first ? setFile("words.idx") : addFile("lines.srt"));
+        ASSERT_TRUE(first ? addFile("lines.srt") : setFile("words.idx"));
+        prepareAndStart();
+        EXPECT_EQ(2, trackCount());
+        EXPECT_EQ(first ? 0 : 1, selected());
+        EXPECT_TRUE(seesBar(200));
+        player->reset();
+    }
+}
+
+TEST_F(SubtitleTest, FilesStayUntilReset) {
+    setMedia("plain.mkv");
+    ASSERT_TRUE(addFile("lines.srt"));
+    ASSERT_EQ(NO_ERROR, player->prepare());
+    EXPECT_EQ(-1, selected());
+    ASSERT_TRUE(setPair(pairApart("words")));
+    EXPECT_EQ(4, trackCount());
+    ASSERT_EQ(NO_ERROR, player->stop());
+    ASSERT_TRUE(addFile("lines.ass"));
+    prepareAndStart();
+    EXPECT_EQ(5, trackCount());
+    EXPECT_EQ(3, selected());
+    EXPECT_TRUE(seesBar(200));
+    player->reset();
+    open("plain.mkv");
+    EXPECT_EQ(2, trackCount());
+    EXPECT_EQ(-1, selected());
+}
+
+TEST_F(SubtitleTest, AFileThatIsNoneDoesNotKeepTheMediaFromPreparing) {
+    setMedia("plain.mp4");
+    ASSERT_TRUE(setFile("lines.srt"));
+    ASSERT_TRUE(setFile("garbage.bin")) << "only opened with the media";
+    ASSERT_EQ(NO_ERROR, player->prepare());
+    EXPECT_EQ(1, trackCount());
+    EXPECT_TRUE(seesText());
+}
+
+TEST_F(SubtitleTest, TurnedOnAtTheEndThePlayerStaysThere) {
+    open("plain.mkv");
+    ASSERT_EQ(NO_ERROR, player->seekTo(19000, 0));
+    playToEnd();
+    ASSERT_TRUE(player->onSubtitleTrack(0));
+    ASSERT_TRUE(setFile("lines.srt"));
+    EXPECT_EQ(duration(), position());
+    EXPECT_FALSE(player->isPlaying());
+    ASSERT_EQ(NO_ERROR, player->start());
+    EXPECT_TRUE(eventually([&] { return position() < 5000; })) << "from the start";
+    EXPECT_TRUE(seesText());
+}
+
 TEST_F(SubtitleTest, RefusesFilesThatAreNone) {
     EXPECT_FALSE(player->setSubtitleDataSource(mediaPath("lines.srt").c_str())) << "no media yet";
     openAtLine("plain.mp4");
@@ -147,9 +278,7 @@ TEST_F(SubtitleTest, RefusesFilesThatAreNone) {
     EXPECT_FALSE(player->addTimedTextSource(""));
     EXPECT_FALSE(player->setSubtitleDataSourceEx(nullptr, nullptr));
     EXPECT_FALSE(player->setSubtitleDataSourceEx(mediaPath("words.sub").c_str(), "/nowhere.idx"));
-    int count = -1;
-    EXPECT_TRUE(player->getSubtitleTrackCount(count));
-    EXPECT_EQ(0, count);
+    EXPECT_EQ(0, trackCount());
 }
 
 TEST_F(SubtitleTest, ColoursTheText) {

@@ -12,9 +12,10 @@ FILES="video.mp4 video.mkv video.ts video.avi slides.mkv rotated.mp4 hd.mp4 hd70
        alpha.mov still.png silent.mkv tracks.mkv tracks.mp4 tagged.mp3 tagged.ogg broken-tags.mp4
        front.jpg back.png covered.mp3 covered.flac covered.m4a covered.mkv noise.bin
        cut.mp4 cut.mkv
-       feature.mkv short.mp4 short.ts long.mkv distant.mkv silent.mp4 plain.mkv plain.mp4 lines.srt
-       latin1.srt lines.ass words.idx words.sub tone.mp3 tone.flac tone-s16le.pcm
-       tone-s16be.pcm subtitles-only.mkv garbage.bin empty.bin"
+       feature.mkv short.mp4 short.ts long.mkv distant.mkv silent.mp4 plain.mkv plain.mp4 pictures.mkv
+       lines.srt latin1.srt lines.ass words.idx words.sub languages.idx languages.sub tone.mp3
+       tone.flac tone-s16le.pcm tone-s16be.pcm subtitles-only.mkv garbage.bin empty.bin unseen.mkv dead.mkv first-of-two.m3u
+       first-missing.m3u nothing.m3u locale"
 
 quiet_ffmpeg() { ffmpeg -nostdin -v error -y "$@"; }
 
@@ -239,6 +240,14 @@ make_plain_mkv() {
         $(fast_h264) -g 60 -c:a flac -c:s subrip -disposition:s 0 "$1"
 }
 
+# A black and a white picture, of which the first is the usual one.
+make_pictures_mkv() {
+    # shellcheck disable=SC2046
+    quiet_ffmpeg -f lavfi -i "color=black:size=160x90:rate=30:duration=2" \
+        -f lavfi -i "color=white:size=160x90:rate=30:duration=2" -map 0 -map 1 \
+        $(fast_h264) -g 30 -disposition:v:0 default "$1"
+}
+
 make_plain_mp4() {
     # shellcheck disable=SC2046
     quiet_ffmpeg -f lavfi -i "$(grey)" $(fast_h264) -g 60 "$1"
@@ -251,6 +260,8 @@ make_lines_ass() { lines 'Styled' 20 | quiet_ffmpeg -f srt -i /dev/stdin "$1"; }
 # A VobSub pair: the index and the pictures that it points to.
 make_words_sub() { python3 "$here/make-vobsub.py" /dev/null "$1"; }
 make_words_idx() { python3 "$here/make-vobsub.py" "$1" /dev/null; }
+make_languages_sub() { python3 "$here/make-vobsub.py" /dev/null "$1" 2; }
+make_languages_idx() { python3 "$here/make-vobsub.py" "$1" /dev/null 2; }
 
 make_tone_mp3() { quiet_ffmpeg -f lavfi -i "$(tone 440 3)" -c:a libmp3lame -b:a 128k "$1"; }
 make_tone_flac() { quiet_ffmpeg -f lavfi -i "$(tone 440 3)" -c:a flac "$1"; }
@@ -260,6 +271,36 @@ make_tone_s16le_pcm() { quiet_ffmpeg -f lavfi -i "$(tone 440 2)" -ac 2 -ar 44100
 make_tone_s16be_pcm() { quiet_ffmpeg -f lavfi -i "$(tone 440 2)" -ac 2 -ar 44100 -f s16be "$1"; }
 
 make_subtitles_only_mkv() { lines 'Alone' 4 | quiet_ffmpeg -f srt -i /dev/stdin -c:s subrip "$1"; }
+# Video of which nothing can be decoded, with sound and alone.
+make_unseen_mkv() {
+    # shellcheck disable=SC2046
+    quiet_ffmpeg -f lavfi -i "$(playing 320x180 2)" -f lavfi -i "$(tone 440 2)" \
+        $(fast_h264) -c:a flac -bsf:v noise=amount=1 "$1"
+}
+
+make_dead_mkv() {
+    need unseen.mkv
+    quiet_ffmpeg -i "$folder/unseen.mkv" -map 0:v -c copy "$1" 2>/dev/null
+}
+
+make_first_of_two_m3u() {
+    need silent.mp4 long.mkv
+    printf '#EXTM3U\nsilent.mp4\nlong.mkv\n' >"$1"
+}
+
+make_first_missing_m3u() {
+    need long.mkv
+    printf '#EXTM3U\nnowhere.mp4\nlong.mkv\n' >"$1"
+}
+
+make_nothing_m3u() { printf '#EXTM3U\n' >"$1"; }
+
+# A locale that writes numbers with a comma, whatever the machine has.
+make_locale() {
+    mkdir "$1"
+    localedef --no-archive -i de_DE -f UTF-8 "$1/de_DE.UTF-8"
+}
+
 make_garbage_bin() { seq 1 40 | sha512sum | head -c 100 | tr '0-9a-f' '\200-\217' >"$1"; }
 make_empty_bin() { : >"$1"; }
 

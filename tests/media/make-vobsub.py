@@ -1,26 +1,29 @@
 #!/usr/bin/env python3
 # SPDX-License-Identifier: Apache-2.0
-"""make-vobsub.py IDX SUB: a VobSub pair of ten pictures, one every two seconds.
+"""make-vobsub.py IDX SUB [LANGUAGES]: a VobSub pair of ten pictures for each
+language, one every two seconds.
 
-Each picture is a white bar of 200 x 30 pixels on a screen of 640 x 360.
+Each picture is a white bar of 30 rows on a screen of 640 x 360. The first
+language's is 200 pixels wide, the second one's 100.
 """
 import struct
 import sys
 
-WIDTH, HEIGHT = 200, 30
+WIDTHS = {"en": 200, "de": 100}  # by language
+HEIGHT = 30
 LEFT, TOP = 220, 300
 COUNT, INTERVAL = 10, 2  # pictures, seconds
 BLOCK = 2048  # a pack of the program stream
 
 
-def picture():
+def picture(width):
     """One subpicture unit: two fields of run lengths, then the control part."""
     line = bytes([0x00, 0x01])  # colour 1 to the end of the line
     field = line * (HEIGHT // 2)
     first = 4
     second = first + len(field)
     control = second + len(field)
-    x2, y2 = LEFT + WIDTH - 1, TOP + HEIGHT - 1
+    x2, y2 = LEFT + width - 1, TOP + HEIGHT - 1
     show = bytes([0x03, 0x32, 0x10])  # palette entries of colours 3..0
     show += bytes([0x04, 0xFF, 0xF0])  # all but the background opaque
     show += bytes([0x05, LEFT >> 4, (LEFT & 15) << 4 | x2 >> 8, x2 & 255,
@@ -41,34 +44,38 @@ def timestamp(prefix, pts):
                   (pts >> 14 & 0xFE) | 1, pts >> 7 & 0xFF, (pts << 1 & 0xFE) | 1])
 
 
-def pack(pts, unit):
+def pack(pts, substream, unit):
     """The unit in a private stream, in a pack filled up to the block size."""
     scr = bytes([0x44 | (pts >> 27 & 0x38) | (pts >> 28 & 3), pts >> 20 & 0xFF,
                  0x04 | (pts >> 12 & 0xF8) | (pts >> 13 & 3), pts >> 5 & 0xFF,
                  0x04 | (pts << 3 & 0xF8), 0x01, 0x01, 0x89, 0xC3, 0xF8])
     header = b"\x00\x00\x01\xBA" + scr
-    payload = bytes([0x81, 0x80, 5]) + timestamp(2, pts) + bytes([0x20]) + unit
+    payload = bytes([0x81, 0x80, 5]) + timestamp(2, pts) + bytes([0x20 + substream]) + unit
     stream = b"\x00\x00\x01\xBD" + struct.pack(">H", len(payload)) + payload
     rest = BLOCK - len(header) - len(stream) - 6
     return header + stream + b"\x00\x00\x01\xBE" + struct.pack(">H", rest) + b"\xFF" * rest
 
 
-def index():
+def index(languages):
     colours = ["000000", "ffffff", "808080", "404040"] + ["000000"] * 12
     lines = ["# VobSub index file, v7 (do not modify this line!)", "size: 640x360",
-             "palette: " + ", ".join(colours), "langidx: 0", "id: en, index: 0"]
-    for number in range(COUNT):
-        lines.append("timestamp: 00:00:%02d:000, filepos: %09x"
-                     % (number * INTERVAL, number * BLOCK))
+             "palette: " + ", ".join(colours), "langidx: 0"]
+    for substream, language in enumerate(languages):
+        lines.append("id: %s, index: %d" % (language, substream))
+        for number in range(COUNT):
+            lines.append("timestamp: 00:00:%02d:000, filepos: %09x"
+                         % (number * INTERVAL, (substream * COUNT + number) * BLOCK))
     return "\n".join(lines) + "\n"
 
 
 def main():
+    languages = list(WIDTHS)[:int(sys.argv[3]) if len(sys.argv) > 3 else 1]
     with open(sys.argv[1], "w", encoding="ascii") as idx:
-        idx.write(index())
+        idx.write(index(languages))
     with open(sys.argv[2], "wb") as sub:
-        for number in range(COUNT):
-            sub.write(pack(90000 * INTERVAL * number, picture()))
+        for substream, language in enumerate(languages):
+            for number in range(COUNT):
+                sub.write(pack(90000 * INTERVAL * number, substream, picture(WIDTHS[language])))
 
 
 if __name__ == "__main__":

@@ -25,12 +25,15 @@ enum E_Orv_Parameter : int {
 };
 
 // The request of invoke begins with the method as Int32, its arguments follow.
+// INVALID_OPERATION without media to operate on, BAD_VALUE for no such track or
+// what are no subtitles.
 enum E_Orv_Invoke : int {
     // Reply: Int32 number of tracks, then for each, in the numbering of
     // selectTrack, three Int32: kind (E_Orv_Track_Kind), codec and flags as in
     // orvtarn/TrackRecords.h.
     ORV_INVOKE_GET_TRACKS = 1,
-    ORV_INVOKE_ADD_SUBTITLES = 2,   // argument String16: as addTimedTextSource
+    // Argument String16: as addTimedTextSource, a bad name as setDataSource says it.
+    ORV_INVOKE_ADD_SUBTITLES = 2,
     ORV_INVOKE_SELECT_TRACK = 4,    // argument Int32: as selectTrack
     ORV_INVOKE_DESELECT_TRACK = 5,  // argument Int32: as deselectTrack
 };

@@ -159,11 +159,14 @@ public:
     // False for tracks that are not selected, and for the only track that plays.
     bool deselectTrack(int index);
     // Files in SubRip, ASS and other formats, as further tracks behind the
-    // media's own. The first leaves the track off, the others turn it on. Before
-    // prepare the file is opened with the media. False for what is no such file.
+    // media's own. The first leaves its tracks off, the others turn their first
+    // one on. Blocks until the file is opened; false for what is no such file.
+    // Before prepare only the name is checked: the file is opened with the media,
+    // which go without one that is none. Files stay until reset: each prepare
+    // opens all of them, in their order, and the last that was turned on is on.
     bool addTimedTextSource(const char* path);
     bool setSubtitleDataSource(const char* url);
-    // A VobSub pair; the files may have different names and places.
+    // A VobSub pair; the files may have different names and places. Any number.
     bool setSubtitleDataSourceEx(const char* sub, const char* idx);
     // Stages one record of the type's kind until flushSubtitleAttr. False for
     // types and values that orvtarn/SubtitleRecords.h does not have.
