@@ -28,6 +28,7 @@ struct Reader {
     std::string name;
     std::string field;       // of the holder, of the reader's type
     std::string wrongField;  // of the holder, of another type
+    std::string accessor;    // the function that reads the field
     Read (*read)(JNIEnv* env, const char* classPath, jobject object, const char* field);
     bool readsObject = false;
 
@@ -92,10 +93,10 @@ Read readObject(JNIEnv* env, const char* classPath, jobject object, const char* 
 }
 
 std::vector<Reader> readers() {
-    return {{"getIntValueFromJava", "mInt", "mByte", readInt},
-            {"getByteValueFromJava", "mByte", "mInt", readByte},
-            {"getBoolValueFromJava", "mBool", "mByte", readBool},
-            {"getObjValueFromJava", "mChild", "mInt", readObject, true}};
+    return {{"getIntValueFromJava", "mInt", "mByte", "GetIntField", readInt},
+            {"getByteValueFromJava", "mByte", "mInt", "GetByteField", readByte},
+            {"getBoolValueFromJava", "mBool", "mByte", "GetByteField", readBool},
+            {"getObjValueFromJava", "mChild", "mInt", "GetObjectField", readObject, true}};
 }
 
 class JavaFieldReadersFixture : public VmFixture {
@@ -114,6 +115,8 @@ protected:
         Read read;
         outcome = observeAction(
             [&] { read = reader.read(vm.env(), classPath, vm.local(holder), field); });
+        // Local references are the native method's to leave to the machine.
+        EXPECT_THAT(vm.callsOf("DeleteLocalRef"), testing::IsEmpty());
         return read;
     }
     void expectFailure(const Read& read) {
@@ -172,10 +175,11 @@ TEST_P(EveryReaderTest, FindsNoFieldOfAnotherType) {
 
 // The object is not examined: the read itself then meets the null.
 TEST_P(EveryReaderTest, TakesANullObjectToTheFieldRead) {
-    vm.tolerate("Field:");
-    holder = nullptr;
     const Reader& reader = GetParam();
+    vm.tolerate(reader.accessor + ": null argument");
+    holder = nullptr;
     EXPECT_TRUE(read(reader, kHolder, reader.field.c_str()).result);
+    EXPECT_THAT(vm.callsOf(reader.accessor), testing::ElementsAre(reader.field));
 }
 
 INSTANTIATE_TEST_SUITE_P(Readers, EveryReaderTest, testing::ValuesIn(readers()),

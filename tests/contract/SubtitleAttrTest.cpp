@@ -95,6 +95,12 @@ ExpectedLine failed(const std::string& path, const std::string& what) {
     return bridgeError("setSubtitleAttr(): deal with " + path + ": " + what + ", error happen\n");
 }
 
+ExpectedLine reader(const std::string& text) { return info(text).tagged("Customer_media_Utils"); }
+ExpectedLine readerEntry(const std::string& name, const std::string& path,
+                         const std::string& field) {
+    return reader(name + "(): pszClassPath=" + path + ", pszVar_AliasName=" + field);
+}
+
 TEST_F(SubtitleAttrTest, EveryGroupIsSentInOrderAndThenFlushed) {
     setUpPlayer();
     const Outcome outcome = set(kEveryGroup);
@@ -121,7 +127,7 @@ TEST_F(SubtitleAttrTest, EveryGroupIsSentInOrderAndThenFlushed) {
     EXPECT_EQ(outcome.thrown, std::nullopt);
 }
 
-TEST_F(SubtitleAttrTest, FieldsAreReadThroughTheReadersInOrder) {
+TEST_F(SubtitleAttrTest, FieldsAreReadInOrder) {
     setUpPlayer();
     set(kEveryGroup);
     EXPECT_THAT(vm.callsOf("GetObjectField"),
@@ -131,6 +137,28 @@ TEST_F(SubtitleAttrTest, FieldsAreReadThroughTheReadersInOrder) {
                                                        "mFontSizeType", "mX", "mY"));
     EXPECT_THAT(vm.callsOf("GetByteField"), ElementsAre("mCustomSize", "mA", "mR", "mG", "mB", "mA",
                                                         "mR", "mG", "mB", "mA", "mR", "mG", "mB"));
+}
+
+// Each field through its reader, the values logged before they are sent, and
+// the flush before the end.
+TEST_F(SubtitleAttrTest, GroupsLinesComeInTheOrderOfItsSteps) {
+    setUpPlayer();
+    EXPECT_THAT(
+        set(0x04),
+        ReturnsNothing()
+            .logs({step("Enter\n"), readerEntry("getIntValueFromJava", kAttr, "mMask"),
+                   reader("getIntValueFromJava(): i4Ret=4"), occurs("FLAG_SUBTITLE_FONT_INFO"),
+                   reader("getObjValueFromJava(): pszClassPath_Parent=" + kAttr +
+                          ", pszClassPathType_Son=" + type(kFontInfo) +
+                          ", pszVar_AliasName=mFontInfo"),
+                   readerEntry("getIntValueFromJava", kFontInfo, "mFontSizeType"),
+                   reader("getIntValueFromJava(): i4Ret=3"),
+                   readerEntry("getByteValueFromJava", kFontInfo, "mCustomSize"),
+                   reader("getByteValueFromJava(): chRet=36"),
+                   step("config FLAG_SUBTITLE_FONT_INFO, i4FontSizeType=3, chCustomSize=36"),
+                   serviceInfo("OrvMediaService::setSubtitleAttr()"),
+                   serviceInfo("OrvMediaService::flushSubtltAttr()"), step("Leave\n")})
+            .engine({"setSubtitleAttr(2, 3, 36)", "flushSubtitleAttr()"}));
 }
 
 // A mask, and what of it reaches the engine.

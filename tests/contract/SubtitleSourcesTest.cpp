@@ -142,7 +142,7 @@ TEST_F(TimedTextSourceTest, EnginesRefusalIsOnlyLogged) {
                     .leavesUnreleased({"GetStringUTFChars"}));
 }
 
-TEST_F(TimedTextSourceTest, MissingServiceIsNoError) {
+TEST_F(TimedTextSourceTest, MissingServiceIsLoggedAsInfo) {
     EXPECT_THAT(add(string("/m/a.srt")),
                 Returns("-1").logs(
                     {enter(name), trace, bridgeInfo(name + "(): service not exist, error\n")}));

@@ -42,6 +42,13 @@ inline SubtitleTrackInfo subtitle(int first, const char* text) {
     return info;
 }
 
+MATCHER(IsZero, "is a record as it is constructed") {
+    (void)result_listener;
+    const SubtitleTrackInfo& info = arg;
+    return info.mTrackId == 0 && info.mCodec == 0 && isClear(info.mText) && info.mFlags == 0 &&
+           isClear(info.mLanguage);
+}
+
 // What the three table methods have in common.
 class TrackTableTest : public JniFixture {
 protected:

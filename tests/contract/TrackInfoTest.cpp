@@ -27,6 +27,15 @@ TEST_F(VideoCodecInfoTest, ReachesJava) {
                            .java({"setVideoCodecInfo(10, 11, 12, 13, 14, -15)"}));
 }
 
+TEST_F(VideoCodecInfoTest, IsZeroWhenTheEngineFillsNothing) {
+    setUpPlayer().currentVideoCodec = codec(10);
+    get();
+    engine->currentVideoCodec.reset();
+    engine->answer("getVideoCodecInfo", {1});
+    poisonStack();
+    EXPECT_THAT(get().java, ElementsAre("setVideoCodecInfo(0, 0, 0, 0, 0, 0)"));
+}
+
 TEST_F(VideoCodecInfoTest, MissingServiceThrowsNothing) {
     EXPECT_THAT(get(), Returns("false").logs({enter(name), missingServiceLine()}));
 }
@@ -77,6 +86,15 @@ TEST_F(SubtitleTrackInfoTest, ReachesJava) {
                             .engine({"getSubtitleTrackInfo(3)"})
                             .java({"setSubtitleTrackInfo(7, 8, \"fra;Fran\xc3\xa7"
                                    "ais\", -7)"}));
+}
+
+TEST_F(SubtitleTrackInfoTest, IsZeroWhenTheEngineFillsNothing) {
+    setUpPlayer().subtitleTracks[3] = subtitle(7, "eng;");
+    engine->answer("getSubtitleTrackInfo", {1});
+    get(3);
+    poisonStack();
+    EXPECT_THAT(get(4).java, ElementsAre("setSubtitleTrackInfo(0, 0, \"\", 0)"));
+    EXPECT_THAT(engine->receivedSubtitleTracks, ElementsAre(IsZero(), IsZero()));
 }
 
 TEST_F(SubtitleTrackInfoTest, IndexIsTheEnginesBusiness) {

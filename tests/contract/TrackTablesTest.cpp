@@ -5,6 +5,8 @@
 namespace orvtest {
 namespace {
 
+using testing::ElementsAre;
+
 class AllSubtitleTrackInfoTest : public TrackTableTest {
 protected:
     AllSubtitleTrackInfoTest()
@@ -46,6 +48,16 @@ TEST_F(AllSubtitleTrackInfoTest, UnreadableEntryIsSentEmptyAndTheRestGoesOn) {
                    "setAllSubtitleTrackInfo(4, 1, 2, 3, \"b\", -2)",
                    "setAllSubtitleTrackInfo(4, 2, 0, 0, \"\", 0)",
                    "setAllSubtitleTrackInfo(4, 3, 4, 5, \"d\", -4)"}));
+}
+
+TEST_F(AllSubtitleTrackInfoTest, EngineGetsAFreshRecordForEveryEntry) {
+    setUpPlayer().put("getSubtitleTrackCount", 2);
+    engine->subtitleTracks = {{0, subtitle(7, "eng;")}};
+    engine->answer("getSubtitleTrackInfo", {1});  // also without a record to hand out
+    poisonStack();
+    EXPECT_THAT(getAll().java, ElementsAre("setAllSubtitleTrackInfo(2, 0, 7, 8, \"eng;\", -7)",
+                                           "setAllSubtitleTrackInfo(2, 1, 0, 0, \"\", 0)"));
+    EXPECT_THAT(engine->receivedSubtitleTracks, ElementsAre(IsZero(), IsZero()));
 }
 
 TEST_F(AllSubtitleTrackInfoTest, NoTracks) {
@@ -125,6 +137,14 @@ TEST_F(AllVideoTrackInfoTest, UnreadableEntryEndsTheTable) {
                                      failure("service get failed\n")})
                               .engine({countCall, "getVideoCodecInfo(0)", "getVideoCodecInfo(1)"})
                               .java({"setAllVideoCodecInfo(3, 0, 10, 11, 12, 13, 14, -15)"}));
+}
+
+TEST_F(AllVideoTrackInfoTest, EngineGetsAFreshRecordForEveryEntry) {
+    setUpPlayer().put("getVideoTrackCount", 2);
+    engine->videoCodecs = {{0, codec(10)}};
+    engine->answer("getVideoCodecInfo", {1});  // also without a record to hand out
+    EXPECT_THAT(getAll().java, ElementsAre("setAllVideoCodecInfo(2, 0, 10, 11, 12, 13, 14, -15)",
+                                           "setAllVideoCodecInfo(2, 1, 0, 0, 0, 0, 0, 0)"));
 }
 
 TEST_F(AllVideoTrackInfoTest, NoTracks) {
