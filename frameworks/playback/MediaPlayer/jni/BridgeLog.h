@@ -2,7 +2,7 @@
 #pragma once
 
 // The log of the native bridge, the event poster, the stream adapter and the
-// service's listener. Include it once per source file, after the headers.
+// service's listener. For source files only: it sets the file's LOG_TAG.
 
 #include <log/log.h>
 

@@ -30,7 +30,7 @@ constexpr const char* skipPrefix(const char* prefix, const char* descriptor) {
     return descriptor;
 }
 
-// skipType<T> gives the descriptor behind T's, or null when it begins with
+// JniType<T>::skip gives the descriptor behind T's, or null when it begins with
 // another type's.
 template <typename T>
 struct JniType;

@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: Apache-2.0
 #pragma once
 
-// The service's log. Include it once per source file, after the headers.
+// The service's log. For source files only: it sets the file's LOG_TAG.
 
 #include <log/log.h>
 
