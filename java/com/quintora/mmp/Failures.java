@@ -13,6 +13,8 @@ final class Failures {
     // How the native half ends a message: "Prepare failed.: status=0xFFFFFC14".
     private static final Pattern STATUS = Pattern.compile("status=0x([0-9A-F]{1,8})$");
 
+    private static final String FILE_URL = "file://";
+
     private Failures() {}
 
     /**
@@ -24,7 +26,8 @@ final class Failures {
     static MediaException explain(String source, Exception thrown, Throwable root) {
         int status = status(thrown);
         if (root == null) {
-            return new MediaException(source + ": " + sentence(source, status), status, thrown);
+            String name = source.isEmpty() ? "" : source + ": ";
+            return new MediaException(name + sentence(source, status), status, thrown);
         }
         MediaException told = new MediaException(
                 source + ": the source failed: " + root, MediaException.STATUS_IO, root);
@@ -57,9 +60,7 @@ final class Failures {
         return switch (status) {
             case MediaException.STATUS_NOT_FOUND -> "no such file";
             case MediaException.STATUS_BAD_VALUE -> badValue(source);
-            case MediaException.STATUS_IO -> isUrl(source)
-                    ? "the server refused the connection, does not answer or has no such media"
-                    : "cannot be opened or read";
+            case MediaException.STATUS_IO -> unreadable(source);
             case MediaException.STATUS_MALFORMED -> malformed(source);
             case MediaException.STATUS_UNSUPPORTED -> "has no track that can be played";
             case MediaException.STATUS_TIMED_OUT -> "was not ready in time";
@@ -78,6 +79,16 @@ final class Failures {
                 : "is not open, or a value is out of range";
     }
 
+    private static String unreadable(String source) {
+        Path path = localPath(source);
+        if (path == null && isUrl(source)) {
+            return "the server refused the connection, does not answer or has no such media";
+        }
+        return path != null && isUrl(source) && Files.notExists(path)
+                ? "no such file"
+                : "cannot be opened or read";
+    }
+
     private static String malformed(String source) {
         Path path = localPath(source);
         try {
@@ -90,13 +101,15 @@ final class Failures {
         return "is no media format that is known";
     }
 
-    private static boolean isUrl(String source) {
+    static boolean isUrl(String source) {
         return source.contains("://");
     }
 
+    // The engine takes what follows file:// as it stands.
     private static Path localPath(String source) {
+        String path = source.startsWith(FILE_URL) ? source.substring(FILE_URL.length()) : source;
         try {
-            return isUrl(source) ? null : Path.of(source);
+            return isUrl(path) ? null : Path.of(path);
         } catch (InvalidPathException e) {
             return null;
         }

@@ -63,7 +63,7 @@ class BadInputTest extends PlayerFixture {
 
     @Test
     void aNameThatIsEmpty() {
-        assertEquals(": the path is empty", refusedAtOnce("").getMessage());
+        assertEquals("the path is empty", refusedAtOnce("").getMessage());
     }
 
     @Test

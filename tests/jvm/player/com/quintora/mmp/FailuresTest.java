@@ -35,11 +35,13 @@ class FailuresTest {
     @CsvSource(delimiter = '|', value = {
         "/no/such.mkv | FFFFFFFE | /no/such.mkv: no such file",
         "/ | FFFFFFEA | /: is a directory",
-        "'' | FFFFFFEA | : the path is empty",
+        "'' | FFFFFFEA | the path is empty",
         "the descriptor | FFFFFFEA | the descriptor: is not open, or a value is out of range",
         "/no/such.mkv | FFFFFC14 | /no/such.mkv: cannot be opened or read",
         "http://h/x | FFFFFC14 | http://h/x: the server refused the connection, does not answer"
             + " or has no such media",
+        "file:///no/such.mkv | FFFFFC14 | file:///no/such.mkv: no such file",
+        "file:/// | FFFFFC14 | file:///: cannot be opened or read",
         "/x | FFFFFC11 | /x: is no media format that is known",
         "/x | FFFFFC0E | /x: has no track that can be played",
         "/x | FFFFFF92 | /x: was not ready in time",
