@@ -29,12 +29,15 @@ final class CoverCommand implements Callable<Integer> {
             byte[] picture =
                     player.pictures()
                             .embedded()
-                            .orElseThrow(
-                                    () -> new Failure("there is no picture inside '" + source + "'"));
+                            .orElseThrow(() -> noPicture(source));
             Files.write(out, picture);
         } catch (IOException e) {
             throw Failure.writing(out, e);
         }
         return 0;
+    }
+
+    private static Failure noPicture(String source) {
+        return new Failure("there is no picture inside '" + source + "'");
     }
 }

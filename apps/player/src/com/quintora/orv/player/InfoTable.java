@@ -68,8 +68,9 @@ final class InfoTable {
     }
 
     private void add(String name, String value) {
-        if (!value.isEmpty()) {
-            lines.add(String.format("%-12s  %s", name, value));
+        String text = Printable.of(value);
+        if (!text.isEmpty()) {
+            lines.add(String.format("%-12s  %s", name, text));
         }
     }
 

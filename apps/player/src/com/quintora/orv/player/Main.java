@@ -4,6 +4,8 @@ package com.quintora.orv.player;
 import picocli.CommandLine;
 import picocli.CommandLine.Command;
 import picocli.CommandLine.ParameterException;
+import picocli.CommandLine.TypeConversionException;
+import picocli.CommandLine.UnmatchedArgumentException;
 
 /**
  * The desktop player's commands. Exit status: 0 for success, 1 for a failure told in one
@@ -27,16 +29,41 @@ public final class Main {
     static CommandLine commandLine() {
         return new CommandLine(new Main())
                 .setUsageHelpWidth(100)
-                .setCaseInsensitiveEnumValuesAllowed(true)
+                .registerConverter(int.class, Main::wholeNumber)
+                .registerConverter(Integer.class, Main::wholeNumber)
+                .registerConverter(double.class, Main::number)
                 .setParameterExceptionHandler(Main::tellUsage)
                 .setExecutionExceptionHandler(Main::tellFailure);
     }
 
+    private static int wholeNumber(String text) {
+        try {
+            return Integer.parseInt(text);
+        } catch (NumberFormatException e) {
+            throw new TypeConversionException("'" + text + "' is not a whole number");
+        }
+    }
+
+    private static double number(String text) {
+        try {
+            return Double.parseDouble(text);
+        } catch (NumberFormatException e) {
+            throw new TypeConversionException("'" + text + "' is not a number");
+        }
+    }
+
     private static int tellUsage(ParameterException problem, String[] arguments) {
         CommandLine command = problem.getCommandLine();
-        say(command, problem.getMessage());
+        say(command, sentence(problem));
         say(command, "see ./orv " + command.getCommandName() + " --help");
         return CommandLine.ExitCode.USAGE;
+    }
+
+    private static String sentence(ParameterException problem) {
+        return problem instanceof UnmatchedArgumentException unmatched
+                        && !unmatched.isUnknownOption()
+                ? "too many arguments: " + String.join(" ", unmatched.getUnmatched())
+                : problem.getMessage();
     }
 
     private static int tellFailure(
@@ -51,6 +78,6 @@ public final class Main {
     }
 
     private static void say(CommandLine command, String sentence) {
-        command.getErr().println("orv: " + sentence);
+        command.getErr().println("orv: " + Printable.of(sentence));
     }
 }

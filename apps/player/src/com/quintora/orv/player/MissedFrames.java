@@ -17,7 +17,7 @@ final class MissedFrames {
     private long frames;
     private long lackingBefore;
 
-    /** Media of so many frames a second at normal speed; 0 when unknown, and then none is missed. */
+    /** Media of so many frames a second at normal speed; 0 for unknown: then none is missed. */
     MissedFrames(double framesPerSecond) {
         periodNs = framesPerSecond > 0 ? (long) (1e9 / framesPerSecond) : 0;
     }

@@ -1,6 +1,7 @@
 // SPDX-License-Identifier: Apache-2.0
 package com.quintora.orv.player;
 
+import com.quintora.mmp.TrickPlay;
 import com.quintora.orv.player.terminal.Terminal;
 import com.quintora.orv.player.terminal.TerminalScreen;
 import com.quintora.orv.player.window.PlayerWindow;
@@ -15,7 +16,8 @@ import picocli.CommandLine.Spec;
 @Command(
         name = "play",
         description = "Plays a file or URL: in a window, or in the terminal where there is no"
-                + " display.")
+                + " display.",
+        footer = "In the window, the key H lists all keys.")
 final class PlayCommand implements Callable<Integer> {
     @Mixin private CommonOptions common;
     @Mixin private PlayOptions options;
@@ -31,13 +33,31 @@ final class PlayCommand implements Callable<Integer> {
     }
 
     private void check() {
-        if (options.volume < 0 || options.volume > 100) {
-            throw new ParameterException(spec.commandLine(), "--volume is 0 to 100");
+        require(options.volume >= 0 && options.volume <= 100, "--volume is 0 to 100");
+        double speed = Math.abs(options.speed);
+        require(
+                speed >= PlayOptions.MIN_SPEED && speed <= TrickPlay.MAX_SPEED,
+                "--speed is 0.25 to 32, or -32 to -0.25 for backward");
+        require(
+                options.section == null || options.speed > 0,
+                "--ab repeats a section forward; --speed is negative");
+        require(
+                options.section == null || options.start == 0,
+                "--ab begins at the section's start; leave --start out");
+        require(
+                options.pcm == null || options.source != null,
+                "--pcm describes a file of raw PCM; name the file");
+        require(!options.stream || !isUrl(options.source), "--stream reads a file, not a URL");
+    }
+
+    private void require(boolean met, String sentence) {
+        if (!met) {
+            throw new ParameterException(spec.commandLine(), sentence);
         }
-        if (options.stream && options.source != null && options.source.contains("://")) {
-            throw new ParameterException(
-                    spec.commandLine(), "--stream reads a file, not a URL");
-        }
+    }
+
+    private static boolean isUrl(String source) {
+        return source != null && source.contains("://");
     }
 
     private int playInTerminal() throws Failure, InterruptedException {
@@ -71,14 +91,10 @@ final class PlayCommand implements Callable<Integer> {
         }
     }
 
-    // Without asking AWT, which takes longer to load than the rest of the program.
+    // Without asking AWT, which takes longer to load than the rest of the program. It draws on
+    // X displays alone: Wayland's desktops offer one as well, and name it in DISPLAY.
     private static boolean hasDisplay() {
-        return !Boolean.getBoolean("java.awt.headless")
-                && (isSet("DISPLAY") || isSet("WAYLAND_DISPLAY"));
-    }
-
-    private static boolean isSet(String variable) {
-        String value = System.getenv(variable);
-        return value != null && !value.isEmpty();
+        String display = System.getenv("DISPLAY");
+        return !Boolean.getBoolean("java.awt.headless") && display != null && !display.isEmpty();
     }
 }

@@ -8,6 +8,9 @@ import picocli.CommandLine.Parameters;
 
 /** What and how to play. Track numbers count from 0, times are kept in milliseconds. */
 public final class PlayOptions {
+    /** The slowest speed, forward and backward. */
+    static final double MIN_SPEED = 0.25;
+
     @Parameters(
             arity = "0..1",
             paramLabel = "FILE|URL",
@@ -36,7 +39,9 @@ public final class PlayOptions {
             names = "--speed",
             paramLabel = "X",
             defaultValue = "1",
-            description = "Times the normal speed, negative for backward; -32 to 32.")
+            description =
+                    "Times the normal speed: 0.25 to 32, or -32 to -0.25 for backward, which begins"
+                            + " at the end unless --start says where.")
     double speed;
 
     @Option(
@@ -77,7 +82,9 @@ public final class PlayOptions {
     @Option(names = "--no-window", description = "Play in the terminal.")
     boolean noWindow;
 
-    @Option(names = "--stats", description = "Tell afterwards how quickly and how smoothly it went.")
+    @Option(
+            names = "--stats",
+            description = "Tell afterwards how quickly and how smoothly it went.")
     boolean stats;
 
     /** What stands in a window's title bar: the file's name, or the whole URL. */

@@ -7,8 +7,10 @@ import picocli.CommandLine.TypeConversionException;
 /** A section to repeat, in milliseconds: written A-B or, with plain seconds, A:B. */
 record Section(int from, int to) {
     static Section parse(String text) {
-        int cut = text.indexOf(text.indexOf('-') > 0 ? '-' : ':');
-        if (cut <= 0) {
+        int cut = text.indexOf('-') > 0 ? text.indexOf('-') : text.indexOf(':');
+        boolean isOfSeconds = text.indexOf('-') < 0;
+        // Which of several colons parts the times, nobody can tell.
+        if (cut <= 0 || isOfSeconds && cut != text.lastIndexOf(':')) {
             throw new TypeConversionException(
                     "'" + text + "' is not a section; write 10:20 for seconds, or 0:10-0:20");
         }

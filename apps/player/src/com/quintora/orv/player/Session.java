@@ -9,6 +9,7 @@ import com.quintora.mmp.PlayerListener;
 import com.quintora.mmp.VideoTrack;
 import java.io.IOException;
 import java.nio.file.AccessDeniedException;
+import java.nio.file.Files;
 import java.nio.file.NoSuchFileException;
 import java.nio.file.Path;
 import java.util.Locale;
@@ -51,9 +52,7 @@ public final class Session implements AutoCloseable {
             player.setSurface(frames.reader().getSurface());
             frames.start();
             player.prepare();
-            if (options.start > 0) {
-                player.seekTo(options.start);
-            }
+            goToStart();
             frameRate = player.tracks().currentVideo().map(VideoTrack::frameRate).orElse(0.0);
             frames.expect(frameRate);
             applyOptions();
@@ -114,7 +113,7 @@ public final class Session implements AutoCloseable {
     public void addSubtitles(String path) throws Failure {
         int before = player.tracks().subtitles().size();
         if (path.toLowerCase(Locale.ROOT).endsWith(".idx")) {
-            player.subtitles().add(path.substring(0, path.length() - 3) + "sub", path);
+            player.subtitles().add(picturesOf(path), path);
         } else {
             player.subtitles().add(path);
         }
@@ -167,12 +166,39 @@ public final class Session implements AutoCloseable {
     }
 
     private static ChannelStreamSource openStream(String file) throws IOException {
+        if (file.isEmpty()) {
+            throw new IOException("the path is empty");
+        }
+        if (Files.isDirectory(Path.of(file))) {
+            throw new IOException(file + ": is a directory");
+        }
         try {
             return ChannelStreamSource.open(Path.of(file));
         } catch (NoSuchFileException e) {
             throw new IOException(file + ": no such file", e);
         } catch (AccessDeniedException e) {
             throw new IOException(file + ": may not be read", e);
+        }
+    }
+
+    private void goToStart() throws Failure {
+        int duration = player.getDuration();
+        Section section = options.section;
+        if (section != null && !player.trickPlay().canSeekAt(1)) {
+            throw new Failure("no section of '" + options.source + "' can be repeated");
+        }
+        if (duration > 0 && section != null && section.to() > duration) {
+            throw Failure.endsBefore(options.source, duration, "the section does");
+        }
+        if (duration > 0 && options.start > duration) {
+            throw Failure.endsBefore(options.source, duration, "that moment");
+        }
+        int start = section != null ? section.from() : options.start;
+        if (start == 0 && options.speed < 0) {
+            start = duration;
+        }
+        if (start > 0) {
+            seekTo(start);
         }
     }
 
@@ -207,10 +233,24 @@ public final class Session implements AutoCloseable {
         }
     }
 
+    /** A VobSub pair's other file: film.sub of film.idx, FILM.SUB of FILM.IDX. */
+    static String picturesOf(String index) {
+        StringBuilder path = new StringBuilder(index);
+        for (int i = 0; i < 3; i++) {
+            int at = index.length() - 3 + i;
+            char letter = "sub".charAt(i);
+            boolean isCapital = Character.isUpperCase(index.charAt(at));
+            path.setCharAt(at, isCapital ? Character.toUpperCase(letter) : letter);
+        }
+        return path.toString();
+    }
+
     private static String noTrack(String kind, int index, int count) {
-        return count == 0
-                ? "the media has no " + kind + " track"
-                : "there is no " + kind + " track " + index + "; they are 0 to " + (count - 1);
+        if (count == 0) {
+            return "the media has no " + kind + " track";
+        }
+        String known = count == 1 ? "the only one is 0" : "they are 0 to " + (count - 1);
+        return "there is no " + kind + " track " + index + "; " + known;
     }
 
     private final class Ending implements PlayerListener {

@@ -39,6 +39,7 @@ final class Stopwatch {
                             (endMs - startMs) / 1000.0,
                             (endNs - startNs) / 1e9));
         }
-        return text + String.format("%d frames shown, %d dropped", frames.shown(), frames.dropped());
+        return text
+                + String.format("%d frames shown, %d dropped", frames.shown(), frames.dropped());
     }
 }

@@ -93,8 +93,7 @@ final class ThumbnailCommand implements Callable<Integer> {
         }
         int duration = player.getDuration();
         if (duration > 0 && at > duration) {
-            throw new Failure(
-                    "'" + source + "' ends at " + Times.clock(duration) + ", before that moment");
+            throw Failure.endsBefore(source, duration, "that moment");
         }
         player.seekTo(at);
         stepTo(player);

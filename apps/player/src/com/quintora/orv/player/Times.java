@@ -11,6 +11,8 @@ public final class Times {
     private static final Pattern CLOCK =
             Pattern.compile("(?:(?:(\\d{1,3}):)?(\\d{1,4}):)?(\\d{1,7}(?:\\.\\d+)?)");
 
+    private static final String UNKNOWN = "–:––";
+
     private Times() {}
 
     /** Milliseconds as m:ss, or h:mm:ss from an hour on. Negative times are shown as 0. */
@@ -20,6 +22,11 @@ public final class Times {
         return hours > 0
                 ? String.format("%d:%02d:%02d", hours, seconds / 60 % 60, seconds % 60)
                 : String.format("%d:%02d", seconds / 60, seconds % 60);
+    }
+
+    /** How long media are, as clock tells it, or dashes for 0, which means that nobody knows. */
+    public static String length(long millis) {
+        return millis > 0 ? clock(millis) : UNKNOWN;
     }
 
     /** Milliseconds of a text such as 75.5, 1:15.5 or 0:01:15.5. */

@@ -59,7 +59,8 @@ class ArgumentsTest {
     }
 
     @ParameterizedTest
-    @ValueSource(strings = {"", "5", ":5", "5:", "5:5", "6:5", "a:b", "-5:5"})
+    @ValueSource(
+            strings = {"", "5", ":5", "5:", "5:5", "6:5", "a:b", "-5:5", "1:10:20", "1:10:1:20"})
     void whatIsNoSectionIsRefused(String text) {
         assertThrows(TypeConversionException.class, () -> Section.parse(text));
     }
@@ -76,7 +77,8 @@ class ArgumentsTest {
         assertEquals(bits, pcm.bitsPerSample);
         assertEquals(bigEndian, pcm.bigEndian);
         assertEquals(blockAlign, pcm.blockAlign);
-        assertEquals(text, pcm.sampleRate + ":" + pcm.channelNumber + text.substring(text.lastIndexOf(':')));
+        String format = text.substring(text.lastIndexOf(':'));
+        assertEquals(text, pcm.sampleRate + ":" + pcm.channelNumber + format);
     }
 
     @ParameterizedTest

@@ -7,7 +7,9 @@ import static org.junit.jupiter.api.Assertions.assertTrue;
 import com.google.gson.JsonObject;
 import com.google.gson.JsonParser;
 import com.quintora.mmp.Media;
+import java.nio.file.Path;
 import org.junit.jupiter.api.Test;
+import org.junit.jupiter.api.io.TempDir;
 
 /** What info tells, to programs and to people. */
 class InfoCommandTest {
@@ -47,6 +49,17 @@ class InfoCommandTest {
         assertTrue(info.out().contains("audio 1       "), info.out());
         assertTrue(info.out().contains("German \"Kommentar (größer)\""), info.out());
         assertTrue(info.outLines().contains("chapter 1     0:02.500  Глава вторая"), info.out());
+    }
+
+    @Test
+    void metadataHaveNoPowerOverTheTerminal(@TempDir Path folder) throws Exception {
+        Path file = folder.resolve("odd.mkv");
+        Media.run("ffmpeg", "-nostdin", "-v", "error", "-i", Media.path("silent.mkv"), "-c", "copy",
+                "-metadata", "title=\033[31mred\u009b2J\r\nline two\t!", file.toString());
+        Cli info = Cli.run("info", file.toString());
+        assertEquals(0, info.status(), info.err());
+        assertTrue(info.outLines().contains("title         [31mred 2J line two !"), info.out());
+        assertTrue(info.out().chars().noneMatch(c -> c != '\n' && Character.isISOControl(c)));
     }
 
     @Test

@@ -5,11 +5,16 @@ import static org.junit.jupiter.api.Assertions.assertEquals;
 import static org.junit.jupiter.api.Assertions.assertTrue;
 
 import com.quintora.mmp.Media;
+import java.nio.file.Files;
+import java.nio.file.Path;
 import java.util.regex.Matcher;
 import java.util.regex.Pattern;
+import java.util.stream.Stream;
 import org.junit.jupiter.api.Test;
+import org.junit.jupiter.api.io.TempDir;
 import org.junit.jupiter.params.ParameterizedTest;
 import org.junit.jupiter.params.provider.CsvSource;
+import picocli.CommandLine;
 
 /** Playing in the terminal, with its options, to the end of the media. */
 class PlayCommandTest {
@@ -44,6 +49,16 @@ class PlayCommandTest {
     }
 
     @Test
+    void backwardBeginsAtTheEnd() throws Exception {
+        PlayOptions options = new PlayOptions();
+        new CommandLine(options).parseArgs("--speed", "-1", Media.path("short.mp4"));
+        try (Session session = new Session(options, image -> {})) {
+            session.open();
+            assertTrue(session.player().getCurrentPosition() >= 1_900);
+        }
+    }
+
+    @Test
     void aStreamPlaysAsTheFileDoes() throws Exception {
         assertEquals(3, play("short.mp4", "--stream").media, 0.2);
     }
@@ -64,9 +79,9 @@ class PlayCommandTest {
     @ParameterizedTest
     @CsvSource({
         "--audio-track, 2, 'there is no sound track 2; they are 0 to 1'",
+        "--audio-track, -1, 'there is no sound track -1; they are 0 to 1'",
         "--subtitle-track, 7, 'there is no subtitle track 7; they are 0 to 1'",
-        "--subtitle, /none.srt, 'cannot read subtitles from ''/none.srt'''",
-        "--speed, 99, 'this media cannot be played at speed 99.0'"
+        "--subtitle, /none.srt, 'cannot read subtitles from ''/none.srt'''"
     })
     void whatTheMediaCannotDoIsOneSentence(String option, String value, String sentence)
             throws Exception {
@@ -76,18 +91,76 @@ class PlayCommandTest {
     }
 
     @ParameterizedTest
-    @CsvSource({"--start, soon", "--volume, 101", "--ab, 5", "--pcm, x", "--speed, fast"})
+    @CsvSource({
+        "--start, soon", "--volume, 101", "--ab, 5", "--pcm, x", "--speed, fast", "--speed, 99",
+        "--speed, 0.1", "--speed, -33", "--speed, NaN"
+    })
     void whatIsNoArgumentIsAQuestionOfUsage(String option, String value) {
         Cli run = Cli.run("play", "--no-window", "some.mkv", option, value);
         assertEquals(2, run.status());
         assertEquals("orv: see ./orv play --help", run.errLines().get(1));
     }
 
-    @Test
-    void aStreamThatIsMissingIsOneSentence() {
-        Cli run = Cli.run("play", "--no-window", "--stream", "/none.mkv");
+    @ParameterizedTest
+    @CsvSource({
+        "--ab 1:2 --speed -1 some.mkv, --ab repeats a section forward; --speed is negative",
+        "--ab 1:2 --start 1 some.mkv, --ab begins at the section's start; leave --start out",
+        "--pcm 44100:2:s16le, --pcm describes a file of raw PCM; name the file"
+    })
+    void whatDoesNotGoTogetherIsAQuestionOfUsage(String arguments, String sentence) {
+        Cli run = Cli.run(("play --no-window " + arguments).split(" "));
+        assertEquals(2, run.status());
+        assertEquals("orv: " + sentence, run.errLines().get(0));
+    }
+
+    @ParameterizedTest
+    @CsvSource({"--start, 4, that moment", "--ab, 2:4, the section does"})
+    void whatLiesBeyondTheMediaIsOneSentence(String option, String value, String what)
+            throws Exception {
+        String media = Media.path("short.mp4");
+        Cli run = Cli.run("play", "--no-window", media, option, value);
         assertEquals(1, run.status());
-        assertEquals("orv: /none.mkv: no such file\n", run.err());
+        assertEquals("orv: '" + media + "' ends at 0:03, before " + what + "\n", run.err());
+    }
+
+    @Test
+    void whatIsWrongWithArgumentsIsSaidInPlainWords() {
+        assertUsage("'x' is not a whole number", "--audio-track", "x", "some.mkv");
+        assertUsage("'x' is not a number", "--speed", "x", "some.mkv");
+        assertUsage("orv: too many arguments: b c", "a", "b", "c");
+        assertUsage("orv: Unknown option: '--sped'", "--sped");
+    }
+
+    private static void assertUsage(String words, String... arguments) {
+        String[] all = Stream.concat(Stream.of("play", "--no-window"), Stream.of(arguments))
+                .toArray(String[]::new);
+        Cli run = Cli.run(all);
+        assertEquals(2, run.status());
+        assertTrue(run.errLines().get(0).endsWith(words), run.err());
+    }
+
+    @Test
+    void aPairOfSubtitleFilesMayHaveCapitalNames(@TempDir Path folder) throws Exception {
+        Files.copy(Path.of(Media.path("words.idx")), folder.resolve("WORDS.IDX"));
+        Files.copy(Path.of(Media.path("words.sub")), folder.resolve("WORDS.SUB"));
+        play("short.mp4", "--subtitle", folder.resolve("WORDS.IDX").toString(), "--start", "2");
+    }
+
+    @Test
+    void anEmptyNameIsOneSentence() {
+        Cli run = Cli.run("play", "--no-window", "");
+        assertEquals(1, run.status());
+        assertEquals("orv: the path is empty\n", run.err());
+    }
+
+    @ParameterizedTest
+    @CsvSource({
+        "/none.mkv, /none.mkv: no such file", "/, /: is a directory", "'', the path is empty"
+    })
+    void whatIsNoStreamIsOneSentence(String source, String sentence) {
+        Cli run = Cli.run("play", "--no-window", "--stream", source);
+        assertEquals(1, run.status());
+        assertEquals("orv: " + sentence + "\n", run.err());
     }
 
     @Test

@@ -13,6 +13,7 @@ import java.nio.file.Path;
 import java.util.ArrayList;
 import java.util.Arrays;
 import java.util.List;
+import java.util.Map;
 import java.util.concurrent.TimeUnit;
 import org.junit.jupiter.api.AfterEach;
 import org.junit.jupiter.api.Test;
@@ -68,16 +69,45 @@ class PlayProcessTest {
         assertEquals("", err());
     }
 
+    @Test
+    void waylandAloneIsNoDisplay() throws Exception {
+        begin("silent", Map.of("WAYLAND_DISPLAY", "wayland-0"), "play", Media.path("short.mp4"));
+        Wait.until("it ends", () -> !process.isAlive());
+        assertEquals(0, process.exitValue(), this::all);
+        assertTrue(out().contains("shown"), this::all);
+    }
+
+    @Test
+    void aDisplayThatIsGoneIsOneSentence() throws Exception {
+        Map<String, String> stale = Map.of("DISPLAY", "unix:/none");
+        begin("silent", stale, "play", Media.path("short.mp4"));
+        Wait.until("it ends", () -> !process.isAlive());
+        assertEquals(1, process.exitValue(), this::all);
+        assertEquals(
+                "orv: cannot open a window on display unix:/none;"
+                        + " --no-window plays in the terminal\n",
+                err());
+    }
+
     private void play(String log, String... arguments) throws IOException {
+        List<String> command = new ArrayList<>(List.of("play", "--no-window"));
+        command.addAll(Arrays.asList(arguments));
+        begin(log, Map.of(), command.toArray(String[]::new));
+    }
+
+    /** Starts it on those displays, and on no other. */
+    private void begin(String log, Map<String, String> displays, String... arguments)
+            throws IOException {
         List<String> command = new ArrayList<>();
         command.add(Path.of(System.getProperty("java.home"), "bin", "java").toString());
         command.add("-Djava.library.path=" + System.getProperty("java.library.path"));
         command.add("-Dorv.columns=80");
         command.addAll(
                 Arrays.asList("-cp", System.getProperty("java.class.path"), Main.class.getName()));
-        command.addAll(Arrays.asList("play", "--no-window"));
         command.addAll(Arrays.asList(arguments));
         ProcessBuilder builder = new ProcessBuilder(command);
+        builder.environment().keySet().removeAll(List.of("DISPLAY", "WAYLAND_DISPLAY"));
+        builder.environment().putAll(displays);
         builder.environment().put("ORV_LOG", log);
         process =
                 builder.redirectOutput(folder.resolve("out").toFile())

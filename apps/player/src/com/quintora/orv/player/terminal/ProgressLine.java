@@ -16,7 +16,7 @@ final class ProgressLine {
     static String bar(Snapshot now, int columns) {
         String state = now.playing() ? "▶ " : "⏸ ";
         String head = state + Times.clock(now.positionMs()) + " ";
-        String tail = " " + Times.clock(now.durationMs()) + "  " + details(now);
+        String tail = " " + Times.length(now.durationMs()) + "  " + details(now);
         int room = Math.min(MAX_BAR, columns - 1 - head.length() - tail.length());
         String line = room < MIN_BAR ? head + "/" + tail : head + drawBar(now, room) + tail;
         return line.length() < columns ? line : line.substring(0, Math.max(0, columns - 1));
@@ -24,12 +24,15 @@ final class ProgressLine {
 
     /** One line for logs, in words. */
     static String plain(Snapshot now) {
-        return String.format(
-                Locale.ROOT,
-                "%.1f s of %.1f s, %s",
-                now.positionMs() / 1000.0,
-                now.durationMs() / 1000.0,
-                details(now));
+        return seconds(now.positionMs())
+                + " of "
+                + (now.durationMs() > 0 ? seconds(now.durationMs()) : "unknown length")
+                + ", "
+                + details(now);
+    }
+
+    private static String seconds(int millis) {
+        return String.format(Locale.ROOT, "%.1f s", millis / 1000.0);
     }
 
     private static String details(Snapshot now) {

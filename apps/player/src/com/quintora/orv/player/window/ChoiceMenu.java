@@ -37,8 +37,10 @@ final class ChoiceMenu {
         private final Choice choice;
 
         Item(Choice choice) {
-            super(choice.text);
             this.choice = choice;
+            // The media's own words are never markup.
+            putClientProperty("html.disable", true);
+            setText(choice.text);
             setFont(Theme.BODY);
             setBorder(null);
             addActionListener(event -> choice.action.run());

@@ -4,6 +4,7 @@ package com.quintora.orv.player.window;
 import com.quintora.mmp.MediaException;
 import com.quintora.mmp.OrvMediaPlayer;
 import com.quintora.mmp.PlayerListener;
+import com.quintora.mmp.PlayerState;
 import com.quintora.orv.player.Failure;
 import com.quintora.orv.player.PlayOptions;
 import com.quintora.orv.player.Session;
@@ -27,7 +28,7 @@ final class Conductor implements Controls {
     private static final int NO_SEEK = -1;
 
     /** A call of the player's. */
-    private interface Command {
+    interface Command {
         void run() throws Failure;
     }
 
@@ -60,20 +61,40 @@ final class Conductor implements Controls {
 
     /** Opens the media and plays it; the window tells what becomes of it. */
     void begin() {
-        worker.execute(
-                () -> {
-                    try {
-                        session.open();
-                        details.read();
-                        EventQueue.invokeLater(() -> stage.showMedia(details, volume));
-                        session.start();
-                        worker.scheduleWithFixedDelay(this::poll, 0, POLL_MS, TimeUnit.MILLISECONDS);
-                    } catch (Failure e) {
-                        fail(e);
-                    } catch (IllegalStateException e) {
-                        // The window was closed meanwhile.
-                    }
-                });
+        worker.execute(() -> failOn(this::openAndPlay));
+    }
+
+    private void openAndPlay() throws Failure {
+        session.open();
+        details.read();
+        EventQueue.invokeLater(() -> stage.showMedia(details, volume));
+        session.start();
+        worker.scheduleWithFixedDelay(
+                () -> failOn(this::poll), 0, POLL_MS, TimeUnit.MILLISECONDS);
+    }
+
+    /** Runs what the playback cannot go on without. */
+    void failOn(Command command) {
+        try {
+            command.run();
+        } catch (Failure e) {
+            fail(e);
+        } catch (RuntimeException e) {
+            if (player.getState() != PlayerState.RELEASED) {
+                fail(new Failure(sentence(e), e));
+            }
+            // Otherwise the window was closed meanwhile. Nothing is left to poll in either case.
+            worker.shutdown();
+        }
+    }
+
+    // Exceptions that are no answer of the player's rarely have words that say enough.
+    private static String sentence(Exception e) {
+        boolean isAnswer =
+                e instanceof Failure
+                        || e instanceof IllegalStateException
+                        || e instanceof IllegalArgumentException;
+        return isAnswer && e.getMessage() != null ? e.getMessage() : "the player failed: " + e;
     }
 
     void end() {
@@ -105,12 +126,18 @@ final class Conductor implements Controls {
     // A seek ends at the key frame before its goal. Where key frames are so far apart that this
     // leads back, the goal moves on.
     private void skipFrom(int from, int millis) {
-        int end = player.getDuration();
+        int duration = player.getDuration();
         int goal = from;
         do {
-            goal = Math.max(0, Math.min(goal + millis, end));
+            goal = goalOf(goal, millis, duration);
             session.seekTo(goal);
-        } while (millis > 0 && goal < end && player.getCurrentPosition() <= from);
+        } while (millis > 0 && goal < duration && player.getCurrentPosition() <= from);
+    }
+
+    /** Where a skip leads, in milliseconds; without a duration (0) nobody knows where to stop. */
+    static int goalOf(int from, int millis, int duration) {
+        long end = duration > 0 ? duration : Integer.MAX_VALUE;
+        return (int) Math.max(0, Math.min((long) from + millis, end));
     }
 
     // While the knob is dragged only its latest place counts.
@@ -201,8 +228,8 @@ final class Conductor implements Controls {
                                         index -> later(() -> session.selectSubtitle(index)))));
     }
 
-    private static void openMenu(Component above, String title, List<ChoiceMenu.Choice> choices) {
-        EventQueue.invokeLater(() -> ChoiceMenu.open(above, title, choices));
+    private void openMenu(Component above, String title, List<ChoiceMenu.Choice> choices) {
+        EventQueue.invokeLater(() -> stage.openMenu(above, title, choices));
     }
 
     @Override
@@ -211,8 +238,13 @@ final class Conductor implements Controls {
     }
 
     @Override
-    public void leaveFullScreen() {
-        stage.leaveFullScreen();
+    public void leave() {
+        stage.leave();
+    }
+
+    @Override
+    public void toggleHelp() {
+        stage.toggleHelp();
     }
 
     @Override
@@ -236,23 +268,23 @@ final class Conductor implements Controls {
     private void carryOut(Command command) {
         try {
             command.run();
-        } catch (Failure | IllegalStateException | IllegalArgumentException e) {
-            if (failure == null) {
-                EventQueue.invokeLater(() -> stage.tell(e.getMessage()));
+        } catch (Failure | RuntimeException e) {
+            if (failure == null && player.getState() != PlayerState.RELEASED) {
+                EventQueue.invokeLater(() -> stage.tell(sentence(e)));
             }
         }
     }
 
     private void poll() {
-        try {
-            Snapshot now = session.snapshot();
-            EventQueue.invokeLater(() -> stage.show(now));
-        } catch (IllegalStateException e) {
-            worker.shutdown();
-        }
+        Snapshot now = session.snapshot();
+        EventQueue.invokeLater(() -> stage.show(now));
     }
 
-    private void fail(Failure problem) {
+    // The first failure is the cause of what follows.
+    private synchronized void fail(Failure problem) {
+        if (failure != null) {
+            return;
+        }
         failure = problem;
         System.err.println("orv: " + problem.getMessage());
         EventQueue.invokeLater(() -> stage.showFailure(problem.getMessage()));

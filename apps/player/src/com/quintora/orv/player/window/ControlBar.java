@@ -12,10 +12,13 @@ import javax.swing.JPanel;
 
 /** The row of controls under the picture. */
 final class ControlBar extends JPanel {
+    /** How much a key or a click on a button changes the volume. */
+    static final double VOLUME_STEP = 0.05;
+
     private static final int SKIP_MS = 10_000;
 
-    private final JLabel elapsed = label();
-    private final JLabel total = label();
+    private final JLabel elapsed = label(Times.clock(0));
+    private final JLabel total = label(Times.length(0));
     private final SeekBar seekBar;
     private final FlatButton play;
     private final FlatButton back;
@@ -25,11 +28,12 @@ final class ControlBar extends JPanel {
     private final FlatButton speed;
     private final FlatButton audio;
     private final FlatButton subtitles;
+    private final FlatButton help;
     private final FlatButton fullScreen;
 
     ControlBar(Controls controls) {
         super(new BorderLayout(0, 4));
-        seekBar = new SeekBar(controls::seekTo);
+        seekBar = new SeekBar(controls::seekTo, step -> controls.skip(step * SKIP_MS));
         play = new FlatButton(Glyph.PLAY, "Play (Space)", controls::togglePlaying);
         back =
                 new FlatButton(
@@ -38,9 +42,19 @@ final class ControlBar extends JPanel {
                 new FlatButton(
                         Glyph.FORWARD, "On 10 seconds (Right)", () -> controls.skip(SKIP_MS));
         mute = new FlatButton(Glyph.VOLUME, "Mute (M)", controls::toggleMuted);
-        volume = new LevelBar("Volume", 90, controls::setVolume);
-        speed = new FlatButton(null, "Speed", () -> controls.chooseSpeed(speedButton()));
-        audio = new FlatButton(Glyph.AUDIO, "Sound track (A)", () -> controls.chooseAudio(audioButton()));
+        volume =
+                new LevelBar(
+                        "Volume",
+                        90,
+                        controls::setVolume,
+                        step -> controls.changeVolume(step * VOLUME_STEP));
+        volume.setToolTipText("Volume (Up, Down)");
+        speed = new FlatButton(null, "Speed ([ ])", () -> controls.chooseSpeed(speedButton()));
+        audio =
+                new FlatButton(
+                        Glyph.AUDIO,
+                        "Sound track (A)",
+                        () -> controls.chooseAudio(audioButton()));
         subtitles =
                 new FlatButton(
                         Glyph.SUBTITLES,
@@ -49,6 +63,8 @@ final class ControlBar extends JPanel {
         fullScreen =
                 new FlatButton(
                         Glyph.FULL_SCREEN, "Full screen (F)", controls::toggleFullScreen);
+        help = new FlatButton(null, "Keys (H)", controls::toggleHelp);
+        help.setText("?");
         speed.setText(Speeds.label(1));
         setBackground(Theme.PANEL);
         setBorder(BorderFactory.createEmptyBorder(8, 14, 10, 14));
@@ -74,7 +90,7 @@ final class ControlBar extends JPanel {
 
     void show(Snapshot now) {
         elapsed.setText(Times.clock(now.positionMs()));
-        total.setText(Times.clock(now.durationMs()));
+        total.setText(Times.length(now.durationMs()));
         seekBar.showPosition(now.positionMs(), now.durationMs(), now.bufferedPercent());
         play.show(
                 now.playing() ? Glyph.PAUSE : Glyph.PLAY,
@@ -130,12 +146,13 @@ final class ControlBar extends JPanel {
         row.add(speed);
         row.add(audio);
         row.add(subtitles);
+        row.add(help);
         row.add(fullScreen);
         return row;
     }
 
-    private static JLabel label() {
-        JLabel label = new JLabel("0:00");
+    private static JLabel label(String text) {
+        JLabel label = new JLabel(text);
         label.setFont(Theme.SMALL);
         label.setForeground(Theme.MUTED);
         return label;

@@ -33,7 +33,10 @@ interface Controls {
 
     void toggleFullScreen();
 
-    void leaveFullScreen();
+    /** Closes the list of keys, or else leaves the full screen. */
+    void leave();
+
+    void toggleHelp();
 
     void quit();
 }

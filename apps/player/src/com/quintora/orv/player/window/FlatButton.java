@@ -16,7 +16,8 @@ final class FlatButton extends JButton {
     FlatButton(Glyph glyph, String tip, Runnable action) {
         this.glyph = glyph;
         describe(tip);
-        setFocusable(false);
+        // The keyboard gets here by Tab; a click shall not take the keys along.
+        setRequestFocusEnabled(false);
         setOpaque(false);
         setContentAreaFilled(false);
         setBorderPainted(false);
@@ -54,6 +55,7 @@ final class FlatButton extends JButton {
             g.fillRoundRect(0, 0, getWidth(), getHeight(), Theme.CORNER, Theme.CORNER);
         }
         paintContent(g);
+        Theme.paintFocus(g, this);
         g.dispose();
     }
 

@@ -9,6 +9,7 @@ import java.awt.event.MouseEvent;
 import java.awt.image.BufferedImage;
 import javax.swing.JComponent;
 import javax.swing.JFrame;
+import javax.swing.MenuSelectionManager;
 import javax.swing.Timer;
 
 /** The window over the whole screen; its controls and pointer hide while the mouse rests. */
@@ -63,14 +64,19 @@ final class FullScreen {
         }
     }
 
-    private void showControls() {
+    /** Shows them, for a while at least. */
+    void showControls() {
         controls.setVisible(true);
+        frame.validate();
         frame.getRootPane().setCursor(null);
         rest.restart();
     }
 
     private void hideControls() {
-        if (on && playing) {
+        boolean aMenuIsOpen = MenuSelectionManager.defaultManager().getSelectedPath().length > 0;
+        if (aMenuIsOpen) {
+            rest.restart();
+        } else if (on && playing) {
             controls.setVisible(false);
             frame.getRootPane().setCursor(noCursor);
         }

@@ -2,50 +2,102 @@
 package com.quintora.orv.player.window;
 
 import java.awt.event.ActionEvent;
-import java.util.Map;
-import java.util.TreeMap;
+import java.util.ArrayList;
+import java.util.List;
 import javax.swing.AbstractAction;
 import javax.swing.JComponent;
 import javax.swing.KeyStroke;
 
 /** The window's keys. */
 final class Keys {
-    private Keys() {}
+    private final JComponent root;
+    private final Controls controls;
+    private final List<Help.Line> lines = new ArrayList<>();
 
-    static void bind(JComponent root, Controls controls, ControlBar bar) {
-        actions(controls, bar).forEach((key, action) -> bind(root, key, action));
+    private Keys(JComponent root, Controls controls) {
+        this.root = root;
+        this.controls = controls;
     }
 
-    private static Map<String, Runnable> actions(Controls controls, ControlBar bar) {
-        Map<String, Runnable> keys = new TreeMap<>();
-        keys.put("SPACE", controls::togglePlaying);
-        keys.put("K", controls::togglePlaying);
-        keys.put("LEFT", () -> controls.skip(-10_000));
-        keys.put("RIGHT", () -> controls.skip(10_000));
-        keys.put("shift LEFT", () -> controls.skip(-1_000));
-        keys.put("shift RIGHT", () -> controls.skip(1_000));
-        keys.put("PAGE_UP", () -> controls.skip(-60_000));
-        keys.put("PAGE_DOWN", () -> controls.skip(60_000));
-        keys.put("HOME", () -> controls.seekTo(0));
-        keys.put("COMMA", () -> controls.step(-1));
-        keys.put("PERIOD", () -> controls.step(1));
-        keys.put("UP", () -> controls.changeVolume(0.05));
-        keys.put("DOWN", () -> controls.changeVolume(-0.05));
-        keys.put("M", controls::toggleMuted);
-        keys.put("OPEN_BRACKET", () -> controls.changeSpeed(-1));
-        keys.put("CLOSE_BRACKET", () -> controls.changeSpeed(1));
-        keys.put("A", () -> controls.chooseAudio(bar.audioButton()));
-        keys.put("S", () -> controls.chooseSubtitles(bar.subtitlesButton()));
-        keys.put("F", controls::toggleFullScreen);
-        keys.put("F11", controls::toggleFullScreen);
-        keys.put("ESCAPE", controls::leaveFullScreen);
-        keys.put("Q", controls::quit);
-        return keys;
+    /** Binds every key; gives what the help says of them. */
+    static List<Help.Line> bind(JComponent root, Controls controls, ControlBar bar) {
+        Keys keys = new Keys(root, controls);
+        keys.bindPlaying();
+        keys.bindSkips();
+        keys.bindSound();
+        keys.bindChoices(bar);
+        keys.bindWindow();
+        return keys.lines;
     }
 
-    private static void bind(JComponent root, String key, Runnable action) {
-        root.getInputMap(JComponent.WHEN_IN_FOCUSED_WINDOW).put(KeyStroke.getKeyStroke(key), key);
-        root.getActionMap()
+    private void bindPlaying() {
+        line("Space, K", "Play or pause");
+        on("SPACE", controls::togglePlaying);
+        on("K", controls::togglePlaying);
+        line("[  ]", "Slower, faster");
+        on("OPEN_BRACKET", () -> controls.changeSpeed(-1));
+        on("CLOSE_BRACKET", () -> controls.changeSpeed(1));
+        line(",  .", "One frame back, on");
+        on("COMMA", () -> controls.step(-1));
+        on("PERIOD", () -> controls.step(1));
+    }
+
+    private void bindSkips() {
+        line("Left, Right", "10 seconds back, on");
+        on("LEFT", () -> controls.skip(-10_000));
+        on("RIGHT", () -> controls.skip(10_000));
+        line("Shift+Left, Shift+Right", "1 second back, on");
+        on("shift LEFT", () -> controls.skip(-1_000));
+        on("shift RIGHT", () -> controls.skip(1_000));
+        line("Page Up, Page Down", "1 minute back, on");
+        on("PAGE_UP", () -> controls.skip(-60_000));
+        on("PAGE_DOWN", () -> controls.skip(60_000));
+        line("Home", "To the start");
+        on("HOME", () -> controls.seekTo(0));
+    }
+
+    private void bindSound() {
+        line("Up, Down", "Louder, softer");
+        on("UP", () -> controls.changeVolume(ControlBar.VOLUME_STEP));
+        on("DOWN", () -> controls.changeVolume(-ControlBar.VOLUME_STEP));
+        line("M", "Sound off or on");
+        on("M", controls::toggleMuted);
+    }
+
+    private void bindChoices(ControlBar bar) {
+        line("A", "Sound track");
+        on("A", () -> controls.chooseAudio(bar.audioButton()));
+        line("S", "Subtitles");
+        on("S", () -> controls.chooseSubtitles(bar.subtitlesButton()));
+    }
+
+    private void bindWindow() {
+        line("F, F11", "Full screen");
+        on("F", controls::toggleFullScreen);
+        on("F11", controls::toggleFullScreen);
+        line("Escape", "Leave full screen or this list");
+        on("ESCAPE", controls::leave);
+        line("H, ?, F1", "This list");
+        on("H", controls::toggleHelp);
+        on("typed ?", controls::toggleHelp);
+        on("F1", controls::toggleHelp);
+        line("Q", "Close the window");
+        on("Q", controls::quit);
+    }
+
+    /** What to say of the keys that follow. */
+    private void line(String keys, String meaning) {
+        lines.add(new Help.Line(keys, meaning));
+    }
+
+    private void on(String key, Runnable action) {
+        bind(root, JComponent.WHEN_IN_FOCUSED_WINDOW, key, action);
+    }
+
+    /** While a component has the focus or, as the condition says, its window has. */
+    static void bind(JComponent component, int condition, String key, Runnable action) {
+        component.getInputMap(condition).put(KeyStroke.getKeyStroke(key), key);
+        component.getActionMap()
                 .put(
                         key,
                         new AbstractAction() {

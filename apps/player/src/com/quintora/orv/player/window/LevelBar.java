@@ -6,13 +6,18 @@ import java.awt.Cursor;
 import java.awt.Dimension;
 import java.awt.Graphics;
 import java.awt.Graphics2D;
+import java.awt.event.FocusEvent;
+import java.awt.event.FocusListener;
 import java.awt.event.MouseAdapter;
 import java.awt.event.MouseEvent;
 import java.util.function.DoubleConsumer;
-import javax.swing.JPanel;
+import java.util.function.IntConsumer;
+import javax.accessibility.AccessibleContext;
+import javax.swing.JComponent;
+import javax.swing.SwingUtilities;
 
-/** A horizontal bar from 0 to 1 that the mouse sets: the volume, or the place in the media. */
-class LevelBar extends JPanel {
+/** A horizontal bar from 0 to 1 that the user sets: the volume, or the place in the media. */
+class LevelBar extends JComponent {
     private static final int THICKNESS = 4;
     private static final int KNOB = 12;
 
@@ -22,9 +27,9 @@ class LevelBar extends JPanel {
     private boolean dragged;
     private boolean hovered;
 
-    LevelBar(String name, int width, DoubleConsumer onSet) {
+    /** The keys step by -1 or 1; what a step is, the listener decides. */
+    LevelBar(String name, int width, DoubleConsumer onSet, IntConsumer onStep) {
         this.onSet = onSet;
-        setOpaque(false);
         setPreferredSize(new Dimension(width, 20));
         setMinimumSize(new Dimension(40, 20));
         setCursor(Cursor.getPredefinedCursor(Cursor.HAND_CURSOR));
@@ -32,15 +37,58 @@ class LevelBar extends JPanel {
         Mouse mouse = new Mouse();
         addMouseListener(mouse);
         addMouseMotionListener(mouse);
+        bindKeys(onStep);
+    }
+
+    private void bindKeys(IntConsumer onStep) {
+        setFocusable(true);
+        addFocusListener(new Focus());
+        onKey("LEFT", () -> onStep.accept(-1));
+        onKey("DOWN", () -> onStep.accept(-1));
+        onKey("RIGHT", () -> onStep.accept(1));
+        onKey("UP", () -> onStep.accept(1));
+        onKey("HOME", () -> onSet.accept(0));
+        onKey("END", () -> onSet.accept(1));
+    }
+
+    private void onKey(String key, Runnable action) {
+        Keys.bind(this, WHEN_FOCUSED, key, action);
     }
 
     /** Shows a level unless the user is just setting one; behind is the pale bar under it. */
     final void showLevel(double level, double behind) {
         if (!dragged) {
-            this.level = clamp(level);
+            changeLevel(clamp(level));
         }
         this.behind = clamp(behind);
         repaint();
+    }
+
+    private void changeLevel(double level) {
+        int before = value();
+        this.level = level;
+        repaint();
+        if (value() != before) {
+            getAccessibleContext()
+                    .firePropertyChange(
+                            AccessibleContext.ACCESSIBLE_VALUE_PROPERTY, before, value());
+        }
+    }
+
+    /** As if the user had set it. */
+    final void set(double level) {
+        changeLevel(clamp(level));
+        onSet.accept(this.level);
+    }
+
+    /** The level in the units that people know: percent, unless a subclass has others. */
+    final int value() {
+        return (int) Math.round(level * maximum());
+    }
+
+    /** The value of the level 1. */
+    int maximum() {
+        return 100;
     }
 
     final double levelAt(int x) {
@@ -52,16 +100,25 @@ class LevelBar extends JPanel {
     }
 
     @Override
+    public final AccessibleContext getAccessibleContext() {
+        if (accessibleContext == null) {
+            accessibleContext = new AccessibleLevel(this);
+        }
+        return accessibleContext;
+    }
+
+    @Override
     protected void paintComponent(Graphics graphics) {
         Graphics2D g = Theme.smooth(graphics);
         fillTo(g, 1, Theme.TRACK);
         fillTo(g, behind, Theme.BUFFERED);
         fillTo(g, level, isEnabled() ? Theme.ACCENT : Theme.BUFFERED);
         paintMarks(g);
-        if (isEnabled() && (hovered || dragged)) {
+        if (isEnabled() && (hovered || dragged || isFocusOwner())) {
             g.setColor(Theme.TEXT);
             g.fillOval((int) (xOf(level) - KNOB / 2.0), (getHeight() - KNOB) / 2, KNOB, KNOB);
         }
+        Theme.paintFocus(g, this);
         g.dispose();
     }
 
@@ -83,10 +140,22 @@ class LevelBar extends JPanel {
         return Math.max(0, Math.min(1, value));
     }
 
+    private final class Focus implements FocusListener {
+        @Override
+        public void focusGained(FocusEvent event) {
+            repaint();
+        }
+
+        @Override
+        public void focusLost(FocusEvent event) {
+            repaint();
+        }
+    }
+
     private final class Mouse extends MouseAdapter {
         @Override
         public void mousePressed(MouseEvent event) {
-            if (isEnabled()) {
+            if (isEnabled() && SwingUtilities.isLeftMouseButton(event)) {
                 dragged = true;
                 mouseDragged(event);
             }
@@ -95,15 +164,15 @@ class LevelBar extends JPanel {
         @Override
         public void mouseDragged(MouseEvent event) {
             if (dragged) {
-                level = levelAt(event.getX());
-                onSet.accept(level);
-                repaint();
+                set(levelAt(event.getX()));
             }
         }
 
         @Override
         public void mouseReleased(MouseEvent event) {
-            dragged = false;
+            if (SwingUtilities.isLeftMouseButton(event)) {
+                dragged = false;
+            }
         }
 
         @Override

@@ -79,8 +79,8 @@ final class MediaDetails {
         OptionalInt current = player.tracks().currentAudio();
         List<ChoiceMenu.Choice> choices = new ArrayList<>();
         for (AudioTrack track : player.tracks().audio()) {
-            choices.add(
-                    choice(TrackNames.of(track), isAt(current, track.index()), track.index(), select));
+            boolean isChosen = isAt(current, track.index());
+            choices.add(choice(TrackNames.of(track), isChosen, track.index(), select));
         }
         return choices;
     }
@@ -88,10 +88,12 @@ final class MediaDetails {
     List<ChoiceMenu.Choice> subtitleChoices(IntConsumer select) {
         OptionalInt current = player.tracks().currentSubtitle();
         List<ChoiceMenu.Choice> choices = new ArrayList<>();
-        choices.add(choice("Off", current.isEmpty(), -1, select));
         for (SubtitleTrack track : player.tracks().subtitles()) {
-            choices.add(
-                    choice(TrackNames.of(track), isAt(current, track.index()), track.index(), select));
+            boolean isChosen = isAt(current, track.index());
+            choices.add(choice(TrackNames.of(track), isChosen, track.index(), select));
+        }
+        if (!choices.isEmpty()) {
+            choices.add(0, choice("Off", current.isEmpty(), -1, select));
         }
         return choices;
     }

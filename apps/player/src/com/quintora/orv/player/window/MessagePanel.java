@@ -25,6 +25,8 @@ final class MessagePanel extends JPanel {
     MessagePanel() {
         super(new GridBagLayout());
         setBackground(Theme.STAGE);
+        // The media's own words are never markup.
+        title.putClientProperty("html.disable", true);
         title.setFont(Theme.TITLE);
         title.setForeground(Theme.TEXT);
         text.setFont(Theme.BODY.deriveFont(14f));
@@ -38,7 +40,7 @@ final class MessagePanel extends JPanel {
         words.setOpaque(false);
         words.add(title, BorderLayout.NORTH);
         words.add(text, BorderLayout.CENTER);
-        JPanel card = new Card();
+        JPanel card = new Card(new BorderLayout(20, 0));
         card.setBorder(BorderFactory.createEmptyBorder(24, 24, 24, 28));
         card.add(sign, BorderLayout.WEST);
         card.add(words, BorderLayout.CENTER);
@@ -67,21 +69,6 @@ final class MessagePanel extends JPanel {
         protected void paintComponent(Graphics graphics) {
             var g = Theme.smooth(graphics);
             glyph.paint(g, 0, 0, 44, color);
-            g.dispose();
-        }
-    }
-
-    private static final class Card extends JPanel {
-        Card() {
-            super(new BorderLayout(20, 0));
-            setOpaque(false);
-        }
-
-        @Override
-        protected void paintComponent(Graphics graphics) {
-            var g = Theme.smooth(graphics);
-            g.setColor(Theme.PANEL);
-            g.fillRoundRect(0, 0, getWidth(), getHeight(), 2 * Theme.CORNER, 2 * Theme.CORNER);
             g.dispose();
         }
     }

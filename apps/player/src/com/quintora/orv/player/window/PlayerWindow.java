@@ -5,23 +5,31 @@ import com.quintora.orv.player.Failure;
 import com.quintora.orv.player.Interruption;
 import com.quintora.orv.player.PlayOptions;
 import com.quintora.orv.player.Session;
+import java.awt.AWTError;
 import java.awt.EventQueue;
-import java.util.concurrent.CountDownLatch;
+import java.awt.HeadlessException;
+import java.awt.Toolkit;
+import java.util.concurrent.CompletableFuture;
+import java.util.concurrent.ExecutionException;
 
 /** Plays in a window until it is closed. */
 public final class PlayerWindow {
     private PlayerWindow() {}
 
-    /** Returns the exit status: 0, or 1 when the media could not be played. */
-    public static int play(PlayOptions options) throws InterruptedException {
-        CountDownLatch closed = new CountDownLatch(1);
-        Stage stage = new Stage(options.title());
+    /**
+     * Returns the exit status: 0, or 1 when the media could not be played.
+     *
+     * @throws Failure when there can be no window
+     */
+    public static int play(PlayOptions options) throws Failure, InterruptedException {
+        Stage stage = makeStage(options.title());
         try (Session session = new Session(options, stage::draw);
                 Interruption interruption = new Interruption(session, () -> {})) {
             Conductor conductor = new Conductor(session, stage, options);
-            EventQueue.invokeLater(() -> stage.open(conductor, closed::countDown));
+            CompletableFuture<Void> closed = new CompletableFuture<>();
+            EventQueue.invokeLater(() -> open(stage, conductor, closed));
             conductor.begin();
-            closed.await();
+            await(closed);
             conductor.end();
             if (options.reportsStats()) {
                 System.out.println(session.report());
@@ -29,5 +37,37 @@ public final class PlayerWindow {
             Failure failure = conductor.failure();
             return failure == null || interruption.happened() ? 0 : 1;
         }
+    }
+
+    private static Stage makeStage(String title) throws Failure {
+        try {
+            Toolkit.getDefaultToolkit().getScreenSize();
+            return new Stage(title);
+        } catch (AWTError | HeadlessException e) {
+            throw noWindow("on display " + System.getenv("DISPLAY"), e);
+        }
+    }
+
+    // Whatever goes wrong ends the wait for the window to be closed.
+    private static void open(Stage stage, Conductor conductor, CompletableFuture<Void> closed) {
+        try {
+            stage.open(conductor, () -> closed.complete(null));
+        } catch (RuntimeException | Error e) {
+            closed.completeExceptionally(e);
+        }
+    }
+
+    private static void await(CompletableFuture<Void> closed)
+            throws Failure, InterruptedException {
+        try {
+            closed.get();
+        } catch (ExecutionException e) {
+            throw noWindow("(" + e.getCause() + ")", e.getCause());
+        }
+    }
+
+    private static Failure noWindow(String where, Throwable cause) {
+        return new Failure(
+                "cannot open a window " + where + "; --no-window plays in the terminal", cause);
     }
 }

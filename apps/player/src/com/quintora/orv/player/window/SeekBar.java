@@ -17,15 +17,22 @@ final class SeekBar extends LevelBar {
     private int durationMs;
     private List<Mark> marks = List.of();
 
-    SeekBar(IntConsumer onSeek) {
-        this(new Target(onSeek));
+    SeekBar(IntConsumer onSeek, IntConsumer onStep) {
+        this(new Target(onSeek), onStep);
     }
 
-    private SeekBar(Target target) {
-        super("Position", 200, target::seek);
+    private SeekBar(Target target, IntConsumer onStep) {
+        super("Position", 200, target::seek, onStep);
         target.bar = this;
+        getAccessibleContext().setAccessibleDescription("Seconds from the start");
         setMaximumSize(new Dimension(Integer.MAX_VALUE, 20));
         ToolTipManager.sharedInstance().registerComponent(this);
+    }
+
+    /** In seconds. */
+    @Override
+    int maximum() {
+        return durationMs / 1000;
     }
 
     void showMarks(List<Mark> marks) {

@@ -6,6 +6,7 @@ import com.quintora.orv.player.Snapshot;
 import java.awt.BorderLayout;
 import java.awt.CardLayout;
 import java.awt.Color;
+import java.awt.Component;
 import java.awt.Dimension;
 import java.awt.GraphicsEnvironment;
 import java.awt.Rectangle;
@@ -15,8 +16,11 @@ import java.awt.event.MouseAdapter;
 import java.awt.event.MouseEvent;
 import java.awt.event.WindowAdapter;
 import java.awt.event.WindowEvent;
+import java.util.List;
+import java.util.Locale;
 import javax.swing.JFrame;
 import javax.swing.JPanel;
+import javax.swing.LayoutFocusTraversalPolicy;
 import javax.swing.SwingUtilities;
 import javax.swing.WindowConstants;
 
@@ -32,6 +36,7 @@ final class Stage {
     private final JPanel room = new JPanel(cards);
     private JFrame frame;
     private ControlBar bar;
+    private final Help help = new Help();
     private FullScreen fullScreen;
     private MessagePanel message;
     private Conductor conductor;
@@ -54,8 +59,10 @@ final class Stage {
         room.add(message, MESSAGE);
         frame.add(room, BorderLayout.CENTER);
         frame.add(bar, BorderLayout.SOUTH);
+        frame.setGlassPane(help);
         fullScreen = new FullScreen(frame, bar);
-        Keys.bind(frame.getRootPane(), conductor, bar);
+        help.list(Keys.bind(frame.getRootPane(), conductor, bar));
+        giveFocusToPicture();
         listen();
         room.setPreferredSize(new Dimension(854, 480));
         frame.setMinimumSize(new Dimension(480, 300));
@@ -118,10 +125,27 @@ final class Stage {
         bar.showFullScreen(fullScreen.isOn());
     }
 
-    void leaveFullScreen() {
-        if (fullScreen.isOn()) {
+    void toggleHelp() {
+        help.setVisible(!help.isVisible());
+    }
+
+    /** Closes the list of keys, or else leaves the full screen. */
+    void leave() {
+        if (help.isVisible()) {
+            help.setVisible(false);
+        } else if (fullScreen.isOn()) {
             toggleFullScreen();
         }
+    }
+
+    /** Says so where there is nothing to choose. */
+    void openMenu(Component above, String title, List<ChoiceMenu.Choice> choices) {
+        if (choices.isEmpty()) {
+            tell("No " + title.toLowerCase(Locale.ROOT));
+            return;
+        }
+        fullScreen.showControls();
+        ChoiceMenu.open(above, title, choices);
     }
 
     void close() {
@@ -158,6 +182,21 @@ final class Stage {
                 VideoPane.fit(
                         videoSize.width, videoSize.height, video.getWidth(), video.getHeight());
         conductor.requestFrameSize(place.width, place.height);
+    }
+
+    /** At first, and where the controls hide: the picture itself has no use for keys. */
+    private void giveFocusToPicture() {
+        room.setFocusable(true);
+        room.getAccessibleContext().setAccessibleName("Picture");
+        frame.setFocusTraversalPolicy(
+                new LayoutFocusTraversalPolicy() {
+                    @Override
+                    protected boolean accept(Component component) {
+                        return component == room
+                                ? room.isShowing() && room.isEnabled()
+                                : super.accept(component);
+                    }
+                });
     }
 
     private void listen() {

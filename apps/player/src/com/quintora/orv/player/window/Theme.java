@@ -1,7 +1,9 @@
 // SPDX-License-Identifier: Apache-2.0
 package com.quintora.orv.player.window;
 
+import java.awt.BasicStroke;
 import java.awt.Color;
+import java.awt.Component;
 import java.awt.Font;
 import java.awt.Graphics;
 import java.awt.Graphics2D;
@@ -38,6 +40,16 @@ final class Theme {
         UIManager.put("ToolTip.foreground", TEXT);
         UIManager.put("ToolTip.font", SMALL);
         UIManager.put("ToolTip.border", BorderFactory.createEmptyBorder(4, 8, 4, 8));
+    }
+
+    /** A ring just inside a component, while the keyboard is at it. */
+    static void paintFocus(Graphics2D g, Component component) {
+        if (component.isFocusOwner()) {
+            g.setColor(ACCENT);
+            g.setStroke(new BasicStroke(2));
+            g.drawRoundRect(
+                    1, 1, component.getWidth() - 2, component.getHeight() - 2, CORNER, CORNER);
+        }
     }
 
     static Graphics2D smooth(Graphics g) {

@@ -65,6 +65,7 @@ final class VideoPane extends JPanel {
 
     private void setNotice(String words) {
         notice = words;
+        getAccessibleContext().setAccessibleDescription(words);
         repaint();
     }
 

@@ -37,7 +37,13 @@ class ProgressLineTest {
     void aDurationThatIsUnknownLeavesTheBarToTheBuffer() {
         String line = ProgressLine.bar(new Snapshot(5_000, 0, false, -2.5, 0, 0, 0), 80);
         assertTrue(line.startsWith("⏸ 0:05  "), line);
-        assertTrue(line.contains("-2.50x"), line);
+        assertTrue(line.contains(" –:––  -2.50x"), line);
+    }
+
+    @Test
+    void logsSayThatADurationIsUnknown() {
+        String line = ProgressLine.plain(new Snapshot(5_000, 0, true, 1, 0, 0, 0));
+        assertTrue(line.startsWith("5.0 s of unknown length, 1x"), line);
     }
 
     @Test

@@ -1,0 +1,66 @@
+// SPDX-License-Identifier: Apache-2.0
+package com.quintora.orv.player;
+
+import static org.junit.jupiter.api.Assertions.assertEquals;
+import static org.junit.jupiter.api.Assertions.assertTrue;
+
+import com.quintora.mmp.Media;
+import com.quintora.mmp.Wait;
+import org.junit.jupiter.api.Test;
+import picocli.CommandLine;
+
+/** Media, and sections of them, that play again and again. */
+class RepeatTest {
+    // Marks are set in passing, and the clock is asked now and then.
+    private static final int LATE_MS = 500;
+
+    private int furthest;
+
+    @Test
+    void aSectionIsRepeated() throws Exception {
+        try (Session session = start("short.mp4", "--ab", "1:2")) {
+            assertTrue(session.player().getCurrentPosition() <= 1_000);
+            awaitRounds(session, 1_000 + LATE_MS, 1_800);
+            assertTrue(furthest < 2_000 + LATE_MS, "it went on to " + furthest);
+        }
+    }
+
+    @Test
+    void aSectionMayEndWithTheMedia() throws Exception {
+        try (Session session = start("silent.mp4", "--ab", "1:2")) {
+            awaitRounds(session, 1_000 + LATE_MS, 1_700);
+        }
+    }
+
+    @Test
+    void theWholeIsRepeated() throws Exception {
+        try (Session session = start("silent.mp4", "--loop")) {
+            awaitRounds(session, LATE_MS, 1_500);
+        }
+    }
+
+    private static Session start(String... arguments) throws Exception {
+        arguments[0] = Media.path(arguments[0]);
+        PlayOptions options = new PlayOptions();
+        new CommandLine(options).parseArgs(arguments);
+        Session session = new Session(options, image -> {});
+        session.open();
+        session.start();
+        return session;
+    }
+
+    /** Twice to the end of what is repeated, and back. */
+    private void awaitRounds(Session session, int begun, int nearlyDone) throws Exception {
+        for (int round = 0; round < 2; round++) {
+            Wait.until("it nearly ends", () -> positionOf(session) >= nearlyDone);
+            Wait.until("it begins again", () -> positionOf(session) <= begun);
+        }
+    }
+
+    private int positionOf(Session session) {
+        assertEquals(1, session.ended().getCount(), "it came to its end");
+        int position = session.player().getCurrentPosition();
+        furthest = Math.max(furthest, position);
+        return position;
+    }
+}

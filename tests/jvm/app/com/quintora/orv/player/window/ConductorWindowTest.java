@@ -1,0 +1,99 @@
+// SPDX-License-Identifier: Apache-2.0
+package com.quintora.orv.player.window;
+
+import static org.junit.jupiter.api.Assertions.assertEquals;
+import static org.junit.jupiter.api.Assertions.assertNotNull;
+import static org.junit.jupiter.api.Assertions.assertNull;
+
+import com.quintora.mmp.Media;
+import com.quintora.orv.player.PlayOptions;
+import com.quintora.orv.player.Session;
+import java.awt.Frame;
+import javax.swing.JLabel;
+import javax.swing.SwingUtilities;
+import org.junit.jupiter.api.AfterEach;
+import org.junit.jupiter.api.BeforeEach;
+import org.junit.jupiter.api.Test;
+import org.junit.jupiter.params.ParameterizedTest;
+import org.junit.jupiter.params.provider.CsvSource;
+import picocli.CommandLine;
+
+/** What becomes of the player's refusals, and where skips lead. */
+class ConductorWindowTest {
+    private final Stage stage = new Stage("test");
+    private Session session;
+    private Conductor conductor;
+
+    @BeforeEach
+    void open() throws Exception {
+        PlayOptions options = new PlayOptions();
+        new CommandLine(options).parseArgs(Media.path("short.mp4"));
+        session = new Session(options, stage::draw);
+        conductor = new Conductor(session, stage, options);
+        SwingUtilities.invokeAndWait(() -> stage.open(conductor, () -> {}));
+    }
+
+    @AfterEach
+    void close() throws Exception {
+        conductor.end();
+        session.close();
+        SwingUtilities.invokeAndWait(stage::close);
+    }
+
+    @Test
+    void whatTheEngineRefusesIsAFailure() throws Exception {
+        conductor.failOn(() -> {
+            throw new IllegalStateException("the engine refused start()");
+        });
+        assertEquals("the engine refused start()", conductor.failure().getMessage());
+        assertNotNull(label("This cannot be played"));
+    }
+
+    @Test
+    void noExceptionIsLost() {
+        conductor.failOn(() -> {
+            throw new UnsupportedOperationException("later");
+        });
+        assertEquals(
+                "the player failed: java.lang.UnsupportedOperationException: later",
+                conductor.failure().getMessage());
+    }
+
+    @Test
+    void theFirstFailureIsTheOneThatIsTold() {
+        for (String words : new String[] {"first", "second"}) {
+            conductor.failOn(() -> {
+                throw new IllegalStateException(words);
+            });
+        }
+        assertEquals("first", conductor.failure().getMessage());
+    }
+
+    @Test
+    void whatFailsAsTheWindowClosesIsNoFailure() {
+        session.close();
+        conductor.failOn(() -> session.player().start());
+        assertNull(conductor.failure());
+    }
+
+    @ParameterizedTest
+    @CsvSource({
+        "5000, 10000, 60000, 15000", "55000, 10000, 60000, 60000", "5000, -10000, 60000, 0",
+        "5000, 10000, 0, 15000", "5000, -10000, 0, 0", "2147483000, 10000, 0, 2147483647"
+    })
+    void aSkipEndsWithinTheMedia(int from, int by, int duration, int goal) {
+        assertEquals(goal, Conductor.goalOf(from, by, duration));
+    }
+
+    private static JLabel label(String name) throws Exception {
+        return WindowFixture.onWindow(() -> {
+            for (Frame frame : Frame.getFrames()) {
+                JLabel label = WindowFixture.find(frame, JLabel.class, name);
+                if (label != null && label.isShowing()) {
+                    return label;
+                }
+            }
+            return null;
+        });
+    }
+}
