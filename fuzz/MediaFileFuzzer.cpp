@@ -46,8 +46,7 @@ void draw(std::unique_ptr<orvtarn::MediaFile> file) {
     std::unique_ptr<orvtarn::Thumbnailer> thumbnailer;
     if (orvtarn::Thumbnailer::create(std::move(file), -1, thumbnailer) != 0) return;
     uint8_t pixels[64 * 9];
-    thumbnailer->draw(1000, orvtarn::FramePick::Exact,
-                      {pixels, sizeof(pixels), ORV_COLOR_MODE_RGB565, 16, 9});
+    thumbnailer->draw(1000, {pixels, sizeof(pixels), ORV_COLOR_MODE_RGB565, 16, 9});
 }
 
 }  // namespace

@@ -65,7 +65,7 @@ bool TarnPlayer::Engine::drawThumbnail(const _Media_Thumbnail_Info_T* thumbnail)
     int position = 0;
     if (state.requireOpen(kName) != NO_ERROR) return false;
     transport.getCurrentPosition(&position);
-    const status_t status = loader.details()->draw(position, orvtarn::FramePick::Exact, *thumbnail);
+    const status_t status = loader.details()->draw(position, tracks.shownVideoStream(), *thumbnail);
     return status == NO_ERROR || orvtarn::failed(status, kName, "no picture") == NO_ERROR;
 }
 

@@ -145,7 +145,7 @@ void EventLoop::onEndFile(const mpv_event_end_file& end) {
 void EventLoop::onRestart() {
     onVideoSize();
     const bool hasVideo = mMpv.getInt("vid").value_or(0) > 0;
-    const double duration = mMpv.getDouble("duration").value_or(sourceDuration());
+    const double duration = durationOf(mMpv.getDouble("duration").value_or(0));
     const bool seekable = mMpv.getFlag("seekable").value_or(false);
     mState.update([&](PlayerState::Values& v) {
         v.restarts++;
@@ -185,9 +185,10 @@ void EventLoop::onProperty(const mpv_event_property& property) {
         switch (observed.id) {
             case kTime:
                 return onTime(numberOf(property));
-            case kDuration:
-                return mState.update(
-                    [&](PlayerState::Values& v) { v.duration = numberOf(property); });
+            case kDuration: {
+                const double duration = durationOf(numberOf(property));
+                return mState.update([&](PlayerState::Values& v) { v.duration = duration; });
+            }
             case kEndReached:
                 return flagOf(property) ? onEndReached() : void();
             case kSeekable:
@@ -268,10 +269,12 @@ std::shared_ptr<MediaSource> EventLoop::source() {
     return mSource;
 }
 
-// Seconds, by the source's own word.
-double EventLoop::sourceDuration() {
+// Of media without a length the core only tells how far they have been read.
+double EventLoop::durationOf(double core) {
     const std::shared_ptr<MediaSource> media = source();
-    return media != nullptr ? static_cast<double>(media->knownDuration()) / 1000 : 0;
+    const int64_t known = media != nullptr ? media->knownDuration() : 0;
+    const bool isGuess = core <= 0 || mMpv.getInt("file-size").value_or(0) <= 0;
+    return isGuess && known > 0 ? static_cast<double>(known) / 1000 : core;
 }
 
 bool EventLoop::sourceFailed() {

@@ -57,7 +57,7 @@ private:
     void becomePreparedIfReady();
     void failWith(android::status_t status);
     std::shared_ptr<MediaSource> source();
-    double sourceDuration();
+    double durationOf(double core);
     bool brokeOff();
     bool sourceFailed();
 

@@ -102,16 +102,14 @@ int64_t FrameFinder::frameTimeUs(const AVFrame& frame) const {
            startTimeUs();
 }
 
-const AVFrame* FrameFinder::find(int64_t positionMs, FramePick pick) {
+const AVFrame* FrameFinder::find(int64_t positionMs) {
     if (isEmbeddedPicture(*mStream)) {
         return mFound->width > 0 || decodePicture() ? mFound : nullptr;
     }
     int64_t position = std::clamp<int64_t>(positionMs, 0, INT32_MAX) * 1000;
     const int64_t duration = mFile.context()->duration;
     if (duration > 0) position = std::min(position, duration);
-    // Streams whose key frames are not marked have none to pick from.
-    const bool isFound = pick == FramePick::KeyFrame && search(position, AVDISCARD_NONKEY);
-    if (!isFound && !mFile.isInterrupted()) search(position, AVDISCARD_DEFAULT);
+    search(position);
     // Where nothing came out, the frame before is the nearest: a still picture
     // is at its end after the first time.
     return mFound->width > 0 ? mFound : nullptr;
@@ -119,17 +117,14 @@ const AVFrame* FrameFinder::find(int64_t positionMs, FramePick pick) {
 
 // Some formats seek to places from where decoding begins only later, so this
 // goes further back until a frame at or before the time comes out.
-bool FrameFinder::search(int64_t positionUs, AVDiscard skip) {
-    mCodec->skip_frame = skip;
+void FrameFinder::search(int64_t positionUs) {
     for (int64_t back : kSeekBackUs) {
         const int64_t from = std::max<int64_t>(positionUs - back, 0);
         // Reading goes on from where it stands in media that cannot be sought.
         seek(from);
         const bool isLast = from == 0 || back == *std::rbegin(kSeekBackUs);
-        if (decodeUpTo(positionUs, isLast)) return true;
-        if (isLast || mFile.isInterrupted()) return false;
+        if (decodeUpTo(positionUs, isLast) || isLast || mFile.isInterrupted()) return;
     }
-    return false;
 }
 
 void FrameFinder::seek(int64_t positionUs) {
@@ -155,7 +150,7 @@ bool FrameFinder::decodeUpTo(int64_t positionUs, bool takeLater) {
         if (hasEarlier && late > kNextFrameUs) return true;
         av_frame_unref(mFound);
         av_frame_move_ref(mFound, mRead);
-        if (isReached || mCodec->skip_frame == AVDISCARD_NONKEY) return true;
+        if (isReached) return true;
         hasEarlier = true;
     }
     return hasEarlier && !mFile.isInterrupted();

@@ -12,16 +12,6 @@ extern "C" {
 
 namespace orvtarn {
 
-enum class FramePick {
-    // The first frame that starts at the time or up to 100 ms after it; where
-    // frames are further apart than that, the one on screen at the time. A
-    // frame that starts less than 1 ms before counts as at the time, since
-    // times are whole milliseconds.
-    Exact,
-    // The last key frame at or before the time: several times faster.
-    KeyFrame,
-};
-
 // Seeks and decodes one video stream of a file. One thread at a time.
 class FrameFinder {
 public:
@@ -35,10 +25,13 @@ public:
     // only without another. 0 or ORV_ERROR_UNSUPPORTED.
     android::status_t open(int streamIndex);
 
-    // The frame at a time from the media's start, or the nearest one where the
-    // media cannot be sought; null when nothing can be decoded. It belongs to
-    // the finder and stays as it is until the next call.
-    const AVFrame* find(int64_t positionMs, FramePick pick);
+    // The frame at a time from the media's start: the first one that starts at
+    // the time or up to 100 ms after it; where frames are further apart than that,
+    // the one on screen at the time. A frame that starts less than 1 ms before
+    // counts as at the time, since times are whole milliseconds. The nearest one
+    // where the media cannot be sought; null when nothing can be decoded. It
+    // belongs to the finder and stays as it is until the next call.
+    const AVFrame* find(int64_t positionMs);
 
     // Degrees to turn frames clockwise for upright pictures: 0, 90, 180, 270.
     int rotation() const;
@@ -46,7 +39,7 @@ public:
 private:
     bool chooseStream(int streamIndex);
     bool openDecoder();
-    bool search(int64_t positionUs, AVDiscard skip);
+    void search(int64_t positionUs);
     void seek(int64_t positionUs);
     bool decodeUpTo(int64_t positionUs, bool takeLater);
     bool decodePicture();

@@ -93,7 +93,7 @@ android::status_t Loader::setSource(const char* operation,
         std::lock_guard<std::mutex> lock(mSourceMutex);
         mSource = source;
         mDetails = std::make_shared<MediaDetails>(source);
-        mDetails->setRaw(mRawFormat.has_value());
+        describeSource();
     }
     mProtocol.setSource(source);
     mEvents.setSource(source);
@@ -111,21 +111,29 @@ std::shared_ptr<MediaDetails> Loader::details() const {
     return mDetails != nullptr ? mDetails : std::make_shared<MediaDetails>(nullptr);
 }
 
-android::status_t Loader::setRawFormat(const IORV_PB_CTRL_SET_MEDIA_INFO_T& info) {
+android::status_t Loader::setRawFormat(const char* operation,
+                                       const IORV_PB_CTRL_SET_MEDIA_INFO_T& info) {
     PcmFormat format;
     std::string reason;
     if (!pcmFormat(info, format, reason)) {
-        return failed(android::BAD_VALUE, "setPCMMediaInfo", reason.c_str());
+        return failed(android::BAD_VALUE, operation, reason.c_str());
     }
     std::lock_guard<std::mutex> load(mLoadMutex);
     const Phase phase = mState.phase();
     if (phase != Phase::Idle && phase != Phase::Initialized && phase != Phase::Stopped) {
-        return PlayerState::wrongPhase("setPCMMediaInfo", phase);
+        return PlayerState::wrongPhase(operation, phase);
     }
     std::lock_guard<std::mutex> lock(mSourceMutex);
     mRawFormat = format;
-    if (mDetails != nullptr) mDetails->setRaw(true);
+    describeSource();
     return android::NO_ERROR;
+}
+
+// What is known of raw samples beforehand.
+void Loader::describeSource() {
+    if (!mRawFormat || mSource == nullptr) return;
+    mSource->setToldDuration(mRawFormat->durationMs);
+    mDetails->setRaw();
 }
 
 android::status_t Loader::setRaw() {
@@ -133,7 +141,7 @@ android::status_t Loader::setRaw() {
         std::lock_guard<std::mutex> lock(mSourceMutex);
         if (mRawFormat) return android::NO_ERROR;
     }
-    return setRawFormat(kUsualSamples);
+    return setRawFormat("setPcmFlag", kUsualSamples);
 }
 
 int Loader::rawBytesPerSecond() const {
@@ -173,6 +181,7 @@ android::status_t Loader::load() {
     const std::shared_ptr<MediaSource> media = source();
     media->setReadFailed(false);
     setHeaders();
+    details()->tryAgain();
     if (mBeforeLoad) mBeforeLoad();
     std::string options;
     {

@@ -49,7 +49,8 @@ public:
     // The media are raw samples, until the source is given up. BAD_VALUE for a
     // description that does not fit together, INVALID_OPERATION while media are
     // open.
-    android::status_t setRawFormat(const IORV_PB_CTRL_SET_MEDIA_INFO_T& info);
+    android::status_t setRawFormat(const char* operation,
+                                   const IORV_PB_CTRL_SET_MEDIA_INFO_T& info);
     // The same without a description: two channels of 16 bits at 44100 Hz.
     android::status_t setRaw();
     // 0 for media that are not raw.
@@ -62,6 +63,7 @@ public:
 
 private:
     android::status_t setSource(const char* operation, const std::shared_ptr<MediaSource>& source);
+    void describeSource();
     android::status_t beginPrepare(const char* operation, uint64_t& session);
     android::status_t load();
     void setHeaders();

@@ -18,12 +18,12 @@ bool MediaDetails::withFile(const std::function<void(MediaFile&)>& task) {
     return true;
 }
 
-android::status_t MediaDetails::draw(int64_t positionMs, FramePick pick,
+android::status_t MediaDetails::draw(int64_t positionMs, int streamIndex,
                                      const _Media_Thumbnail_Info_T& thumbnail) {
     std::lock_guard<std::mutex> use(mUseMutex);
-    const std::shared_ptr<Thumbnailer> drawer = thumbnailer();
+    const std::shared_ptr<Thumbnailer> drawer = thumbnailer(streamIndex);
     if (drawer == nullptr) return ORV_ERROR_UNSUPPORTED;
-    return drawer->draw(positionMs, pick, thumbnail);
+    return drawer->draw(positionMs, thumbnail);
 }
 
 void MediaDetails::close() {
@@ -33,20 +33,34 @@ void MediaDetails::close() {
     mThumbnailer.reset();
 }
 
+void MediaDetails::tryAgain() {
+    mUnreadable = false;
+    mUndrawable = kNoStream;
+}
+
 std::unique_ptr<MediaFile> MediaDetails::open() {
-    if (mClosed || mRaw || mSource == nullptr) return nullptr;
+    std::unique_ptr<MediaFile> opened;
+    if (mClosed || mRaw || mUnreadable || mSource == nullptr) return nullptr;
+    const android::status_t status = openAgain(opened);
+    if (status != android::NO_ERROR && !mClosed) {
+        failed(status, "details", "the media cannot be read twice");
+    }
+    mUnreadable = opened == nullptr;
+    return opened;
+}
+
+// 0 without a file for sources that can only be read once.
+android::status_t MediaDetails::openAgain(std::unique_ptr<MediaFile>& opened) {
     MediaOpenOptions options;
     options.headers = mSource->headers();
     options.cancel = &mClosed;
-    std::unique_ptr<MediaFile> opened;
-    android::status_t status = android::INVALID_OPERATION;
     if (!mSource->isOfBytes()) {
-        status = MediaFile::open(mSource->name(), options, opened);
-    } else if (std::unique_ptr<ByteSource> reader = mSource->openReader()) {
-        status = MediaFile::open(std::move(reader), options, opened);
+        return mSource->canOpenTwice() ? MediaFile::open(mSource->name(), options, opened)
+                                       : android::NO_ERROR;
     }
-    if (status != android::NO_ERROR) failed(status, "details", "the media cannot be read twice");
-    return opened;
+    std::unique_ptr<ByteSource> reader = mSource->openReader();
+    return reader != nullptr ? MediaFile::open(std::move(reader), options, opened)
+                             : android::NO_ERROR;
 }
 
 std::shared_ptr<MediaFile> MediaDetails::file() {
@@ -58,17 +72,21 @@ std::shared_ptr<MediaFile> MediaDetails::file() {
     return keep(mFile, opened) ? opened : nullptr;
 }
 
-std::shared_ptr<Thumbnailer> MediaDetails::thumbnailer() {
+std::shared_ptr<Thumbnailer> MediaDetails::thumbnailer(int streamIndex) {
     {
         std::lock_guard<std::mutex> keep(mKeepMutex);
-        if (mThumbnailer != nullptr) return mThumbnailer;
+        if (mThumbnailer != nullptr && mThumbnailerStream == streamIndex) return mThumbnailer;
     }
+    if (mUndrawable == streamIndex) return nullptr;
     std::unique_ptr<MediaFile> opened = open();
     if (opened == nullptr) return nullptr;
     std::unique_ptr<Thumbnailer> created;
-    Thumbnailer::create(std::move(opened), -1, created);
+    Thumbnailer::create(std::move(opened), streamIndex, created);
+    if (created == nullptr) mUndrawable = streamIndex;
     const std::shared_ptr<Thumbnailer> shared = std::move(created);
-    return keep(mThumbnailer, shared) ? shared : nullptr;
+    if (!keep(mThumbnailer, shared)) return nullptr;
+    mThumbnailerStream = streamIndex;
+    return shared;
 }
 
 template <class Unit>

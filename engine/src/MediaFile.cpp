@@ -1,13 +1,12 @@
 // SPDX-License-Identifier: Apache-2.0
 #include "MediaFile.h"
 
-#include <ctype.h>
 #include <errno.h>
 #include <orvtarn/PlayerTypes.h>
-#include <string.h>
 
-#include <algorithm>
 #include <new>
+
+#include "FileName.h"
 
 extern "C" {
 #include <libavformat/avformat.h>
@@ -73,35 +72,10 @@ std::string headerLines(const MediaOpenOptions& options) {
     return lines;
 }
 
-int hexDigit(char character) {
-    if (character >= '0' && character <= '9') return character - '0';
-    if (character >= 'a' && character <= 'f') return character - 'a' + 10;
-    if (character >= 'A' && character <= 'F') return character - 'A' + 10;
-    return -1;
-}
-
-std::string percentDecoded(const std::string& text) {
-    std::string decoded;
-    for (size_t i = 0; i < text.size(); i++) {
-        const int high = text[i] == '%' && i + 2 < text.size() ? hexDigit(text[i + 1]) : -1;
-        const int low = high < 0 ? -1 : hexDigit(text[i + 2]);
-        decoded += low < 0 ? text[i] : static_cast<char>(high << 4 | low);
-        if (low >= 0) i += 2;
-    }
-    return decoded;
-}
-
-bool hasScheme(const std::string& url) {
-    const size_t end = url.find("://");
-    const auto isSchemeCharacter = [](unsigned char c) { return isalnum(c) || strchr("+-.", c); };
-    return end != std::string::npos && end > 0 &&
-           std::all_of(url.begin(), url.begin() + static_cast<ptrdiff_t>(end), isSchemeCharacter);
-}
-
 // libavformat takes a path with a colon for a URL, and "file:" URLs undecoded.
-std::string libavUrl(const std::string& url) {
-    if (url.compare(0, 7, "file://") == 0) return "file:" + percentDecoded(url.substr(7));
-    return hasScheme(url) ? url : "file:" + url;
+std::string libavUrl(const std::string& name) {
+    std::string path;
+    return filePath(name, path) ? "file:" + path : name;
 }
 
 }  // namespace

@@ -4,11 +4,11 @@
 #include <errno.h>
 #include <limits.h>
 #include <stdlib.h>
-#include <string.h>
-#include <strings.h>
 #include <sys/stat.h>
 #include <unistd.h>
 #include <utils/Errors.h>
+
+#include "FileName.h"
 
 namespace orvtarn {
 namespace {
@@ -24,12 +24,6 @@ private:
     ReaderCount& mReaders;
 };
 
-// The path of a file name or "file:" URL; null for URLs of other kinds.
-const char* pathOf(const char* url) {
-    if (strncasecmp(url, "file://", 7) == 0) return url + 7;
-    return *url == '/' || strstr(url, "://") == nullptr ? url : nullptr;
-}
-
 int statusOfErrno(int error) {
     if (error == EACCES) return android::PERMISSION_DENIED;
     if (error == ENOENT || error == ENOTDIR || error == ENAMETOOLONG || error == ELOOP) {
@@ -39,6 +33,11 @@ int statusOfErrno(int error) {
 }
 
 }  // namespace
+
+int64_t MediaSource::knownDuration() {
+    const int64_t own = ownDuration();
+    return own > 0 ? own : mToldDuration.load();
+}
 
 bool ReaderCount::enter() {
     std::lock_guard<std::mutex> lock(mMutex);
@@ -79,16 +78,23 @@ void FdMediaSource::close() {
     mReaders.awaitNone();
 }
 
+bool UrlMediaSource::canOpenTwice() const {
+    struct stat status;
+    if (!isLocal()) return true;
+    return stat(mName.c_str(), &status) == 0 &&
+           (S_ISREG(status.st_mode) || S_ISBLK(status.st_mode));
+}
+
 int resolveName(const char* url, std::string& name) {
     if (url == nullptr || *url == '\0') return android::BAD_VALUE;
-    const char* path = pathOf(url);
-    if (path == nullptr) {
+    std::string path;
+    if (!filePath(url, path)) {
         name = url;
         return android::NO_ERROR;
     }
     char resolved[PATH_MAX];
     struct stat status;
-    if (realpath(path, resolved) == nullptr || stat(resolved, &status) != 0) {
+    if (realpath(path.c_str(), resolved) == nullptr || stat(resolved, &status) != 0) {
         return statusOfErrno(errno);
     }
     if (S_ISDIR(status.st_mode)) return android::BAD_VALUE;

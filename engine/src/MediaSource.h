@@ -29,8 +29,11 @@ public:
     virtual RequestHeaders headers() const { return {}; }
     // Whether openReader gives readers.
     virtual bool isOfBytes() const { return false; }
-    // A file: reading it once more costs nobody anything.
+    // A file of this machine.
     virtual bool isLocal() const { return false; }
+    // Whether the name may be opened once more beside playback. What a second
+    // reader of a pipe gets, playback lacks.
+    virtual bool canOpenTwice() const { return true; }
     // A reader with a position of its own; null when the source is closed,
     // cannot be read twice, or is not of bytes.
     virtual std::unique_ptr<ByteSource> openReader() { return nullptr; }
@@ -41,15 +44,21 @@ public:
     // owner may delete what it lent to it afterwards.
     virtual void close() {}
 
-    // Milliseconds by the source's own word, 0 when it has none.
-    virtual int64_t knownDuration() { return 0; }
+    // Milliseconds, 0 when unknown: by the source's own word, or else by that of
+    // whoever described the media.
+    int64_t knownDuration();
+    void setToldDuration(int64_t milliseconds) { mToldDuration = milliseconds; }
 
     // Whether the last read failed, as opposed to having come to the end.
     bool readFailed() const { return mReadFailed; }
     void setReadFailed(bool value) { mReadFailed = value; }
 
+protected:
+    virtual int64_t ownDuration() { return 0; }
+
 private:
     std::atomic<bool> mReadFailed{false};
+    std::atomic<int64_t> mToldDuration{0};
 };
 
 // The name that sources of bytes have towards the playback core.
@@ -82,6 +91,7 @@ public:
     std::string name() const override { return mName; }
     RequestHeaders headers() const override { return mHeaders; }
     bool isLocal() const override { return mName[0] == '/'; }
+    bool canOpenTwice() const override;
 
 private:
     const std::string mName;

@@ -71,6 +71,13 @@ void setLinear(const ORV_AUD_PCM_INFO_T& pcm, PcmFormat& format) {
                       {"demuxer-rawaudio-channels", std::to_string(pcm.eNumCh)}};
 }
 
+// Milliseconds, 0 when unknown.
+int64_t durationOf(const IORV_PB_CTRL_SET_MEDIA_INFO_T& info, int bytesPerSecond) {
+    if (info.u4TotalDuration > 0 || info.u8Size <= 0) return info.u4TotalDuration;
+    return info.u8Size / bytesPerSecond * 1000 +
+           info.u8Size % bytesPerSecond * 1000 / bytesPerSecond;
+}
+
 }  // namespace
 
 bool pcmFormat(const IORV_PB_CTRL_SET_MEDIA_INFO_T& info, PcmFormat& format, std::string& reason) {
@@ -79,11 +86,12 @@ bool pcmFormat(const IORV_PB_CTRL_SET_MEDIA_INFO_T& info, PcmFormat& format, std
     if (!isWithin(info.eMediaType, E_ORV_MEDIA_TYPE_AUDIO_ES, E_ORV_MEDIA_TYPE_AUDIO_ES,
                   "mediaType", reason) ||
         !isWithin(audio.eAudEnc, E_ORV_AUD_ENC_PCM, E_ORV_AUD_ENC_PCM, "audioCodec", reason) ||
-        !checkPcm(pcm, reason)) {
+        !isWithin(info.fgSynchronized, 0, 1, "synchronized", reason) || !checkPcm(pcm, reason)) {
         return false;
     }
     format = PcmFormat();
     format.bytesPerSecond = pcm.eSampleRate * pcm.u2BlockAlign;
+    format.durationMs = durationOf(info, format.bytesPerSecond);
     const bool isCompanded =
         pcm.e_pcm_type == E_ORV_PCM_TYPE_ALAW || pcm.e_pcm_type == E_ORV_PCM_TYPE_ULAW;
     if (isCompanded) {

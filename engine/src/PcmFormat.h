@@ -2,6 +2,7 @@
 #pragma once
 
 #include <orvtarn/PcmRecords.h>
+#include <stdint.h>
 
 #include <string>
 #include <utility>
@@ -14,6 +15,7 @@ struct PcmFormat {
     // Options of "loadfile", names and values as they are (not quoted).
     std::vector<std::pair<std::string, std::string>> options;
     int bytesPerSecond = 0;
+    int64_t durationMs = 0;  // 0 when the description does not tell
 };
 
 // Checks the whole description against orvtarn/PcmRecords.h. True with the

@@ -168,7 +168,7 @@ void StreamMediaSource::close() {
     mStream->closeStream();
 }
 
-int64_t StreamMediaSource::knownDuration() {
+int64_t StreamMediaSource::ownDuration() {
     const uint32_t duration = mClosed ? 0 : mStream->getDuration();
     return duration == kUnknownLength ? 0 : duration;
 }

@@ -27,11 +27,11 @@ public:
     std::unique_ptr<ByteSource> openReader() override;
     void cancelReads() override;
     void close() override;
-    int64_t knownDuration() override;
 
 private:
     class Reader;
 
+    int64_t ownDuration() override;
     int64_t measure();
     int readAt(int64_t position, uint8_t* buffer, int length);
     int readOnce(uint8_t* buffer, int length);

@@ -304,7 +304,7 @@ status_t TarnPlayer::setPlayerRole(E_Orv_Player_Role_Type role) {
 status_t TarnPlayer::setPCMMediaInfo(IORV_PB_CTRL_SET_MEDIA_INFO_T* info) {
     return mEngine->call(__func__, status_t{INVALID_OPERATION}, [&] {
         if (info == nullptr) return orvtarn::failed(BAD_VALUE, "setPCMMediaInfo", "null argument");
-        return mEngine->loader.setRawFormat(*info);
+        return mEngine->loader.setRawFormat("setPCMMediaInfo", *info);
     });
 }
 

@@ -25,12 +25,11 @@ status_t Thumbnailer::create(std::unique_ptr<MediaFile> file, int streamIndex,
     return status;
 }
 
-status_t Thumbnailer::draw(int64_t positionMs, FramePick pick,
-                           const _Media_Thumbnail_Info_T& thumbnail) {
+status_t Thumbnailer::draw(int64_t positionMs, const _Media_Thumbnail_Info_T& thumbnail) {
     const status_t status = checkThumbnail(thumbnail);
     if (status != OK) return status;
     mFile->restartTimeLimit();
-    const AVFrame* frame = mFinder.find(positionMs, pick);
+    const AVFrame* frame = mFinder.find(positionMs);
     if (mFile->isInterrupted()) return ORV_ERROR_IO;
     if (frame == nullptr) return ORV_ERROR_MALFORMED;
     return drawPicture(*frame, mFinder.rotation(), thumbnail);

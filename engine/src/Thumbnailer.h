@@ -22,13 +22,12 @@ public:
     static android::status_t create(std::unique_ptr<MediaFile> file, int streamIndex,
                                     std::unique_ptr<Thumbnailer>& thumbnailer);
 
-    // Draws the frame at a time from the media's start; before the first frame
-    // that one, past the last frame that one. Blocks while it reads and
-    // decodes. 0, BAD_VALUE as checkThumbnail says it, ORV_ERROR_IO when
-    // interrupted, or ORV_ERROR_MALFORMED when no frame can be decoded; the
-    // buffer is only written to when the result is 0.
-    android::status_t draw(int64_t positionMs, FramePick pick,
-                           const _Media_Thumbnail_Info_T& thumbnail);
+    // Draws the frame at a time from the media's start, which is the one that
+    // FrameFinder finds; before the first frame that one, past the last that one. Blocks while it
+    // reads and decodes. 0, BAD_VALUE as checkThumbnail says it, ORV_ERROR_IO when interrupted, or
+    // ORV_ERROR_MALFORMED when no frame can be decoded; the buffer is only written to when the
+    // result is 0.
+    android::status_t draw(int64_t positionMs, const _Media_Thumbnail_Info_T& thumbnail);
 
 private:
     explicit Thumbnailer(std::unique_ptr<MediaFile> file);

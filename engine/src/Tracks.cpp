@@ -68,6 +68,13 @@ bool Tracks::currentVideoInfo(VideoCodecInfo& info) {
     return videoInfo(std::max(selectedIn(all.video), 0), info);
 }
 
+int Tracks::shownVideoStream() {
+    TrackTables all;
+    if (!tables("getThumbnailInfo", all)) return -1;
+    const int shown = selectedIn(all.video);
+    return shown < 0 ? -1 : all.video[shown].streamIndex;
+}
+
 bool Tracks::audioInfo(bool withTexts, int index, AudioTrackInfo& info) {
     TrackTables all;
     if (!tables("getAudioTrackInfo", all)) return false;

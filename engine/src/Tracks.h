@@ -27,6 +27,8 @@ public:
     bool subtitleCount(int& count);
     bool videoInfo(int index, VideoCodecInfo& info);
     bool currentVideoInfo(VideoCodecInfo& info);
+    // The place of the video track that is shown in the MediaFile; -1 for none.
+    int shownVideoStream();
     bool audioInfo(bool withTexts, int index, AudioTrackInfo& info);
     // Chapters, too; see ORV_CHAPTER_INDEX_BASE.
     bool subtitleInfo(int index, SubtitleTrackInfo& info);

@@ -1,6 +1,6 @@
 // SPDX-License-Identifier: Apache-2.0
 // What the player tells beyond playback: pictures, metadata, raw samples,
-// parameters and sound.
+// counters and sound.
 #include <binder/Parcel.h>
 #include <math.h>
 #include <media/Metadata.h>
@@ -11,6 +11,7 @@
 #include <map>
 
 #include "FakeStream.h"
+#include "LogCapture.h"
 #include "PlayerTest.h"
 
 using namespace android;
@@ -30,12 +31,6 @@ protected:
         return picture;
     }
 
-    static int32_t getInt32(TarnPlayer& player, int key) {
-        Parcel reply;
-        EXPECT_EQ(NO_ERROR, player.getParameter(key, &reply));
-        reply.setDataPosition(0);
-        return reply.readInt32();
-    }
     static int64_t getInt64(TarnPlayer& player, int key) {
         Parcel reply;
         int64_t value = -1;
@@ -43,12 +38,6 @@ protected:
         reply.setDataPosition(0);
         EXPECT_EQ(NO_ERROR, reply.readInt64(&value));
         return value;
-    }
-    status_t setInt32(int key, int32_t value) {
-        Parcel request;
-        request.writeInt32(value);
-        request.setDataPosition(0);
-        return player->setParameter(key, request);
     }
 };
 
@@ -76,6 +65,15 @@ TEST_F(DetailsTest, ThumbnailsAreChecked) {
     EXPECT_FALSE(player->getThumbnailInfo(&request));
     request = {buffer, 64, 19, 4, 1};
     EXPECT_FALSE(player->getThumbnailInfo(&request));
+}
+
+TEST_F(DetailsTest, TheThumbnailIsOfTheSelectedTrack) {
+    open("pictures.mkv");
+    EXPECT_LT(thumbnail(160, 90).brightness(), 20);
+    ASSERT_TRUE(player->selectTrack(1));
+    EXPECT_GT(thumbnail(160, 90).brightness(), 230);
+    ASSERT_TRUE(player->selectTrack(0));
+    EXPECT_LT(thumbnail(160, 90).brightness(), 20);
 }
 
 TEST_F(DetailsTest, TheCoverIsTheMediasOwnBytes) {
@@ -186,6 +184,27 @@ TEST_F(DetailsTest, TheFlagAloneMeansUsualSamples) {
     EXPECT_NEAR(2000, duration(), 20);
 }
 
+TEST_F(DetailsTest, TheDescriptionTellsALengthThatTheSourceDoesNot) {
+    for (const bool hasLength : {true, false}) {
+        FakeStream stream(mediaPath("tone-s16le.pcm"));
+        stream.mSeekable = stream.mHasLength = hasLength;
+        IORV_PB_CTRL_SET_MEDIA_INFO_T info = stereo16(false);
+        info.u4TotalDuration = 5000;
+        ASSERT_EQ(NO_ERROR, player->setPCMMediaInfo(&info));
+        ASSERT_EQ(NO_ERROR, player->setDataSource(&stream));
+        ASSERT_EQ(NO_ERROR, player->prepare());
+        EXPECT_NEAR(hasLength ? 2000 : 5000, duration(), 20);
+        player->reset();
+    }
+}
+
+TEST_F(DetailsTest, AFlagThatComesTooLateIsLogged) {
+    open("short.mp4");
+    LogCapture log;
+    player->setPcmFlag();
+    EXPECT_TRUE(log.waitFor(error("setPcmFlag: not possible while prepared")));
+}
+
 TEST_F(DetailsTest, DescriptionsAreChecked) {
     IORV_PB_CTRL_SET_MEDIA_INFO_T info = stereo16(false);
     info.uFormatInfo.tAudioEsInfo.tAudInfo.uAudCodecInfo.t_pcm_info.u2BlockAlign = 3;
@@ -194,25 +213,6 @@ TEST_F(DetailsTest, DescriptionsAreChecked) {
     info = stereo16(false);
     open("short.mp4");
     EXPECT_EQ(INVALID_OPERATION, player->setPCMMediaInfo(&info)) << "media are open";
-}
-
-TEST_F(DetailsTest, ParametersAreKeptAndChecked) {
-    EXPECT_EQ(NO_ERROR, setInt32(ORV_PARAMETER_NETWORK_TIMEOUT, 5000));
-    EXPECT_EQ(5000, getInt32(*player, ORV_PARAMETER_NETWORK_TIMEOUT));
-    EXPECT_EQ(BAD_VALUE, setInt32(ORV_PARAMETER_NETWORK_TIMEOUT, 999));
-    EXPECT_EQ(NO_ERROR, setInt32(ORV_PARAMETER_KEEP_ASPECT, 0));
-    EXPECT_EQ(0, getInt32(*player, ORV_PARAMETER_KEEP_ASPECT));
-    EXPECT_EQ(NO_ERROR, setInt32(ORV_PARAMETER_AUDIO_DELAY, -250));
-    EXPECT_EQ(-250, getInt32(*player, ORV_PARAMETER_AUDIO_DELAY));
-    EXPECT_EQ(INVALID_OPERATION, setInt32(ORV_PARAMETER_FRAMES_DELIVERED, 1));
-    EXPECT_EQ(BAD_VALUE, setInt32(999, 1));
-    Parcel empty;
-    EXPECT_EQ(NOT_ENOUGH_DATA, player->setParameter(ORV_PARAMETER_KEEP_ASPECT, empty));
-    Parcel reply;
-    EXPECT_EQ(BAD_VALUE, player->getParameter(999, &reply));
-    EXPECT_EQ(BAD_VALUE, player->getParameter(ORV_PARAMETER_ENGINE_NAME, nullptr));
-    EXPECT_EQ(NO_ERROR, player->getParameter(ORV_PARAMETER_ENGINE_NAME, &reply));
-    EXPECT_GT(reply.dataSize(), 8u);
 }
 
 TEST_F(DetailsTest, CountsItsFrames) {
@@ -224,31 +224,6 @@ TEST_F(DetailsTest, CountsItsFrames) {
     // A machine with other work drops some of the 60; none gets lost unseen.
     const int64_t dropped = getInt64(*player, ORV_PARAMETER_FRAMES_DROPPED);
     EXPECT_NEAR(60, static_cast<double>(sink->frameCount() + dropped), 3);
-}
-
-TEST_F(DetailsTest, InvokesMethods) {
-    open("feature.mkv");
-    Parcel request;
-    Parcel reply;
-    request.writeInt32(ORV_INVOKE_GET_TRACKS);
-    request.setDataPosition(0);
-    ASSERT_EQ(NO_ERROR, player->invoke(request, &reply));
-    reply.setDataPosition(0);
-    EXPECT_EQ(5, reply.readInt32());
-    EXPECT_EQ(ORV_TRACK_KIND_VIDEO, reply.readInt32());
-    Parcel select;
-    select.writeInt32(ORV_INVOKE_SELECT_TRACK);
-    select.writeInt32(2);
-    select.setDataPosition(0);
-    ASSERT_EQ(NO_ERROR, player->invoke(select, &reply));
-    int index = -1;
-    EXPECT_NE(0, player->getCurrentAudioIndex(&index));
-    EXPECT_EQ(1, index);
-    Parcel unknown;
-    unknown.writeInt32(77);
-    unknown.setDataPosition(0);
-    EXPECT_EQ(BAD_VALUE, player->invoke(unknown, &reply));
-    EXPECT_EQ(NOT_ENOUGH_DATA, player->invoke(Parcel(), &reply));
 }
 
 TEST_F(DetailsTest, RolesShowAndHide) {

@@ -141,6 +141,26 @@ TEST(PcmFormat, RefusesOtherMediaAndCodecs) {
     auto info = description(E_ORV_PCM_TYPE_SIGNED, 16, 2, 48000, false);
     pcmOf(info).fgBigEndian = 2;
     EXPECT_EQ(refusal(info), "bigEndian is 2, must be 0 to 1");
+    pcmOf(info).fgBigEndian = 0;
+    info.fgSynchronized = 2;
+    EXPECT_EQ(refusal(info), "synchronized is 2, must be 0 to 1");
+    info.fgSynchronized = 1;
+    EXPECT_EQ(refusal(info), "");
+}
+
+TEST(PcmFormat, TellsTheDurationByTheTimeOrElseTheSize) {
+    auto info = description(E_ORV_PCM_TYPE_SIGNED, 16, 2, 48000, false);
+    const auto duration = [&info] {
+        PcmFormat format;
+        std::string reason;
+        EXPECT_TRUE(pcmFormat(info, format, reason));
+        return format.durationMs;
+    };
+    EXPECT_EQ(duration(), 0);
+    info.u8Size = 192000 + 96000;
+    EXPECT_EQ(duration(), 1500);
+    info.u4TotalDuration = UINT32_MAX;
+    EXPECT_EQ(duration(), int64_t{UINT32_MAX});
 }
 
 // A size of 2 GiB and more arrives negative.

@@ -31,8 +31,21 @@ TEST_F(SourceTest, PathsAreCheckedAtOnce) {
     EXPECT_EQ(BAD_VALUE, setPath(""));
     EXPECT_EQ(BAD_VALUE, setPath(""));
     EXPECT_EQ(BAD_VALUE, player->setDataSource(static_cast<const char*>(nullptr), nullptr));
-    EXPECT_EQ(NO_ERROR, setPath("file://" + mediaPath("short.mp4")));
-    EXPECT_EQ(NO_ERROR, player->prepare());
+}
+
+// The ways to write the name of one file, a blank and a "%41" in it.
+TEST_F(SourceTest, FileUrlsAreDecoded) {
+    const std::string path = mediaPath("file url%41.mp4");
+    outputOf("cp '" + mediaPath("silent.mp4") + "' '" + path + "'");
+    const std::string coded = mediaPath("file%20url%2541%2Emp4");
+    for (const char* start : {"file://", "file:", "FILE://", "file://localhost"}) {
+        EXPECT_EQ(NO_ERROR, prepareUrl(start + coded)) << start;
+        player->reset();
+    }
+    EXPECT_EQ(NAME_NOT_FOUND, setPath("file://" + path)) << "%41 is an A";
+    EXPECT_EQ(NAME_NOT_FOUND, setPath("file://elsewhere" + coded));
+    EXPECT_EQ(NAME_NOT_FOUND, setPath("file://" + coded + "%00")) << "nothing is cut off";
+    EXPECT_EQ(BAD_VALUE, setPath("file:///"));
 }
 
 TEST_F(SourceTest, UnreadableFilesAreTold) {

@@ -87,13 +87,12 @@ std::vector<uint8_t> reference(const std::string& name, const std::string& secon
 
 // The picture's rows without what is between them.
 std::vector<uint8_t> draw(Thumbnailer& thumbnailer, int64_t positionMs, Size size,
-                          FramePick pick = FramePick::Exact, const Mode& mode = kBgra) {
+                          const Mode& mode = kBgra) {
     const size_t stride = thumbnailStride(mode.colorMode, size.width);
     const size_t used = static_cast<size_t>(size.width) * bytesPerPixel(mode.colorMode);
     std::vector<uint8_t> buffer(stride * size.height);
-    EXPECT_EQ(thumbnailer.draw(positionMs, pick,
-                               {buffer.data(), static_cast<uint32_t>(buffer.size()), mode.colorMode,
-                                size.width, size.height}),
+    EXPECT_EQ(thumbnailer.draw(positionMs, {buffer.data(), static_cast<uint32_t>(buffer.size()),
+                                            mode.colorMode, size.width, size.height}),
               0);
     std::vector<uint8_t> packed;
     for (int y = 0; y < size.height; y++) {
@@ -113,7 +112,7 @@ TEST(Thumbnailer, DrawsWhatFfmpegExtractsInEveryMode) {
     for (const Mode& mode : kModes) {
         // Rows with padding and without, in modes of two and of four bytes.
         for (const Size size : {Size{150, 1}, Size{96, 255}}) {
-            EXPECT_GT(psnr(mode, draw(*thumbnailer, 3480, size, FramePick::Exact, mode),
+            EXPECT_GT(psnr(mode, draw(*thumbnailer, 3480, size, mode),
                            reference("video.mp4", "3.48", size, mode)),
                       kSamePicture)
                 << mode.pixelFormat << " " << size.width << "x" << size.height;
@@ -152,20 +151,6 @@ TEST(Thumbnailer, DrawsTheLastFramePastTheEndAndTheFirstBeforeTheStart) {
     }
 }
 
-TEST(Thumbnailer, DrawsTheKeyFrameBefore) {
-    const auto thumbnailer = open("video.mp4");
-    for (int64_t position : {4000, 4040, 5960}) {
-        EXPECT_GT(psnr(kBgra, draw(*thumbnailer, position, {160, 90}, FramePick::KeyFrame),
-                       reference("video.mp4", "4", {160, 90})),
-                  kSamePicture)
-            << position;
-    }
-    // And an exact one afterwards with the same decoder.
-    EXPECT_GT(
-        psnr(kBgra, draw(*thumbnailer, 5960, {160, 90}), reference("video.mp4", "5.96", {160, 90})),
-        kSamePicture);
-}
-
 // A slide that shows for a second is on screen all that time.
 TEST(Thumbnailer, DrawsTheSlideOnScreen) {
     const auto thumbnailer = open("slides.mkv");
@@ -194,7 +179,7 @@ TEST(Thumbnailer, TakesTheMatrixFromTheTagOrTheSize) {
                   kSamePicture)
             << name;
         const Mode& uyvy = kModes[4];
-        EXPECT_GT(psnr(uyvy, draw(*open(name), 400, {160, 90}, FramePick::Exact, uyvy),
+        EXPECT_GT(psnr(uyvy, draw(*open(name), 400, {160, 90}, uyvy),
                        reference(name, "0.4", {160, 90}, uyvy, ":in_color_matrix=bt709")),
                   kSamePicture)
             << name;
@@ -260,8 +245,7 @@ TEST(Thumbnailer, LeavesTheBufferAloneWhenItFails) {
     std::vector<uint8_t> buffer(64 * 4, 0xA5);
     const std::vector<uint8_t> untouched = buffer;
     const auto thumbnailer = open("video.mp4");
-    EXPECT_EQ(thumbnailer->draw(0, FramePick::Exact, {buffer.data(), 255, 5, 16, 4}),
-              android::BAD_VALUE);
+    EXPECT_EQ(thumbnailer->draw(0, {buffer.data(), 255, 5, 16, 4}), android::BAD_VALUE);
     std::atomic<bool> cancel{false};
     MediaOpenOptions options;
     options.cancel = &cancel;
@@ -270,7 +254,7 @@ TEST(Thumbnailer, LeavesTheBufferAloneWhenItFails) {
     std::unique_ptr<Thumbnailer> cancelled;
     ASSERT_EQ(Thumbnailer::create(std::move(file), -1, cancelled), 0);
     cancel = true;
-    EXPECT_EQ(cancelled->draw(0, FramePick::Exact, {buffer.data(), 256, 5, 16, 4}), ORV_ERROR_IO);
+    EXPECT_EQ(cancelled->draw(0, {buffer.data(), 256, 5, 16, 4}), ORV_ERROR_IO);
     EXPECT_EQ(buffer, untouched);
 }
 

@@ -47,9 +47,10 @@ struct ORV_AUD_INFO_T {
 
 struct IORV_PB_CTRL_SET_MEDIA_INFO_T {
     E_Orv_Media_Type eMediaType;  // E_ORV_MEDIA_TYPE_AUDIO_ES
-    uint32_t u4TotalDuration;     // milliseconds, 0 when unknown
-    int64_t u8Size;               // bytes, 0 or negative when unknown
-    uint8_t fgSynchronized;       // 0 or 1
+    // Of media whose source does not know its length; a source's own counts first.
+    uint32_t u4TotalDuration;  // milliseconds, 0 when unknown
+    int64_t u8Size;            // bytes, 0 or negative when unknown; where the above is 0
+    uint8_t fgSynchronized;    // 0 or 1, of no effect
     union alignas(8) {
         struct {
             ORV_AUD_INFO_T tAudInfo;

@@ -130,7 +130,14 @@ public:
     // Percent of the duration that is there to be played.
     int getBufferPercent();
 
-    // The picture of the current position. Blocks while it is decoded.
+    // What the media say beyond playback is read from the source once more, when
+    // first asked for: pictures, metadata, track and chapter records. That blocks
+    // for ten seconds at most, unless a stream source's own read blocks longer.
+    // Sources that cannot be read twice (pipes, streams that do not seek) have no
+    // pictures and chapters; the rest is then what playback has found.
+    //
+    // The picture of the current position, of the video track that is shown.
+    // Blocks while it is decoded, too.
     bool getThumbnailInfo(_Media_Thumbnail_Info_T* thumbnail);
     // The caller frees it; null without a picture.
     MediaAlbumArt* extractAlbumArt();
