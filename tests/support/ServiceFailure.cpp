@@ -9,6 +9,7 @@ using android::status_t;
 namespace {
 
 status_t sStatus = android::NO_ERROR;
+int sCliArgument = 0;
 
 }  // namespace
 
@@ -16,6 +17,8 @@ namespace orvtest {
 
 ServiceFailure::ServiceFailure(status_t status) { sStatus = status; }
 ServiceFailure::~ServiceFailure() { sStatus = android::NO_ERROR; }
+
+int lastCliArgument() { return sCliArgument; }
 
 }  // namespace orvtest
 
@@ -44,6 +47,7 @@ bool __real__ZN7android15OrvMediaService21ServiceSendCliCommandEPhi(OrvMediaServ
 
 bool __wrap__ZN7android15OrvMediaService21ServiceSendCliCommandEPhi(OrvMediaService* service,
                                                                     unsigned char* cmd, int len) {
+    sCliArgument = len;
     const bool good =
         __real__ZN7android15OrvMediaService21ServiceSendCliCommandEPhi(service, cmd, len);
     return good && sStatus == android::NO_ERROR;

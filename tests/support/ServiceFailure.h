@@ -17,4 +17,7 @@ public:
     ServiceFailure& operator=(const ServiceFailure&) = delete;
 };
 
+// The length that the service's decoder command last came with.
+int lastCliArgument();
+
 }  // namespace orvtest
