@@ -1,4 +1,9 @@
 // SPDX-License-Identifier: Apache-2.0
+#include <fcntl.h>
+#include <unistd.h>
+
+#include <algorithm>
+
 #include "PlaybackCommandTable.h"
 
 namespace orvtest {
@@ -6,6 +11,12 @@ namespace {
 
 constexpr char kHeaders[] = "OrvMediaClient_setDataSourceAndHeaders";
 constexpr char kPlain[] = "OrvMediaClient_setDataSource";
+
+int lowestFreeDescriptor() {
+    const int fd = open("/dev/null", O_RDONLY | O_CLOEXEC);
+    close(fd);
+    return fd;
+}
 
 class DataSourceCommandsTest : public JniFixture {
 protected:
@@ -77,6 +88,16 @@ TEST_F(DataSourceCommandsTest, HeadersReachTheEngineAsAMap) {
                     .engine({"configPlayer(false)", "setDataSource(/a, {A: 2, B: 3})"}));
 }
 
+TEST_F(DataSourceCommandsTest, PathIsGivenBackBeforeTheHeadersAreRead) {
+    setUpPlayer();
+    setDataSource(string("/a"), strings({"A"}), strings({"1"}));
+    const std::vector<std::string> calls = vmCalls();
+    const auto released = std::find(calls.begin(), calls.end(), "ReleaseStringUTFChars");
+    EXPECT_EQ(std::count(calls.begin(), released, "GetStringUTFChars"), 1);
+    EXPECT_EQ(std::count(calls.begin(), released, "GetArrayLength"), 0);
+    EXPECT_GT(std::count(released, calls.end(), "GetArrayLength"), 0);
+}
+
 TEST_F(DataSourceCommandsTest, EmptyHeadersAreANullMap) {
     setUpPlayer();
     EXPECT_THAT(setDataSource(string("/a"), strings({}), strings({})),
@@ -96,6 +117,20 @@ TEST_F(DataSourceCommandsTest, UnequalHeadersAreAnIllegalArgument) {
                 refused);
     EXPECT_THAT(setDataSource(string("/a"), strings({"a"}), nullptr), refused);
     EXPECT_THAT(setDataSource(string("/a"), nullptr, strings({"1"})), refused);
+}
+
+TEST_F(DataSourceCommandsTest, DescriptorIsNeitherDuplicatedNorClosed) {
+    setUpPlayer();
+    int ends[2];
+    ASSERT_EQ(pipe(ends), 0);
+    const int lowest = lowestFreeDescriptor();
+    jobject descriptor = vm.local(newFileDescriptor(vm, ends[0]));
+    EXPECT_THAT(setDataSource(descriptor, 0, 9).engine,
+                testing::ElementsAre("setDataSource(" + std::to_string(ends[0]) + ", 0, 9)"));
+    call<void>("native_release", "()V");
+    EXPECT_EQ(lowestFreeDescriptor(), lowest);
+    EXPECT_NE(fcntl(ends[0], F_GETFD), -1);
+    for (int end : ends) close(end);
 }
 
 TEST_F(DataSourceCommandsTest, NullDescriptorIsAnIllegalArgument) {

@@ -46,13 +46,6 @@ protected:
         replace(name, signature, [=](const fakejni::Invocation&) { return value; });
     }
 
-    // The functions of the virtual machine that were called, in order.
-    std::vector<std::string> vmCalls() {
-        std::vector<std::string> functions;
-        for (const fakejni::JniCall& call : vm.calls()) functions.push_back(call.function);
-        return functions;
-    }
-
     std::unique_ptr<JavaInputStream> stream;
 };
 

@@ -2,7 +2,6 @@
 // The stream's two mutexes: which operation holds which while Java is asked.
 #include <errno.h>
 
-#include "FakeJni/EnvSupport.h"
 #include "JavaInputStreamFixture.h"
 #include "MutexProbe.h"
 #include "PrivateMember.h"
@@ -28,45 +27,22 @@ using testing::SizeIs;
 // What another thread gets of the call mutex and of the stream mutex.
 using Tried = std::pair<int, int>;
 
-std::function<void()> gLook;
-const JNINativeInterface* gOriginal;
-
 class JavaInputStreamLocksTest : public JavaInputStreamFixture {
 protected:
     void SetUp() override {
         JavaInputStreamFixture::SetUp();
         make();
-        gLook = [this] {
-            tried.emplace_back(tryFromAnotherThread(callMutex()),
-                               tryFromAnotherThread(streamMutex()));
-        };
-    }
-    void TearDown() override {
-        gLook = nullptr;
-        JavaInputStreamFixture::TearDown();
     }
 
     os::Mutex& callMutex() { return (*stream).*memberOf(CallMutex{}); }
     os::Mutex& streamMutex() { return (*stream).*memberOf(StreamMutex{}); }
 
-    // On an engine's thread, with a look whenever a long field is read.
-    void lookAtFields(const std::function<void()>& body) {
-        vm.onNativeThread([&] {
-            JNIEnv* env = &vm.thisThread().env;
-            gOriginal = env->functions;
-            JNINativeInterface table = *gOriginal;
-            table.GetLongField = [](JNIEnv* e, jobject object, jfieldID field) {
-                gLook();
-                return gOriginal->GetLongField(e, object, field);
-            };
-            env->functions = &table;
-            body();
-            env->functions = gOriginal;
-        });
+    void look() {
+        tried.emplace_back(tryFromAnotherThread(callMutex()), tryFromAnotherThread(streamMutex()));
     }
     void lookIn(const std::string& name, const std::string& signature, Value result) {
         replace(name, signature, [=](const fakejni::Invocation&) {
-            gLook();
+            look();
             return result;
         });
     }
@@ -75,11 +51,13 @@ protected:
 };
 
 TEST_F(JavaInputStreamLocksTest, SizePositionAndDurationAreSerialised) {
-    lookAtFields([&] {
+    vm.whenCalled("GetLongField", [this] { look(); });
+    vm.onNativeThread([&] {
         stream->getFileLength();
         stream->getCurrentPosition();
         stream->getDuration();
     });
+    vm.whenCalled("GetLongField", [] {});
     EXPECT_THAT(tried, SizeIs(3));
     EXPECT_THAT(tried, Each(Tried(EBUSY, 0)));
     EXPECT_EQ(tryFromAnotherThread(callMutex()), 0);

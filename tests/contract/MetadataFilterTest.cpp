@@ -4,6 +4,7 @@
 
 #include <future>
 
+#include "ParcelFailure.h"
 #include "PrivateMember.h"
 #include "ServiceFixture.h"
 
@@ -139,10 +140,39 @@ INSTANTIATE_TEST_SUITE_P(
     [](const auto& info) { return info.param.name; });
 
 TEST_F(MetadataFilterTest, FiltersAreSetWithoutTheLock) {
+    std::future<int> set;  // outlives the lock, for it waits when it goes
     android::Mutex::Autolock held(service.get()->*memberOf(MetadataLock{}));
-    auto set = std::async(std::launch::async,
-                          [&] { return service->setMetadataFilter(filterOf({1}, {})); });
+    set = std::async(std::launch::async,
+                     [&] { return service->setMetadataFilter(filterOf({1}, {})); });
     EXPECT_EQ(set.wait_for(std::chrono::seconds(10)), std::future_status::ready);
+}
+
+TEST_F(MetadataFilterTest, UpdatesAndTheFiltersReadersWaitForTheLock) {
+    attachPlayer();
+    Parcel reply;
+    const std::pair<const char*, std::function<void()>> operations[] = {
+        {"getMetadata", [&] { service->getMetadata(true, false, &reply); }},
+        {"shouldDropMetadata", [&] { service->shouldDropMetadata(1); }},
+        {"addNewMetadataUpdate", [&] { service->addNewMetadataUpdate(1); }},
+    };
+    for (const auto& [name, operation] : operations) {
+        SCOPED_TRACE(name);
+        std::future<void> done;
+        {
+            android::Mutex::Autolock held(service.get()->*memberOf(MetadataLock{}));
+            done = std::async(std::launch::async, operation);
+            EXPECT_EQ(done.wait_for(std::chrono::milliseconds(100)), std::future_status::timeout);
+        }
+        EXPECT_EQ(done.wait_for(std::chrono::seconds(10)), std::future_status::ready);
+    }
+}
+
+TEST_F(MetadataFilterTest, ParcelWithoutItsBytesIsABadValue) {
+    setSomeFilters();
+    const ParcelFailure failure;
+    EXPECT_EQ(service->setMetadataFilter(filterOf({1}, {2})), android::BAD_VALUE);
+    expectSomeFilters();
+    EXPECT_THAT(log.take(), LinesAre({filterEntry, error("Filter had no data")}));
 }
 
 // Whether a code is dropped under a pair of filters.
@@ -178,6 +208,15 @@ TEST_F(MetadataFilterTest, MetadataWithoutPlayerLeavesTheReply) {
     EXPECT_EQ(reply.dataSize(), 0u);
     EXPECT_THAT(log.take(),
                 LinesAre({metadataEntry, error("OrvMediaService::getMetadata(): NO_INIT")}));
+}
+
+TEST_F(MetadataFilterTest, MetadataWithoutPlayerKeepsTheUpdates) {
+    service->addNewMetadataUpdate(3);
+    Parcel reply;
+    service->getMetadata(true, false, &reply);
+    attachPlayer();
+    service->getMetadata(true, false, &reply);
+    EXPECT_THAT(engine->calls(), ElementsAre("getMetadata({3})"));
 }
 
 TEST_F(MetadataFilterTest, EngineRecordsStandUnderTheHeader) {

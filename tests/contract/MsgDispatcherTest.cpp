@@ -151,9 +151,7 @@ TEST_F(MsgDispatcherTest, ParcelReachesJavaAsItsRawBytes) {
     EXPECT_THAT(vm.callsOf("DeleteLocalRef"), ElementsAre("byte[12]"));
     EXPECT_THAT(vm.callsOf("ReleaseByteArrayElements"), ElementsAre("0"));
     // The bytes are Java's before the event is posted.
-    std::vector<std::string> functions;
-    for (const fakejni::JniCall& call : vm.calls()) functions.push_back(call.function);
-    EXPECT_THAT(functions,
+    EXPECT_THAT(vmCalls(),
                 ElementsAre("GetEnv", "AttachCurrentThread", "NewByteArray", "GetByteArrayElements",
                             "ReleaseByteArrayElements", "CallStaticVoidMethod", "DeleteLocalRef",
                             "DetachCurrentThread"));

@@ -1,5 +1,6 @@
 // SPDX-License-Identifier: Apache-2.0
 // The service's life, its own settings, and operations with a rule of their own.
+#include <binder/Parcel.h>
 #include <jni/media-service/OrvMediaServiceListener.h>
 #include <string.h>
 
@@ -242,6 +243,15 @@ TEST_F(OrvMediaServiceTest, AudioSessionLines) {
     EXPECT_THAT(log.take(),
                 LinesAre({info("OrvMediaService::setAudioSessionId(-1), not implement"),
                           info("OrvMediaService::getAudioSessionId(), not implement")}));
+}
+
+TEST_F(OrvMediaServiceTest, ParameterIsTheEnginesReply) {
+    attachPlayer();
+    engine->reply("getParameter", {77});
+    android::Parcel reply;
+    EXPECT_EQ(service->getParameter(1400, &reply), android::NO_ERROR);
+    reply.setDataPosition(0);
+    EXPECT_EQ(reply.readInt32(), 77);
 }
 
 TEST_F(OrvMediaServiceTest, TimedTextIsForwardedUnconditionally) {

@@ -260,6 +260,25 @@ TEST_F(PlaybackCommandsTest, FrameIsNullWithAndWithoutService) {
     EXPECT_THAT(getFrame(), null);
     setUpPlayer();
     EXPECT_THAT(getFrame(), null);
+    EXPECT_THAT(vm.callsOf("GetLongField"), testing::IsEmpty()) << "the service was looked up";
+}
+
+// Its destructor runs behind the command, on the command's thread.
+TEST_F(PlaybackCommandsTest, ServiceOutlivesAReleaseDuringTheCall) {
+    setUpPlayer();
+    engine->whenCalled("start", [&] {
+        vm.onJavaThread([&] {
+            fakejni::callNative<void>(vm, playerClass, vm.local(player), "native_release", "()V");
+        });
+        EXPECT_EQ(ScriptedEngine::live(), 1);
+    });
+    std::vector<ExpectedLine> lines = playbackCommand("start").whole();
+    lines.push_back(service("~OrvMediaService()"));
+    lines.push_back(serviceInfo("setNotifyCallback"));
+    // The release gives the two references of the events' poster up.
+    EXPECT_THAT(run("start"),
+                ReturnsNothing().logs(lines).engine({"start()", "release()"}).makesGlobals(-2));
+    EXPECT_EQ(ScriptedEngine::live(), 0);
 }
 
 class AudioTrackTest : public PlaybackCommandsTest {

@@ -58,6 +58,23 @@ TEST_F(VideoSurfaceTest, BindingHandsTheProducerOnAndKeepsOneReference) {
     EXPECT_EQ(producer->getStrongCount(), 3);
 }
 
+// First the reference, then the field, then the service. The count is that of
+// the fixture, the surface, the Java object and the call itself.
+TEST_F(VideoSurfaceTest, ReferenceIsTakenBeforeTheAddressIsWrittenAndHandedOn) {
+    setUpPlayer();
+    std::vector<std::string> steps;
+    const auto step = [&](const std::string& name) {
+        EXPECT_EQ(producer->getStrongCount(), 4) << name;
+        EXPECT_EQ(field(), name == "written" ? 0 : addressOf(producer)) << name;
+        steps.push_back(name);
+    };
+    vm.whenCalled("SetLongField", [&] { step("written"); });
+    engine->whenCalled("setVideoSurfaceTexture", [&] { step("handed on"); });
+    set(newJavaSurface(vm, surface));
+    EXPECT_THAT(steps, testing::ElementsAre("written", "handed on"));
+    vm.whenCalled("SetLongField", [] {});
+}
+
 TEST_F(VideoSurfaceTest, BindingTwiceStillKeepsOneReference) {
     setUpPlayer();
     set(newJavaSurface(vm, surface));
@@ -117,6 +134,25 @@ TEST_F(VideoSurfaceTest, SurfaceWithoutProducerThrows) {
             .logs(lines({bridgeError("setVideoSurface(): new_st==null, throw exception\n")}))
             .throws(kIllegalArgument, "The surface does not have a binding SurfaceTexture!"));
     EXPECT_EQ(field(), 0);
+}
+
+// The address that a failed binding leaves costs a reference once more, at the
+// next binding alone.
+TEST_F(VideoSurfaceTest, StaleAddressIsDroppedOnceByTheNextBinding) {
+    setUpPlayer();
+    set(newJavaSurface(vm, surface));
+    set(newJavaSurface(vm, new Surface(nullptr)));
+    EXPECT_EQ(field(), addressOf(producer));
+    EXPECT_EQ(producer->getStrongCount(), 2);
+    producer->incStrong(this);  // the one that it costs
+    for (int round = 0; round < 2; round++) {
+        EXPECT_THAT(set(nullptr),
+                    ReturnsNothing().logs(wholeBinding()).engine({"setVideoSurfaceTexture(null)"}));
+        EXPECT_EQ(field(), 0);
+        EXPECT_EQ(producer->getStrongCount(), 2);
+    }
+    call<void>("native_release", "()V");
+    EXPECT_EQ(producer->getStrongCount(), 2);
 }
 
 TEST_F(VideoSurfaceTest, MissingServiceIsLoggedTwiceAndThrows) {

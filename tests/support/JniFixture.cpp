@@ -106,6 +106,12 @@ jobjectArray VmFixture::strings(const std::vector<std::string>& texts) {
     return vm.local<jobjectArray>(vm.newArray("java/lang/String", elements));
 }
 
+std::vector<std::string> VmFixture::vmCalls() {
+    std::vector<std::string> functions;
+    for (const fakejni::JniCall& call : vm.calls()) functions.push_back(call.function);
+    return functions;
+}
+
 void JniFixture::SetUp() {
     ORV::SyncToAsync::getInstance();  // the first use logs more than the later ones
     loadLibrary();

@@ -59,6 +59,9 @@ public:
     }
     jobjectArray strings(const std::vector<std::string>& texts);
 
+    // The functions of the virtual machine that were called, in order.
+    std::vector<std::string> vmCalls();
+
     LogCapture log;
     fakejni::Vm vm;
     fakejni::Class& playerClass;

@@ -98,6 +98,10 @@ public:
     // How many calls were failed so far.
     int failures() const { return mFailures; }
 
+    // Runs in each call of that function, on its thread, before the function
+    // does its work. The machine is locked meanwhile.
+    void whenCalled(const std::string& function, std::function<void()> action);
+
     // --- exceptions, on the calling thread
     std::optional<Thrown> pending();
     void clearPending();
@@ -170,6 +174,7 @@ private:
     std::map<int, std::unique_ptr<ThreadState>> mThreads;
     std::vector<Plan> mPlans;
     int mFailures = 0;
+    std::map<std::string, std::function<void()>> mActions;
     std::vector<JniCall> mCalls;
     std::vector<JavaCall> mJavaCalls;
     std::vector<JNINativeMethod> mRegistrations;

@@ -37,6 +37,13 @@ bool Vm::mustFail(const std::string& function) {
 
 void Vm::record(const std::string& function, const std::string& detail) {
     mCalls.push_back({function, detail, std::this_thread::get_id()});
+    const auto action = mActions.find(function);
+    if (action != mActions.end()) action->second();
+}
+
+void Vm::whenCalled(const std::string& function, std::function<void()> action) {
+    Lock lock(mMutex);
+    mActions[function] = std::move(action);
 }
 
 void Vm::recordJava(JavaCall call) { mJavaCalls.push_back(std::move(call)); }

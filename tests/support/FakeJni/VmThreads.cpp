@@ -54,9 +54,8 @@ jint destroyJavaVm(JavaVM* vm) {
 
 const JNIInvokeInterface* vmTable() {
     static const JNIInvokeInterface table = {
-        nullptr, nullptr,        nullptr, destroyJavaVm, attachCurrentThread, detachCurrentThread,
-        getEnv,  attachAsDaemon,
-    };
+        nullptr, nullptr,       nullptr, destroyJavaVm, attachCurrentThread, detachCurrentThread,
+        getEnv,  attachAsDaemon};
     return &table;
 }
 
