@@ -73,6 +73,7 @@ ThreadState& Vm::thisThread() {
 }
 
 jint Vm::attach(JNIEnv** env, bool asJava) {
+    Lock lock(mMutex);
     ThreadState& thread = thisThread();
     if (!thread.attached) {
         thread.isJava = asJava;
@@ -84,6 +85,7 @@ jint Vm::attach(JNIEnv** env, bool asJava) {
 }
 
 jint Vm::detach() {
+    Lock lock(mMutex);
     ThreadState& thread = thisThread();
     if (!thread.attached || thread.isJava) {
         violation(std::string("DetachCurrentThread: ") +
@@ -104,6 +106,7 @@ void Vm::onJavaThread(const std::function<void()>& body) {
         JNIEnv* env;
         attach(&env, true);
         body();
+        Lock lock(mMutex);
         thisThread().isJava = false;
         detach();
     });
