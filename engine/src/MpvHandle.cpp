@@ -3,6 +3,7 @@
 
 #include <glob.h>
 #include <locale.h>
+#include <string.h>
 
 #include <mutex>
 
@@ -62,17 +63,20 @@ const char* audioOutputs() {
 }
 
 // The core refuses to start while numbers are written with a decimal comma,
-// and looks at the process's locale, not at the thread's.
-void usePointInNumbers() {
-    static std::once_flag once;
-    std::call_once(once, [] { setlocale(LC_NUMERIC, "C"); });
+// and looks at the process's locale, not at the thread's. Anybody may have set
+// one since the last core.
+mpv_handle* createWithPointInNumbers() {
+    static std::mutex mutex;
+    std::lock_guard<std::mutex> lock(mutex);
+    const char* numbers = setlocale(LC_NUMERIC, nullptr);
+    if (numbers == nullptr || strcmp(numbers, "C") != 0) setlocale(LC_NUMERIC, "C");
+    return mpv_create();
 }
 
 }  // namespace
 
 bool MpvHandle::create(bool hardwareDecoder) {
-    usePointInNumbers();
-    mHandle = mpv_create();
+    mHandle = createWithPointInNumbers();
     if (mHandle == nullptr) return refused(__func__, "no playback core");
     int error = mpv_set_option_string(mHandle, "hwdec", hardwareDecoder ? "auto-copy-safe" : "no");
     if (error == 0) error = mpv_set_option_string(mHandle, "ao", audioOutputs());

@@ -5,6 +5,7 @@
 #include <string.h>
 
 #include <algorithm>
+#include <chrono>
 #include <string>
 
 #include "Audio.h"
@@ -68,14 +69,18 @@ protected:
     std::vector<uint8_t> record(const std::string& tone) {
         mpv.set("pause", false);
         mpv.command({"loadfile", tone.c_str()});
-        while (mpv_wait_event(mpv.get(), 20)->event_id != MPV_EVENT_END_FILE) {
+        const auto deadline = std::chrono::steady_clock::now() + std::chrono::seconds(20);
+        while (mpv_wait_event(mpv.get(), 1)->event_id != MPV_EVENT_END_FILE) {
+            if (std::chrono::steady_clock::now() < deadline) continue;
+            ADD_FAILURE() << "the file does not end";
+            break;
         }
         return bytesOf(file);
     }
 
     const std::string file = mediaPath("heard.pcm");
     MpvHandle mpv;
-    VideoOutput video{[] {}, [] { return int64_t{0}; }};
+    VideoOutput video{[] {}, [](uint64_t) { return int64_t{0}; }};
     Audio audio{mpv, video};
 };
 

@@ -1,0 +1,49 @@
+// SPDX-License-Identifier: Apache-2.0
+#include "CoreCalls.h"
+
+#include <dlfcn.h>
+#include <mpv/client.h>
+#include <pthread.h>
+#include <string.h>
+
+#include <atomic>
+
+namespace orvtest {
+namespace {
+
+std::atomic<bool> gNoNewCore{false};
+std::atomic<int> gQuestions{0};
+
+bool isRendering() {
+    char name[16] = "";
+    pthread_getname_np(pthread_self(), name, sizeof(name));
+    return strcmp(name, "orv-render") == 0;
+}
+
+template <class Function>
+Function* original(const char* name) {
+    return reinterpret_cast<Function*>(dlsym(RTLD_NEXT, name));
+}
+
+}  // namespace
+
+NoNewCore::NoNewCore() { gNoNewCore = true; }
+NoNewCore::~NoNewCore() { gNoNewCore = false; }
+
+int questionsWhileRendering() { return gQuestions; }
+
+}  // namespace orvtest
+
+// These stand before the media library's for the whole test program.
+
+mpv_handle* mpv_create() {
+    static const auto create = orvtest::original<mpv_handle*()>("mpv_create");
+    return orvtest::gNoNewCore ? nullptr : create();
+}
+
+int mpv_get_property(mpv_handle* mpv, const char* name, mpv_format format, void* data) {
+    static const auto get =
+        orvtest::original<int(mpv_handle*, const char*, mpv_format, void*)>("mpv_get_property");
+    if (orvtest::isRendering()) orvtest::gQuestions++;
+    return get(mpv, name, format, data);
+}

@@ -1,0 +1,19 @@
+// SPDX-License-Identifier: Apache-2.0
+#pragma once
+
+namespace orvtest {
+
+// While it lives, no playback core can be created.
+class NoNewCore {
+public:
+    NoNewCore();
+    ~NoNewCore();
+    NoNewCore(const NoNewCore&) = delete;
+    NoNewCore& operator=(const NoNewCore&) = delete;
+};
+
+// How often a rendering thread of any player has asked the core for a value so
+// far, which may stop the core for as long as it waits for that thread.
+int questionsWhileRendering();
+
+}  // namespace orvtest

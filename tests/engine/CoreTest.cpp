@@ -1,0 +1,57 @@
+// SPDX-License-Identifier: Apache-2.0
+// Whether a player gets its playback core, whatever the process is like.
+#include <locale.h>
+#include <stdlib.h>
+
+#include "CoreCalls.h"
+#include "LogCapture.h"
+#include "PlayerTest.h"
+
+using namespace android;
+using namespace orvtest;
+
+namespace {
+
+class CoreTest : public PlayerTest {
+protected:
+    ~CoreTest() override { setlocale(LC_ALL, "C"); }
+};
+
+// As a JVM or a toolkit leaves it behind, at any time.
+TEST_F(CoreTest, ADecimalCommaDoesNotMatter) {
+    setenv("LOCPATH", mediaPath("locale").c_str(), 1);
+    const bool set = setlocale(LC_ALL, "de_DE.UTF-8") != nullptr;
+    unsetenv("LOCPATH");
+    if (!set && sizeof(void*) == 4) GTEST_SKIP() << "no locale of the other machine's making";
+    ASSERT_TRUE(set);
+    ASSERT_STREQ(",", localeconv()->decimal_point);
+    sp<TarnPlayer> other = new TarnPlayer(-1);
+    ASSERT_EQ(NO_ERROR, other->setDataSource(mediaPath("feature.mkv").c_str(), nullptr));
+    ASSERT_EQ(NO_ERROR, other->prepare());
+    EXPECT_EQ(NO_ERROR, other->seekTo(2500, 3));
+    int msec = 0;
+    EXPECT_EQ(NO_ERROR, other->getCurrentPosition(&msec));
+    EXPECT_NEAR(2500, msec, 34);
+}
+
+TEST_F(CoreTest, RenderingAsksTheCoreNothing) {
+    open("feature.mkv");
+    ASSERT_EQ(NO_ERROR, player->seekTo(4000, 0));
+    ASSERT_TRUE(sink->waitFor(0, [](const Picture& p) { return p.timestampUs == 4000000; }));
+    ASSERT_TRUE(player->step(1));
+    ASSERT_EQ(NO_ERROR, player->start());
+    ASSERT_TRUE(eventually([&] { return position() > 4500; }));
+    EXPECT_EQ(0, questionsWhileRendering());
+}
+
+TEST_F(CoreTest, WithoutACoreAPlayerIsAsReleased) {
+    LogCapture log;
+    NoNewCore failure;
+    sp<TarnPlayer> other = new TarnPlayer(-1);
+    EXPECT_THAT(log.lines("TarnPlayer"), LinesAre({error("create: no playback core")}));
+    EXPECT_EQ(INVALID_OPERATION, other->setDataSource(mediaPath("feature.mkv").c_str(), nullptr));
+    EXPECT_EQ(INVALID_OPERATION, other->reset());
+    EXPECT_EQ(NO_ERROR, other->release());
+}
+
+}  // namespace
