@@ -10,11 +10,12 @@ namespace android {
 
 TarnPlayer::Engine::Engine(int decoder, orvtarn::Notifier::Deliver deliver)
     : notifier(std::move(deliver)),
-      video([this] { events.onFrame(); }, [this] { return transport.frameTime(); }),
+      video([this] { events.onFrame(); },
+            [this](uint64_t frame) { return events.frameTime(frame); }),
       events(mpv, state, video, notifier),
       loader(mpv, state, video, events, protocol),
-      seeker(mpv, state, notifier),
-      transport(mpv, state),
+      seeker(mpv, state, notifier, events),
+      transport(mpv, state, events),
       speed(mpv, state, seeker, transport),
       stepper(mpv, state, seeker, transport),
       abRepeat(mpv, state),
@@ -24,11 +25,15 @@ TarnPlayer::Engine::Engine(int decoder, orvtarn::Notifier::Deliver deliver)
       bytes(mpv, state, loader, seeker),
       metaData(mpv, state, loader),
       parameters(mpv, state, video, tracks, subtitles) {
-    loader.setBeforeLoad([this] { beforeLoad(); });
-    loader.setOnForget([this] { subtitles.reset(); });
-    events.setEndHandler([this] { return speed.onEndReached(); });
+    events.setEndHandler([this] { return !speed.onEndReached() && transport.complete(); });
     events.setOpenedHandler([this] { subtitles.addToMedia(); });
-    if (!create(decoder >= 0)) release();
+    if (!create(decoder >= 0)) {
+        release();
+        return;
+    }
+    loader.setBeforeLoad([this] { beforeLoad(); });
+    loader.setOnUnload([this] { speed.reset(); });
+    loader.setOnForget([this] { subtitles.reset(); });
 }
 
 bool TarnPlayer::Engine::create(bool hardwareDecoder) {
@@ -37,7 +42,7 @@ bool TarnPlayer::Engine::create(bool hardwareDecoder) {
 }
 
 void TarnPlayer::Engine::release() {
-    if (!gate.close()) return;
+    if (!gate.close()) return awaitReleased();
     loader.release();
     gate.awaitEmpty();
     speed.shutDown();
@@ -45,6 +50,11 @@ void TarnPlayer::Engine::release() {
     events.stop();
     mpv.destroy();
     notifier.stop();
+    gate.setDone();
+}
+
+void TarnPlayer::Engine::awaitReleased() {
+    if (!notifier.isDelivering()) gate.awaitDone();
 }
 
 void TarnPlayer::Engine::beforeLoad() {

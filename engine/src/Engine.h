@@ -41,8 +41,12 @@ public:
         return closed;
     }
 
-    // Ends the operations under way and takes the units apart. Once.
+    // Ends the operations under way and takes the units apart. Once; later
+    // calls wait for the first.
     void release();
+    // Returns when a release that has begun is done. Not for the listener,
+    // whose return that release waits for: it goes on at once.
+    void awaitReleased();
 
 private:
     orvtarn::Gate gate;

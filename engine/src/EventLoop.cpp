@@ -1,6 +1,7 @@
 // SPDX-License-Identifier: Apache-2.0
 #include "EventLoop.h"
 
+#include <math.h>
 #include <media/MediaPlayerInterface.h>
 #include <orvtarn/PlayerTypes.h>
 #include <string.h>
@@ -49,6 +50,12 @@ bool flagOf(const mpv_event_property& property) {
     return *static_cast<const int*>(property.data) != 0;
 }
 
+int64_t toMicroseconds(double seconds) { return llround(std::max(seconds, 0.0) * 1e6); }
+
+// Places in the core's load at which it waits.
+constexpr char kBeforeOpening[] = "on_load";
+constexpr char kOpened[] = "on_preloaded";
+
 }  // namespace
 
 bool EventLoop::start() {
@@ -57,8 +64,10 @@ bool EventLoop::start() {
             mpv_observe_property(mMpv.get(), property.id, property.name, property.format);
         if (error < 0) return refused("observe", mpv_error_string(error));
     }
-    const int error = mpv_hook_add(mMpv.get(), 0, "on_preloaded", 0);
-    if (error < 0) return refused("observe", mpv_error_string(error));
+    for (const char* hook : {kBeforeOpening, kOpened}) {
+        const int error = mpv_hook_add(mMpv.get(), 0, hook, 0);
+        if (error < 0) return refused("observe", mpv_error_string(error));
+    }
     mpv_request_log_messages(mMpv.get(), "error");
     mThread = std::thread(&EventLoop::run, this);
     return true;
@@ -78,7 +87,33 @@ void EventLoop::setSource(std::shared_ptr<MediaSource> source) {
 
 void EventLoop::run() {
     nameThisThread("orv-events");
-    while (!mQuit) handle(*mpv_wait_event(mMpv.get(), -1));
+    while (!mQuit) {
+        handle(*mpv_wait_event(mMpv.get(), -1));
+        if (mLooksForEnd.exchange(false)) onEndReached();
+        tellFrameTime();
+    }
+}
+
+// While playing, the core's own time may be that of the frame to come; paused,
+// the state may still be that of the frame before.
+std::optional<int64_t> EventLoop::frameTime(uint64_t frame) {
+    const PlayerState::Values now = mState.read([](const PlayerState::Values& v) { return v; });
+    if (now.phase == Phase::Started) return toMicroseconds(now.position);
+    mUntimedFrame = frame;
+    mpv_wakeup(mMpv.get());
+    return {};
+}
+
+void EventLoop::tellFrameTime() {
+    const uint64_t frame = mUntimedFrame.exchange(0);
+    if (frame == 0) return;
+    const double last = mState.read([](const PlayerState::Values& v) { return v.position; });
+    mVideo.setFrameTime(frame, toMicroseconds(mMpv.getDouble("time-pos").value_or(last)));
+}
+
+void EventLoop::lookForEnd() {
+    mLooksForEnd = true;
+    mpv_wakeup(mMpv.get());
 }
 
 void EventLoop::handle(const mpv_event& event) {
@@ -90,7 +125,7 @@ void EventLoop::handle(const mpv_event& event) {
             onEndFile(*static_cast<const mpv_event_end_file*>(event.data));
             break;
         case MPV_EVENT_HOOK:
-            onOpened(*static_cast<const mpv_event_hook*>(event.data));
+            onHook(*static_cast<const mpv_event_hook*>(event.data));
             break;
         case MPV_EVENT_FILE_LOADED:
             onLoaded();
@@ -118,8 +153,11 @@ void EventLoop::handle(const mpv_event& event) {
     }
 }
 
-void EventLoop::onOpened(const mpv_event_hook& hook) {
-    if (mOpenedHandler) mOpenedHandler();
+void EventLoop::onHook(const mpv_event_hook& hook) {
+    // Of a playlist, the first entry is the media: the core would go on to the
+    // others, and even when the first fails.
+    if (strcmp(hook.name, kBeforeOpening) == 0) mMpv.command({"playlist-clear"});
+    if (strcmp(hook.name, kOpened) == 0 && mOpenedHandler) mOpenedHandler();
     mpv_hook_continue(mMpv.get(), hook.id);
 }
 
@@ -133,10 +171,11 @@ void EventLoop::onLoaded() {
 }
 
 void EventLoop::onEndFile(const mpv_event_end_file& end) {
-    if (end.reason == MPV_END_FILE_REASON_REDIRECT) return;
+    const bool isPlaylist = end.reason == MPV_END_FILE_REASON_REDIRECT;
+    if (isPlaylist && end.playlist_insert_num_entries > 0) return;
     if (end.reason == MPV_END_FILE_REASON_ERROR) {
         failWith(sourceFailed() ? ORV_ERROR_IO : statusOfMpvError(end.error));
-    } else if (end.reason == MPV_END_FILE_REASON_EOF) {
+    } else if (isPlaylist || end.reason == MPV_END_FILE_REASON_EOF) {
         failWith(sourceFailed() ? ORV_ERROR_IO : ORV_ERROR_MALFORMED);
     }
     mState.update([](PlayerState::Values& v) { v.fileOpen = false; });
@@ -144,17 +183,22 @@ void EventLoop::onEndFile(const mpv_event_end_file& end) {
 
 void EventLoop::onRestart() {
     onVideoSize();
-    const bool hasVideo = mMpv.getInt("vid").value_or(0) > 0;
+    // A track of which nothing can be decoded has no size.
+    const bool hasVideo =
+        mMpv.getInt("vid").value_or(0) > 0 && mMpv.getInt("dwidth").value_or(0) > 0;
+    const bool hasSound = mMpv.getInt("aid").value_or(0) > 0;
     const double duration = durationOf(mMpv.getDouble("duration").value_or(0));
     const bool seekable = mMpv.getFlag("seekable").value_or(false);
-    mState.update([&](PlayerState::Values& v) {
+    const bool empty = mState.update([&](PlayerState::Values& v) {
         v.restarts++;
-        if (v.phase != Phase::Preparing) return;
+        if (v.phase != Phase::Preparing) return false;
         v.restarted = true;
         v.hasVideo = hasVideo;
         v.duration = std::max(duration, v.duration);
         v.seekable = seekable;
+        return !hasVideo && !hasSound;
     });
+    if (empty) return failWith(ORV_ERROR_MALFORMED);
     becomePreparedIfReady();
 }
 
@@ -218,29 +262,23 @@ void EventLoop::onBuffering(bool buffering) {
 
 void EventLoop::onBuffered(double seconds) {
     const int percent = mState.update([&](PlayerState::Values& v) {
-        const int now =
-            v.duration > 0 ? std::clamp(static_cast<int>(100 * seconds / v.duration), 0, 100) : 0;
+        const double share = v.duration > 0 ? seconds / v.duration : 0;
+        const int now = static_cast<int>(100 * std::clamp(share, 0.0, 1.0));
         return std::exchange(v.bufferPercent, now) == now ? -1 : now;
     });
     if (percent >= 0) mNotifier.post(android::MEDIA_BUFFERING_UPDATE, percent);
 }
 
-// The core keeps the media open at its end, still playing if it could: it is
-// paused, so that a later seek does not start it again.
 void EventLoop::onEndReached() {
     // The word may be older than a seek away from the end.
     if (!mMpv.getFlag("eof-reached").value_or(false)) return;
-    const bool broken = brokeOff();
-    if (!broken && mEndHandler && mEndHandler()) return;
-    mMpv.set("pause", true);
-    if (broken) return failWith(ORV_ERROR_IO);
-    const bool completed = mState.update([](PlayerState::Values& v) {
-        if (v.phase != Phase::Started) return false;
-        v.phase = Phase::Completed;
-        if (v.duration <= 0) v.duration = v.position;
-        return true;
-    });
-    if (completed) mNotifier.post(android::MEDIA_PLAYBACK_COMPLETE);
+    if (brokeOff()) {
+        mMpv.set("pause", true);
+        return failWith(ORV_ERROR_IO);
+    }
+    // A seek may pass the end on its way; it has the end looked for when done.
+    if (mState.read([](const PlayerState::Values& v) { return v.seeking; })) return;
+    if (mEndHandler()) mNotifier.post(android::MEDIA_PLAYBACK_COMPLETE);
 }
 
 void EventLoop::onVideoSize() {

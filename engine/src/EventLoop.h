@@ -8,6 +8,7 @@
 #include <functional>
 #include <memory>
 #include <mutex>
+#include <optional>
 #include <thread>
 
 #include "MediaSource.h"
@@ -32,19 +33,26 @@ public:
 
     // Whose read errors count for the media being played.
     void setSource(std::shared_ptr<MediaSource> source);
-    // Called at the end of the media, on the loop's thread; true when it went
-    // on instead (as rewinding does at the start).
+    // Called when the core has come to an end, on the loop's thread; true when
+    // playback is completed by it.
     void setEndHandler(std::function<bool()> handler) { mEndHandler = std::move(handler); }
     // Called when media are opened and their tracks are about to be chosen, on the
     // loop's thread; the load goes on when it returns.
     void setOpenedHandler(std::function<void()> handler) { mOpenedHandler = std::move(handler); }
     // A new picture was drawn, or had no surface to go to.
     void onFrame();
+    // The media time of a frame that was just drawn, microseconds. While nothing
+    // plays, only the core knows it: then it is asked on the loop's thread, and the
+    // video output told. Does not wait.
+    std::optional<int64_t> frameTime(uint64_t frame);
+    // Looks whether the core is at an end, as an operation may find it there,
+    // or have kept it from being noticed. Any thread; does not wait.
+    void lookForEnd();
 
 private:
     void run();
     void handle(const mpv_event& event);
-    void onOpened(const mpv_event_hook& hook);
+    void onHook(const mpv_event_hook& hook);
     void onLoaded();
     void onEndFile(const mpv_event_end_file& end);
     void onRestart();
@@ -55,6 +63,7 @@ private:
     void onEndReached();
     void onVideoSize();
     void becomePreparedIfReady();
+    void tellFrameTime();
     void failWith(android::status_t status);
     std::shared_ptr<MediaSource> source();
     double durationOf(double core);
@@ -70,6 +79,8 @@ private:
     int64_t mFileSize = 0;  // bytes, 0 when unknown
     std::mutex mSourceMutex;
     std::shared_ptr<MediaSource> mSource;
+    std::atomic<bool> mLooksForEnd{false};
+    std::atomic<uint64_t> mUntimedFrame{0};  // 0 for none
     std::atomic<bool> mQuit{false};
     std::thread mThread;
 };

@@ -37,7 +37,18 @@ public:
     // Blocks until everybody who was inside has left.
     void awaitEmpty() {
         std::unique_lock<std::mutex> lock(mMutex);
-        mLeft.wait(lock, [this] { return mInside == 0; });
+        mChanged.wait(lock, [this] { return mInside == 0; });
+    }
+
+    // What the gate was closed for has been done, or is awaited.
+    void setDone() {
+        std::lock_guard<std::mutex> lock(mMutex);
+        mDone = true;
+        mChanged.notify_all();
+    }
+    void awaitDone() {
+        std::unique_lock<std::mutex> lock(mMutex);
+        mChanged.wait(lock, [this] { return mDone; });
     }
 
 private:
@@ -50,13 +61,14 @@ private:
 
     void leave() {
         std::lock_guard<std::mutex> lock(mMutex);
-        if (--mInside == 0) mLeft.notify_all();
+        if (--mInside == 0) mChanged.notify_all();
     }
 
     std::mutex mMutex;
-    std::condition_variable mLeft;
+    std::condition_variable mChanged;
     int mInside = 0;
     bool mClosed = false;
+    bool mDone = false;
 };
 
 }  // namespace orvtarn

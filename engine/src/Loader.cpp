@@ -231,8 +231,7 @@ android::status_t Loader::giveUp(uint64_t session) {
     mState.update([&](PlayerState::Values& v) {
         if (v.session == session) v.fail(android::TIMED_OUT);
     });
-    std::lock_guard<std::mutex> load(mLoadMutex);
-    unload();
+    unloadIn(session);
     return failed(android::TIMED_OUT, "prepare", "the media took too long");
 }
 
@@ -246,9 +245,7 @@ android::status_t Loader::stop() {
         return ++v.session;
     });
     if (session == 0) return PlayerState::wrongPhase("stop", before);
-    std::lock_guard<std::mutex> load(mLoadMutex);
-    // Another thread may have prepared the media again meanwhile.
-    if (mState.read([](const PlayerState::Values& v) { return v.session; }) == session) unload();
+    unloadIn(session);
     return android::NO_ERROR;
 }
 
@@ -280,7 +277,19 @@ void Loader::overtake(Phase phase) {
     });
 }
 
+// Closes the media of that session. Another thread may have closed them, or
+// opened others, meanwhile.
+void Loader::unloadIn(uint64_t session) {
+    std::lock_guard<std::mutex> load(mLoadMutex);
+    if (mState.read([](const PlayerState::Values& v) { return v.session; }) == session) unload();
+}
+
 void Loader::unload() {
+    closeFile();
+    if (mOnUnload) mOnUnload();
+}
+
+void Loader::closeFile() {
     const std::shared_ptr<MediaSource> media = source();
     // A stop before the core has taken the load up would go unanswered.
     const auto settled = [](const PlayerState::Values& v) { return !v.fileOpen; };

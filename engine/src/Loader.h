@@ -44,6 +44,8 @@ public:
 
     // Called before each load, to bring the core's settings to the start.
     void setBeforeLoad(std::function<void()> action) { mBeforeLoad = std::move(action); }
+    // Called when media that were open, or were to be, are closed.
+    void setOnUnload(std::function<void()> action) { mOnUnload = std::move(action); }
     // Called when the source is given up.
     void setOnForget(std::function<void()> action) { mOnForget = std::move(action); }
     // The media are raw samples, until the source is given up. BAD_VALUE for a
@@ -71,6 +73,8 @@ private:
     android::status_t giveUp(uint64_t session);
     void overtake(Phase phase);
     void unload();
+    void unloadIn(uint64_t session);
+    void closeFile();
     void forgetSource();
 
     MpvHandle& mMpv;
@@ -79,6 +83,7 @@ private:
     EventLoop& mEvents;
     StreamProtocol& mProtocol;
     std::function<void()> mBeforeLoad;
+    std::function<void()> mOnUnload;
     std::function<void()> mOnForget;
 
     // Held while media is opened or closed, not while its opening is awaited.

@@ -1,7 +1,6 @@
 // SPDX-License-Identifier: Apache-2.0
 #include "MediaMetaData.h"
 
-#include <math.h>
 #include <media/Metadata.h>
 #include <stdlib.h>
 #include <utils/String8.h>
@@ -11,6 +10,7 @@
 
 #include "ContainerInfo.h"
 #include "EngineLog.h"
+#include "Milliseconds.h"
 #include "RecordText.h"
 
 namespace orvtarn {
@@ -87,7 +87,7 @@ MetaDataInfo MediaMetaData::fromCore() const {
     };
     for (const TextKey& key : kTexts) setWideText(info.*key.text, tag(key.tag));
     setWideText(info.mContainer, mMpv.getString("file-format").value_or(""));
-    info.mDuration = static_cast<int32_t>(lround(mMpv.getDouble("duration").value_or(0) * 1000));
+    info.mDuration = toMilliseconds(mMpv.getDouble("duration").value_or(0));
     info.mChapterCount = static_cast<int32_t>(mMpv.getInt("chapters").value_or(0));
     info.mYear = std::max(atoi(tag("date").c_str()), 0);
     info.mTrackNumber = std::max(atoi(tag("track").c_str()), 0);
@@ -105,7 +105,7 @@ android::status_t MediaMetaData::write(const android::SortedVector<int>& keys,
     for (const TextKey& key : kTexts) writer.text(key.key, utf8Of(info.*key.text));
     if (info.mYear > 0) writer.text(Metadata::kDate, std::to_string(info.mYear));
     const NumberKey numbers[] = {
-        {Metadata::kDuration, static_cast<int32_t>(lround(now.duration * 1000))},
+        {Metadata::kDuration, toMilliseconds(now.duration)},
         {Metadata::kCdTrackNumber, info.mTrackNumber},
         {Metadata::kBitRate, info.mBitRate},
         {Metadata::kVideoHeight, now.height},

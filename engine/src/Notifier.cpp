@@ -1,6 +1,7 @@
 // SPDX-License-Identifier: Apache-2.0
 #include "Notifier.h"
 
+#include <atomic>
 #include <condition_variable>
 #include <deque>
 #include <mutex>
@@ -22,6 +23,7 @@ struct Notifier::Queue {
     std::deque<Event> events;
     bool stopped = false;
     Deliver deliver;
+    std::atomic<std::thread::id> thread{std::thread::id()};
 };
 
 Notifier::Notifier(Deliver deliver) : mQueue(std::make_shared<Queue>()) {
@@ -44,15 +46,18 @@ void Notifier::stop() {
         mQueue->changed.notify_one();
     }
     if (!mThread.joinable()) return;
-    if (mThread.get_id() == std::this_thread::get_id()) {
+    if (isDelivering()) {
         mThread.detach();
     } else {
         mThread.join();
     }
 }
 
+bool Notifier::isDelivering() const { return mQueue->thread == std::this_thread::get_id(); }
+
 void Notifier::run(std::shared_ptr<Queue> queue) {
     nameThisThread("orv-notify");
+    queue->thread = std::this_thread::get_id();
     std::unique_lock<std::mutex> lock(queue->mutex);
     while (true) {
         queue->changed.wait(lock, [&] { return queue->stopped || !queue->events.empty(); });

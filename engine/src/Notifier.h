@@ -21,6 +21,8 @@ public:
     // Forgets what was not told yet. Waits for a delivery under way, unless it
     // is called from that delivery.
     void stop();
+    // Whether this is the thread that tells the listener.
+    bool isDelivering() const;
 
 private:
     // Outlives the notifier while a delivery that stopped it returns.

@@ -54,6 +54,8 @@ public:
         int height = 0;
         int bufferPercent = 0;
 
+        bool looping = false;  // outlasts the media
+
         bool isOneOf(std::initializer_list<Phase> phases) const;
         // Prepared and not stopped: there is media to operate on.
         bool isOpen() const;
@@ -79,8 +81,13 @@ public:
     // Blocks until the condition holds. False when the time was over first.
     template <class Condition>
     bool wait(std::chrono::milliseconds limit, Condition condition) {
+        return waitUntil(std::chrono::steady_clock::now() + limit, condition);
+    }
+
+    template <class Condition>
+    bool waitUntil(std::chrono::steady_clock::time_point deadline, Condition condition) {
         std::unique_lock<std::mutex> lock(mMutex);
-        return mChanged.wait_for(lock, limit, [&] { return condition(mValues); });
+        return mChanged.wait_until(lock, deadline, [&] { return condition(mValues); });
     }
 
     Phase phase() const {

@@ -37,24 +37,22 @@ status_t Seeker::seekTo(int msec, int mode) {
     const double duration = mState.read([](const PlayerState::Values& v) { return v.duration; });
     double target = std::max(msec, 0) / 1000.0;
     if (duration > 0) target = std::min(target, duration);
-    return told(inTurn("seekTo", [&](uint64_t session) { return seekAs(mode, target, session); }));
+    return told(inTurn("seekTo", [&](const Turn& turn) { return seekAs(mode, target, turn); }));
 }
 
 status_t Seeker::seekToTime(const char* operation, double target) {
-    return told(
-        inTurn(operation, [&](uint64_t session) { return moveTo(target, kExact, session); }));
+    return told(inTurn(operation, [&](const Turn& turn) { return moveTo(target, kExact, turn); }));
 }
 
 status_t Seeker::refresh() {
     const bool wanted = mState.read(
         [](const PlayerState::Values& v) { return v.seekable && v.phase != Phase::Completed; });
     if (!wanted) return android::NO_ERROR;
-    return inTurn("refresh",
-                  [this](uint64_t session) { return moveTo(position(), kExact, session); });
+    return inTurn("refresh", [this](const Turn& turn) { return moveTo(position(), kExact, turn); });
 }
 
 status_t Seeker::runAndAwait(const char* operation, const std::function<int()>& command) {
-    return inTurn(operation, [&](uint64_t session) { return await(operation, session, command); });
+    return inTurn(operation, [&](const Turn& turn) { return await(operation, turn, command); });
 }
 
 status_t Seeker::told(status_t status) {
@@ -62,90 +60,91 @@ status_t Seeker::told(status_t status) {
     return status;
 }
 
-status_t Seeker::inTurn(const char* operation, const std::function<status_t(uint64_t)>& task) {
-    uint64_t session = 0;
-    status_t status = begin(operation, session);
+status_t Seeker::inTurn(const char* operation, const Task& task) {
+    const status_t open = mState.requireOpen(operation);
+    if (open != android::NO_ERROR) return open;
+    const Turn turn = {mState.read([](const PlayerState::Values& v) { return v.session; }),
+                       std::chrono::steady_clock::now() + kSeekLimit};
+    status_t status = begin(operation, turn);
     if (status != android::NO_ERROR) return status;
-    status = task(session);
+    status = task(turn);
     mState.update([](PlayerState::Values& v) { v.seeking = false; });
+    mEvents.lookForEnd();
     return status;
 }
 
 // Waits for its turn. NO_ERROR makes the caller the one that seeks.
-status_t Seeker::begin(const char* operation, uint64_t& session) {
-    const status_t open = mState.requireOpen(operation);
-    if (open != android::NO_ERROR) return open;
+status_t Seeker::begin(const char* operation, const Turn& turn) {
     bool seekable = true;
     bool begun = false;
     // The turn is taken inside the wait: of two that wake up, one waits on.
-    mState.wait(kSeekLimit, [&](PlayerState::Values& v) {
+    const bool inTime = mState.waitUntil(turn.deadline, [&](PlayerState::Values& v) {
+        if (v.session != turn.session || !v.isOpen()) return true;
         seekable = v.seekable;
-        session = v.session;
-        if (!v.isOpen() || !seekable) return true;
+        if (!seekable) return true;
         begun = !v.seeking;
         v.seeking = true;
+        // What is sought from the end is no longer complete.
+        if (begun && v.phase == Phase::Completed) v.phase = Phase::Paused;
         return begun;
     });
     if (begun) return android::NO_ERROR;
+    if (!inTime) return failed(android::TIMED_OUT, operation, "another seek does not end");
     if (!seekable) mNotifier.post(android::MEDIA_INFO, android::MEDIA_INFO_NOT_SEEKABLE);
     return failed(android::INVALID_OPERATION, operation,
                   seekable ? "ended by another operation" : "the media cannot seek");
 }
 
-status_t Seeker::seekAs(int mode, double target, uint64_t session) {
+status_t Seeker::seekAs(int mode, double target, const Turn& turn) {
     switch (mode) {
         case SeekMode::SEEK_NEXT_SYNC:
-            return seekToNextSync(target, session);
+            return seekToNextSync(target, turn);
         case SeekMode::SEEK_CLOSEST_SYNC:
-            return seekToClosestSync(target, session);
+            return seekToClosestSync(target, turn);
         case SeekMode::SEEK_CLOSEST:
-            return moveTo(target, kExact, session);
+            return moveTo(target, kExact, turn);
         default:
-            return moveTo(target, kKeyFrame, session);
+            return moveTo(target, kKeyFrame, turn);
     }
 }
 
 // The core has a seek to the key frame before a time, and one to the key frame
 // after a distance from here.
-status_t Seeker::seekToNextSync(double target, uint64_t session) {
-    const status_t status = moveTo(target, kKeyFrame, session);
+status_t Seeker::seekToNextSync(double target, const Turn& turn) {
+    const status_t status = moveTo(target, kKeyFrame, turn);
     const double distance = target - position();
     if (status != android::NO_ERROR || distance < kSameFrame) return status;
-    return moveTo(distance, kForward, session);
+    return moveTo(distance, kForward, turn);
 }
 
-status_t Seeker::seekToClosestSync(double target, uint64_t session) {
-    status_t status = moveTo(target, kKeyFrame, session);
+status_t Seeker::seekToClosestSync(double target, const Turn& turn) {
+    status_t status = moveTo(target, kKeyFrame, turn);
     const double previous = position();
     if (status != android::NO_ERROR || target - previous < kSameFrame) return status;
-    status = moveTo(target - previous, kForward, session);
+    status = moveTo(target - previous, kForward, turn);
     const double next = position();
     if (status != android::NO_ERROR || next - target <= target - previous) return status;
-    return moveTo(previous, kKeyFrame, session);
+    return moveTo(previous, kKeyFrame, turn);
 }
 
 // A seek that comes right behind one of the core's own, as when a track was
 // chosen, may lose its key frame and arrive at the next one: it is repeated.
-status_t Seeker::moveTo(double target, const char* flags, uint64_t session) {
+status_t Seeker::moveTo(double target, const char* flags, const Turn& turn) {
     const auto seek = [&] { return mMpv.seek(target, flags); };
-    const status_t status = await("seekTo", session, seek);
+    const status_t status = await("seekTo", turn, seek);
     const bool late = flags != kForward && position() > target + kLate;
-    return status == android::NO_ERROR && late ? await("seekTo", session, seek) : status;
+    return status == android::NO_ERROR && late ? await("seekTo", turn, seek) : status;
 }
 
-status_t Seeker::await(const char* operation, uint64_t session,
+status_t Seeker::await(const char* operation, const Turn& turn,
                        const std::function<int()>& command) {
-    const auto before = mState.update([](PlayerState::Values& v) {
-        // What is sought from the end is no longer complete.
-        if (v.phase == Phase::Completed) v.phase = Phase::Paused;
-        return v;
-    });
+    const auto before = mState.read([](const PlayerState::Values& v) { return v; });
     const int error = command();
     if (error < 0) return failed(android::INVALID_OPERATION, operation, mpv_error_string(error));
-    const auto overtaken = [session](const PlayerState::Values& v) {
-        return v.session != session || !v.isOpen();
+    const auto overtaken = [&turn](const PlayerState::Values& v) {
+        return v.session != turn.session || !v.isOpen();
     };
-    const bool inTime = mState.wait(kSeekLimit, [&](const PlayerState::Values& v) {
+    const bool inTime = mState.waitUntil(turn.deadline, [&](const PlayerState::Values& v) {
         return overtaken(v) || (v.seeks > before.seeks && v.restarts > before.restarts);
     });
     if (!inTime) return failed(android::TIMED_OUT, operation, "the position is not reached");

@@ -4,20 +4,23 @@
 #include <stdint.h>
 #include <utils/Errors.h>
 
+#include <chrono>
 #include <functional>
 
+#include "EventLoop.h"
 #include "MpvHandle.h"
 #include "Notifier.h"
 #include "PlayerState.h"
 
 namespace orvtarn {
 
-// Moves the position and waits until the core has arrived there. One seek at a
-// time: the core answers several at once with one event.
+// Moves the position and waits until the core has arrived there, ten seconds at
+// most with all that it takes. One seek at a time: the core answers several at
+// once with one event.
 class Seeker {
 public:
-    Seeker(MpvHandle& mpv, PlayerState& state, Notifier& notifier)
-        : mMpv(mpv), mState(state), mNotifier(notifier) {}
+    Seeker(MpvHandle& mpv, PlayerState& state, Notifier& notifier, EventLoop& events)
+        : mMpv(mpv), mState(state), mNotifier(notifier), mEvents(events) {}
 
     // mode: a MediaTrack::ReadOptions::SeekMode. Times outside of the media are
     // taken as its start or end.
@@ -31,22 +34,30 @@ public:
     android::status_t runAndAwait(const char* operation, const std::function<int()>& command);
 
 private:
-    // Runs a task as the only one that seeks; it gets the session it began in.
-    android::status_t inTurn(const char* operation,
-                             const std::function<android::status_t(uint64_t)>& task);
-    android::status_t begin(const char* operation, uint64_t& session);
+    // What one operation has: the session that it began in, and its time.
+    struct Turn {
+        uint64_t session;
+        std::chrono::steady_clock::time_point deadline;
+    };
+    using Task = std::function<android::status_t(const Turn&)>;
+
+    // Runs a task as the only one that seeks.
+    android::status_t inTurn(const char* operation, const Task& task);
+    android::status_t begin(const char* operation, const Turn& turn);
     android::status_t told(android::status_t status);
-    android::status_t seekAs(int mode, double seconds, uint64_t session);
-    android::status_t seekToNextSync(double seconds, uint64_t session);
-    android::status_t seekToClosestSync(double seconds, uint64_t session);
-    android::status_t moveTo(double seconds, const char* flags, uint64_t session);
-    android::status_t await(const char* operation, uint64_t session,
+    void leaveEnd();
+    android::status_t seekAs(int mode, double seconds, const Turn& turn);
+    android::status_t seekToNextSync(double seconds, const Turn& turn);
+    android::status_t seekToClosestSync(double seconds, const Turn& turn);
+    android::status_t moveTo(double seconds, const char* flags, const Turn& turn);
+    android::status_t await(const char* operation, const Turn& turn,
                             const std::function<int()>& command);
     double position() const;
 
     MpvHandle& mMpv;
     PlayerState& mState;
     Notifier& mNotifier;
+    EventLoop& mEvents;
 };
 
 }  // namespace orvtarn

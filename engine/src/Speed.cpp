@@ -28,12 +28,12 @@ bool isSpeed(int speed) {
 
 status_t Speed::set(int speed) {
     if (!isSpeed(speed)) return failed(android::BAD_VALUE, "setSpeed", "no such speed");
+    std::lock_guard<std::mutex> lock(mSetMutex);
     const status_t open = mState.requireOpen("setSpeed");
     if (open != android::NO_ERROR) return open;
     if (!canPlay(speed)) {
         return failed(android::INVALID_OPERATION, "setSpeed", "the media cannot seek");
     }
-    std::lock_guard<std::mutex> lock(mSetMutex);
     stopJumping();
     return apply(speed);
 }
@@ -120,16 +120,18 @@ void Speed::jump(int speed) {
     }
 }
 
-// False at the start of the media, and when they are closed.
+// False when it is over: at the start of the media, and when a jump fails, as
+// when the media are closed or give no data.
 bool Speed::jumpTo(double seconds) {
-    if (seconds <= 0) {
-        becomeNormal();
-        mSeeker.runAndAwait("setSpeed", [this] { return mMpv.seek(0, "absolute"); });
-        return false;
+    if (seconds > 0) {
+        const auto jump = [&] { return mMpv.seek(seconds, "absolute+keyframes"); };
+        if (mSeeker.runAndAwait("setSpeed", jump) == android::NO_ERROR) return true;
     }
-    const status_t status =
-        mSeeker.runAndAwait("setSpeed", [&] { return mMpv.seek(seconds, "absolute+keyframes"); });
-    return status == android::NO_ERROR;
+    becomeNormal();
+    if (seconds <= 0) {
+        mSeeker.runAndAwait("setSpeed", [this] { return mMpv.seek(0, "absolute"); });
+    }
+    return false;
 }
 
 }  // namespace orvtarn

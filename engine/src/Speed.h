@@ -35,7 +35,7 @@ public:
     // The core came to an end, on the event loop's thread; true when it was
     // the start, from which it goes on.
     bool onEndReached();
-    // Back to normal, for the load that is about to begin.
+    // Back to normal, for media that are about to be loaded or were closed.
     void reset();
     // Before the other units go.
     void shutDown() { stopJumping(); }

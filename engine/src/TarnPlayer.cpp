@@ -119,10 +119,13 @@ status_t TarnPlayer::getDuration(int* msec) {
 }
 
 status_t TarnPlayer::reset() {
-    return mEngine->call(__func__, status_t{INVALID_OPERATION}, [&] {
+    const status_t status = mEngine->call(__func__, status_t{INVALID_OPERATION}, [&] {
         mEngine->loader.reset();
         return status_t{NO_ERROR};
     });
+    // Callers give the source up when this returns.
+    if (status != NO_ERROR) mEngine->awaitReleased();
+    return status;
 }
 
 status_t TarnPlayer::setLooping(int loop) {

@@ -1,29 +1,25 @@
 // SPDX-License-Identifier: Apache-2.0
 #include "Transport.h"
 
-#include <math.h>
-
 #include <algorithm>
 
 #include "EngineLog.h"
+#include "Milliseconds.h"
 
 namespace orvtarn {
-namespace {
-
 using android::status_t;
-
-int milliseconds(double seconds) { return static_cast<int>(lround(seconds * 1000)); }
-
-}  // namespace
 
 status_t Transport::start() {
     std::lock_guard<std::mutex> lock(mMutex);
-    const Phase before = mState.update([this](PlayerState::Values& v) {
+    bool over = false;
+    const Phase before = mState.update([&](PlayerState::Values& v) {
         const Phase phase = v.phase;
-        if (v.isOpen()) v.phase = Phase::Started;
-        if (phase == Phase::Completed && !mBackward) v.position = 0;
+        over = phase == Phase::Completed && !v.seekable;
+        if (v.isOpen() && !over) v.phase = Phase::Started;
+        if (phase == Phase::Completed && !over && !mBackward) v.position = 0;
         return phase;
     });
+    if (over) return failed(android::INVALID_OPERATION, "start", "the media cannot seek");
     switch (before) {
         case Phase::Started:
             return android::NO_ERROR;
@@ -37,7 +33,23 @@ status_t Transport::start() {
             return PlayerState::wrongPhase("start", before);
     }
     mMpv.set("pause", mCoreHeld);
+    // The core may have been at its end while it was paused.
+    if (before != Phase::Completed) mEvents.lookForEnd();
     return android::NO_ERROR;
+}
+
+// The core keeps the media open at its end, still playing if it could: it is
+// paused, so that a later seek does not start it again.
+bool Transport::complete() {
+    std::lock_guard<std::mutex> lock(mMutex);
+    const bool completed = mState.update([](PlayerState::Values& v) {
+        if (v.phase != Phase::Started || v.seeking || (v.looping && v.seekable)) return false;
+        v.phase = Phase::Completed;
+        if (v.duration <= 0) v.duration = v.position;
+        return true;
+    });
+    if (completed) mMpv.set("pause", true);
+    return completed;
 }
 
 status_t Transport::pause() {
@@ -81,7 +93,7 @@ status_t Transport::getCurrentPosition(int* msec) const {
     // Programs ask for this again and again: no log line.
     if (!now.isOpen()) return android::INVALID_OPERATION;
     const double position = now.duration > 0 ? std::min(now.position, now.duration) : now.position;
-    *msec = milliseconds(now.phase == Phase::Completed ? now.duration : position);
+    *msec = toMilliseconds(now.phase == Phase::Completed ? now.duration : position);
     return android::NO_ERROR;
 }
 
@@ -92,7 +104,7 @@ status_t Transport::getDuration(int* msec) const {
     if (!now.isOpen() && now.phase != Phase::Stopped) {
         return PlayerState::wrongPhase("getDuration", now.phase);
     }
-    *msec = milliseconds(now.duration);
+    *msec = toMilliseconds(now.duration);
     return android::NO_ERROR;
 }
 
@@ -116,18 +128,9 @@ status_t Transport::getSize(const char* operation, int PlayerState::Values::*mem
 status_t Transport::setLooping(bool looping) {
     const Phase phase = mState.phase();
     if (phase == Phase::Error) return PlayerState::wrongPhase("setLooping", phase);
+    mState.update([looping](PlayerState::Values& v) { v.looping = looping; });
     mMpv.set("loop-file", looping ? "inf" : "no");
     return android::NO_ERROR;
-}
-
-// While playing, the core's own time may be that of the frame to come; paused,
-// the state may still be that of the frame before.
-int64_t Transport::frameTime() const {
-    const PlayerState::Values now = mState.read([](const PlayerState::Values& v) { return v; });
-    const double seconds = now.phase == Phase::Started
-                               ? now.position
-                               : mMpv.getDouble("time-pos").value_or(now.position);
-    return llround(std::max(seconds, 0.0) * 1e6);
 }
 
 int Transport::bufferPercent() const {

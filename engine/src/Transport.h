@@ -6,6 +6,7 @@
 #include <functional>
 #include <mutex>
 
+#include "EventLoop.h"
 #include "MpvHandle.h"
 #include "PlayerState.h"
 
@@ -14,9 +15,10 @@ namespace orvtarn {
 // Playing and pausing of prepared media, and what can be asked about it.
 class Transport {
 public:
-    Transport(MpvHandle& mpv, PlayerState& state) : mMpv(mpv), mState(state) {}
+    Transport(MpvHandle& mpv, PlayerState& state, EventLoop& events)
+        : mMpv(mpv), mState(state), mEvents(events) {}
 
-    // After the end of the media plays it again.
+    // After the end of the media plays it again, if it can seek.
     android::status_t start();
     android::status_t pause();
     bool isPlaying() const;
@@ -26,9 +28,10 @@ public:
     android::status_t getVideoHeight(int* height) const;
     android::status_t setLooping(bool looping);
     int bufferPercent() const;
-    // Of the frame on screen, microseconds.
-    int64_t frameTime() const;
 
+    // The core is at its end. True when playback is completed by it; what loops
+    // goes on.
+    bool complete();
     // Pauses as an effect of another operation.
     void becomePaused();
     // While another unit moves the position itself, the core is kept paused.
@@ -41,6 +44,7 @@ private:
 
     MpvHandle& mMpv;
     PlayerState& mState;
+    EventLoop& mEvents;
     // The phase and the core's own pause change together.
     std::mutex mMutex;
     bool mCoreHeld = false;

@@ -2,6 +2,7 @@
 #include "VideoOutput.h"
 
 #include <chrono>
+#include <utility>
 
 #include "EngineLog.h"
 #include "ThreadName.h"
@@ -39,6 +40,7 @@ void VideoOutput::destroy() {
         mWakeUp.notify_one();
     }
     mThread.join();
+    dropHeld();
     mpv_render_context_free(mContext);
     mContext = nullptr;
     mProducer.clear();
@@ -48,6 +50,7 @@ void VideoOutput::setProducer(const android::sp<android::IGraphicBufferProducer>
     {
         std::lock_guard<std::mutex> lock(mSurfaceMutex);
         if (mProducer == producer) return;
+        dropHeld();
         mProducer = producer;
     }
     wake(true);
@@ -59,6 +62,15 @@ void VideoOutput::setVisible(bool visible) {
         mVisible = visible;
     }
     wake(true);
+}
+
+void VideoOutput::setFrameTime(uint64_t frame, int64_t microseconds) {
+    {
+        std::lock_guard<std::mutex> lock(mWakeMutex);
+        mToldFrame = frame;
+        mToldTimeUs = microseconds;
+    }
+    wake(false);
 }
 
 void VideoOutput::onUpdate(void* self) { static_cast<VideoOutput*>(self)->wake(false); }
@@ -81,7 +93,10 @@ void VideoOutput::run() {
         bool redraw = mRedraw || retry;
         const bool woken = mWoken;
         mWoken = mRedraw = false;
+        const uint64_t toldFrame = mToldFrame;
+        const int64_t toldTimeUs = mToldTimeUs;
         lock.unlock();
+        deliverHeld(toldFrame, toldTimeUs);
         const bool newFrame = woken && takeFrame();
         if (!newFrame && !redraw) redraw = sizeChanged();
         retry = (newFrame || (redraw && mHasPicture)) && !render(newFrame);
@@ -106,10 +121,10 @@ bool VideoOutput::render(bool newFrame) {
         std::lock_guard<std::mutex> lock(mSurfaceMutex);
         const bool shown = mProducer != nullptr && mVisible;
         mTimeIsDue = mTimeIsDue || newFrame;
+        dropHeld();
         status = shown ? draw() : android::NO_INIT;
-        if (status == android::NO_ERROR) {
-            mDelivered++;
-        } else if (newFrame) {
+        if (mHeld) return true;
+        if (status != android::NO_ERROR && newFrame) {
             skip();
             if (status == android::WOULD_BLOCK) mMissed++;
         }
@@ -144,10 +159,41 @@ android::status_t VideoOutput::draw() {
         return status;
     }
     mDrawnSize = size;
-    // Asked for only now: until its frame is drawn, the core may wait for it.
-    if (mTimeIsDue) mTimeUs = mFrameTime();
-    mTimeIsDue = false;
-    return mProducer->queueBuffer(buffer.slot, mTimeUs);
+    if (mTimeIsDue) {
+        const std::optional<int64_t> time = mFrameTime(++mFrame);
+        if (!time) {
+            mHeld = buffer.slot;
+            return android::NO_ERROR;
+        }
+        mTimeUs = *time;
+        mTimeIsDue = false;
+    }
+    return queue(buffer.slot);
+}
+
+android::status_t VideoOutput::queue(int slot) {
+    const android::status_t status = mProducer->queueBuffer(slot, mTimeUs);
+    if (status == android::NO_ERROR) mDelivered++;
+    return status;
+}
+
+void VideoOutput::deliverHeld(uint64_t frame, int64_t microseconds) {
+    {
+        std::lock_guard<std::mutex> lock(mSurfaceMutex);
+        if (!mHeld || frame != mFrame) return;
+        // The media may be closed by now.
+        if (!mHasPicture) return dropHeld();
+        mTimeUs = microseconds;
+        mTimeIsDue = false;
+        queue(*std::exchange(mHeld, std::nullopt));
+    }
+    mOnFrame();
+}
+
+// The frame is drawn anew, or nobody wants it any more.
+void VideoOutput::dropHeld() {
+    if (mHeld) mProducer->cancelBuffer(*mHeld);
+    mHeld.reset();
 }
 
 android::status_t VideoOutput::drawInto(

@@ -10,6 +10,7 @@
 #include <condition_variable>
 #include <functional>
 #include <mutex>
+#include <optional>
 #include <thread>
 
 namespace orvtarn {
@@ -25,9 +26,11 @@ public:
     };
 
     // onFrame: after each picture that was drawn or had no surface to go to.
-    // frameTime: the media time of the frame that was just drawn, microseconds.
-    // Both are called on the rendering thread.
-    VideoOutput(std::function<void()> onFrame, std::function<int64_t()> frameTime)
+    // frameTime: the media time of the frame of that number, which was just drawn,
+    // microseconds. Nothing when setFrameTime will tell; the frame is held until
+    // then. Both are called on the rendering thread, which must not ask the core.
+    using FrameTime = std::function<std::optional<int64_t>(uint64_t frame)>;
+    VideoOutput(std::function<void()> onFrame, FrameTime frameTime)
         : mOnFrame(std::move(onFrame)), mFrameTime(std::move(frameTime)) {}
     ~VideoOutput() { destroy(); }
 
@@ -38,6 +41,8 @@ public:
     // Null for none. No frame goes to an earlier surface afterwards; the new
     // one gets the picture at once, paused or not.
     void setProducer(const android::sp<android::IGraphicBufferProducer>& producer);
+    // Any thread.
+    void setFrameTime(uint64_t frame, int64_t microseconds);
     // Whether frames go to the surface at all.
     void setVisible(bool visible);
     void setVideoSize(int width, int height) { mVideoSize = {width, height}; }
@@ -63,9 +68,12 @@ private:
     android::status_t draw();
     android::status_t drawInto(const android::IGraphicBufferProducer::PixelBuffer& buffer);
     void skip();
+    android::status_t queue(int slot);
+    void deliverHeld(uint64_t frame, int64_t microseconds);
+    void dropHeld();
 
     const std::function<void()> mOnFrame;
-    const std::function<int64_t()> mFrameTime;
+    const FrameTime mFrameTime;
     mpv_render_context* mContext = nullptr;
     std::thread mThread;
 
@@ -74,6 +82,8 @@ private:
     bool mWoken = false;
     bool mRedraw = false;
     bool mQuit = false;
+    uint64_t mToldFrame = 0;
+    int64_t mToldTimeUs = 0;
 
     // Held while a frame is drawn.
     std::mutex mSurfaceMutex;
@@ -82,6 +92,8 @@ private:
     Size mDrawnSize;
     bool mTimeIsDue = false;  // the core's frame has no time yet
     int64_t mTimeUs = 0;
+    uint64_t mFrame = 0;       // whose time was asked for last
+    std::optional<int> mHeld;  // the slot of a drawn frame without a time
 
     std::atomic<Size> mVideoSize{Size()};
     std::atomic<bool> mHasPicture{false};

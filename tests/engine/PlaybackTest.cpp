@@ -1,5 +1,7 @@
 // SPDX-License-Identifier: Apache-2.0
 // Opening and playing media from start to end.
+#include <orvtarn/PlayerTypes.h>
+
 #include <algorithm>
 #include <chrono>
 
@@ -91,6 +93,19 @@ TEST_F(PlaybackTest, AudioAlonePlaysWithoutASurface) {
     playToEnd();
     EXPECT_EQ(duration(), position());
     EXPECT_EQ(0u, sink->frameCount());
+}
+
+TEST_F(PlaybackTest, VideoThatShowsNothingLeavesTheSound) {
+    open("unseen.mkv");
+    EXPECT_NEAR(2000, duration(), 100);
+    playToEnd();
+    EXPECT_EQ(duration(), position());
+    EXPECT_EQ(0u, sink->frameCount());
+}
+
+TEST_F(PlaybackTest, NothingToSeeOrHearIsAnError) {
+    ASSERT_EQ(NO_ERROR, player->setDataSource(mediaPath("dead.mkv").c_str(), nullptr));
+    EXPECT_EQ(ORV_ERROR_MALFORMED, player->prepare());
 }
 
 TEST_F(PlaybackTest, LoopingStartsAgainWithoutAnEnd) {

@@ -2,9 +2,11 @@
 // Moving the position, by times and by bytes.
 #include <media/MediaTrack.h>
 
+#include <future>
 #include <sstream>
 #include <thread>
 
+#include "FakeStream.h"
 #include "PlayerTest.h"
 
 using namespace android;
@@ -99,6 +101,22 @@ TEST_F(SeekTest, ManyAtOnceAllArrive) {
     for (std::thread& thread : threads) thread.join();
     EXPECT_TRUE(events->waitFor(MEDIA_SEEK_COMPLETE, 20));
     EXPECT_EQ(7000, positionAfter(7300, 0));
+}
+
+// The second waits for the first, and has as long as that in all.
+TEST_F(SeekTest, WithoutDataTimesOut) {
+    FakeStream stream(mediaPath("long.mkv"));
+    ASSERT_EQ(NO_ERROR, player->setDataSource(&stream));
+    ASSERT_EQ(NO_ERROR, player->prepare());
+    stream.blockAt(0);
+    const auto seek = [&] { return player->seekTo(50000, Mode::SEEK_CLOSEST_SYNC); };
+    std::future<status_t> first = std::async(std::launch::async, seek);
+    ASSERT_TRUE(stream.waitUntilBlocked());
+    std::future<status_t> second = std::async(std::launch::async, seek);
+    EXPECT_EQ(std::future_status::ready, second.wait_for(std::chrono::seconds(14)));
+    EXPECT_EQ(TIMED_OUT, first.get());
+    EXPECT_EQ(TIMED_OUT, second.get());
+    player->release();
 }
 
 TEST_F(SeekTest, RefusesModesThatAreNone) {

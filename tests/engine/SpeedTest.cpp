@@ -1,7 +1,10 @@
 // SPDX-License-Identifier: Apache-2.0
 // Speeds, backward play, single frames and repeated sections.
 #include <chrono>
+#include <filesystem>
+#include <fstream>
 
+#include "FakeStream.h"
 #include "PlayerTest.h"
 
 using namespace android;
@@ -127,6 +130,48 @@ TEST_F(SpeedTest, NewMediaPlaysAtTheNormalSpeed) {
     EXPECT_TRUE(eventually([&] { return position() > 500; }));
 }
 
+// Whether one of the process's threads has that name.
+bool hasThread(const std::string& name) {
+    for (const auto& task : std::filesystem::directory_iterator("/proc/self/task")) {
+        std::string line;
+        std::getline(std::ifstream(task.path() / "comm"), line);
+        if (line == name) return true;
+    }
+    return false;
+}
+
+TEST_F(SpeedTest, EndsWithTheMedia) {
+    for (const bool stops : {true, false}) {
+        SCOPED_TRACE(stops ? "stop" : "reset");
+        player->reset();
+        open("long.mkv");
+        ASSERT_EQ(NO_ERROR, player->seekTo(50000, 0));
+        ASSERT_EQ(NO_ERROR, player->setSpeed(-16000));
+        ASSERT_EQ(NO_ERROR, player->start());
+        EXPECT_TRUE(eventually([] { return hasThread("orv-rewind"); }));
+        ASSERT_EQ(NO_ERROR, stops ? player->stop() : player->reset());
+        EXPECT_EQ(1000, speed());
+        EXPECT_FALSE(hasThread("orv-rewind"));
+    }
+}
+
+TEST_F(SpeedTest, ARewindThatGetsNoDataGivesUp) {
+    FakeStream stream(mediaPath("long.mkv"));
+    ASSERT_EQ(NO_ERROR, player->setDataSource(&stream));
+    ASSERT_EQ(NO_ERROR, player->prepare());
+    ASSERT_EQ(NO_ERROR, player->seekTo(50000, 0));
+    stream.blockAt(0);
+    ASSERT_EQ(NO_ERROR, player->setSpeed(-16000));
+    ASSERT_EQ(NO_ERROR, player->start());
+    ASSERT_TRUE(stream.waitUntilBlocked());
+    EXPECT_TRUE(eventually([&] { return speed() == 1000; }));
+    stream.letGo();
+    const int reached = position();
+    EXPECT_TRUE(eventually([&] { return position() > reached + 500; })) << "plays on";
+    EXPECT_TRUE(player->isPlaying());
+    player->release();
+}
+
 TEST_F(SpeedTest, StepsSingleFramesBothWays) {
     open("feature.mkv");
     ASSERT_EQ(NO_ERROR, player->seekTo(4000, 0));
@@ -136,6 +181,7 @@ TEST_F(SpeedTest, StepsSingleFramesBothWays) {
     EXPECT_NEAR(4200, position(), 1);
     ASSERT_TRUE(player->step(-2));
     EXPECT_NEAR(4133, position(), 1);
+    EXPECT_TRUE(sink->waitFor(0, [](const Picture& p) { return p.timestampUs / 1000 == 4133; }));
     EXPECT_TRUE(player->step(0));
     EXPECT_FALSE(player->isPlaying());
     EXPECT_TRUE(remains([&] { return position() < 4140; }));

@@ -55,8 +55,28 @@ TEST_F(StreamSourceTest, NeedsNeitherSeeksNorLength) {
     EXPECT_EQ(INVALID_OPERATION, player->setSpeed(-2000));
     EXPECT_EQ(INVALID_OPERATION, player->seekTo(1000, 0));
     playToEnd();
+    EXPECT_EQ(INVALID_OPERATION, player->start()) << "it cannot be played again";
+    EXPECT_EQ(duration(), position());
+    EXPECT_FALSE(player->isPlaying());
     EXPECT_EQ(0, stream->mSeeks);
     expectDeliveredWhole();
+    ASSERT_EQ(NO_ERROR, player->stop());
+    EXPECT_EQ(ORV_ERROR_IO, player->prepare()) << "nor opened";
+}
+
+TEST_F(StreamSourceTest, WhatCannotSeekDoesNotLoop) {
+    for (const char* name : {"short.ts", "tone.mp3"}) {
+        SCOPED_TRACE(name);
+        const int before = events->count(MEDIA_PLAYBACK_COMPLETE);
+        player->reset();
+        makeStream(name);
+        stream->mSeekable = false;
+        ASSERT_EQ(NO_ERROR, player->setLooping(1));
+        ASSERT_EQ(NO_ERROR, prepareStream());
+        ASSERT_EQ(NO_ERROR, player->start());
+        ASSERT_TRUE(events->waitFor(MEDIA_PLAYBACK_COMPLETE, before + 1));
+        EXPECT_EQ(INVALID_OPERATION, player->start());
+    }
 }
 
 TEST_F(StreamSourceTest, TakesSmallReads) {
@@ -202,6 +222,16 @@ TEST_F(BlockedReadTest, WhilePreparingResetEndsBoth) {
     ASSERT_TRUE(stream->waitUntilBlocked());
     expectPrompt([&] { EXPECT_EQ(NO_ERROR, player->reset()); });
     preparing.join();
+}
+
+TEST_F(BlockedReadTest, WhilePreparingIsWaitedForHalfAMinute) {
+    makeStream("feature.mkv");
+    stream->blockAt(0);
+    EXPECT_EQ(TIMED_OUT, prepareStream());
+    int msec = 0;
+    EXPECT_EQ(TIMED_OUT, player->getCurrentPosition(&msec));
+    ASSERT_EQ(NO_ERROR, player->reset());
+    open("short.mp4");
 }
 
 TEST_F(StreamSourceTest, BecomingInvalidIsAnError) {

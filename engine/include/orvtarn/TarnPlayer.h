@@ -18,9 +18,12 @@ class IOrvStreamSource;
 
 namespace android {
 
-// One playback engine. Any thread may call any operation at any time; none
-// calls the listener on the caller's thread. Statuses are 0 or a negative
-// error, bools are true for success.
+// One playback engine. Any thread may call any operation at any time, but for
+// two that the player itself waits for: a source must not reset or release the
+// player from inside its read or seek, and a surface must not set the player's
+// surface from inside its dequeueBuffer, queueBuffer or cancelBuffer. None calls
+// the listener on the caller's thread. Statuses are 0 or a negative error, bools
+// are true for success.
 //
 // A player is idle, initialized (setDataSource), preparing, prepared, started,
 // paused, stopped, completed, in error or released. An operation that its state
@@ -36,16 +39,19 @@ namespace android {
 // listener on a thread of the engine's own, on which it may call the player.
 class TarnPlayer : public MediaPlayerBase {
 public:
-    // -1 makes a player that is not bound to a hardware decoder.
+    // -1 makes a player that is not bound to a hardware decoder. Sets the
+    // process's LC_NUMERIC to "C". A player whose playback core cannot start, as
+    // without memory, is as a released one.
     explicit TarnPlayer(int decoder);
 
     // Before the data source: whether it is a stereoscopic stream file. On the
     // desktop such a file plays its flat picture either way.
     void configPlayer(bool ssif);
 
-    // A path or URL; headers may be null. Checks what can be checked without
-    // opening: NAME_NOT_FOUND, PERMISSION_DENIED, BAD_VALUE (a directory or an
-    // empty name). INVALID_OPERATION when a source is set already.
+    // A path or URL; headers may be null. Of a playlist the first entry is the
+    // media. Checks what can be checked without opening: NAME_NOT_FOUND,
+    // PERMISSION_DENIED, BAD_VALUE (a directory or an empty name).
+    // INVALID_OPERATION when a source is set already.
     status_t setDataSource(const char* url, const KeyedVector<String8, String8>* headers);
     // The source is not deleted by the player. It must live until the next
     // reset or release has returned: they end a read that blocks with
@@ -66,16 +72,20 @@ public:
     // Ready means that the first frame is on the surface.
     status_t prepare() override;
     status_t prepareAsync() override;
-    // After the end of the media plays them again.
+    // After the end of the media plays them again: INVALID_OPERATION when they
+    // cannot seek. At the end without having played, completes at once.
     status_t start() override;
-    // The media can be prepared again.
+    // The media can be prepared again, but for a source that cannot seek and has
+    // been read from. They then play at the normal speed, without a repeated
+    // section, and with the tracks that were chosen at first.
     status_t stop() override;
     status_t pause() override;
     // True from start to pause, stop, the end or an error, but for the times
     // in which playback waits for data: so a started player that does not play
     // and is not at its end is buffering.
     bool isPlaying() override;
-    // Blocks until the new position is shown, at most ten seconds. mode: a
+    // Blocks until the new position is shown; TIMED_OUT after ten seconds, which
+    // other threads' seeks before it count towards. mode: a
     // MediaTrack::ReadOptions::SeekMode; BAD_VALUE for others. Times outside of
     // the media are their start and end. INVALID_OPERATION for media that
     // cannot seek. After the end of the media leads to paused.
@@ -86,7 +96,9 @@ public:
     status_t getCurrentPosition(int* msec) override;
     // 0 when unknown. Until reset, when stopped.
     status_t getDuration(int* msec) override;
+    // Waits for a release under way, which leaves it INVALID_OPERATION.
     status_t reset() override;
+    // Media that cannot seek end all the same.
     status_t setLooping(int loop) override;
     // For the keys and methods of orvtarn/Parameters.h.
     status_t setParameter(int key, const Parcel& request) override;
@@ -97,7 +109,8 @@ public:
     status_t getMetadata(const SortedVector<int>& ids, Parcel* records) override;
     // Linear gains from 0 to 1; BAD_VALUE for what is no number.
     status_t setVolume(float left, float right) override;
-    // For good. May be called again, and by the listener.
+    // For good. May be called again, and by the listener. A second call returns
+    // when the first is done, but for the listener's, which that waits for.
     status_t release() override;
 
     // Pixels as the picture is meant to be seen; 0 without a picture.
