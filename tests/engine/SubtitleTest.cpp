@@ -202,6 +202,7 @@ TEST_F(SubtitleTest, TheFirstOfSeveralLanguagesIsTurnedOn) {
 TEST_F(SubtitleTest, ATimedTextSourceWaitsToBeSelected) {
     openAtLine("plain.mp4");
     ASSERT_TRUE(player->addTimedTextSource(mediaPath("lines.srt").c_str()));
+    EXPECT_EQ(-1, selected());
     EXPECT_TRUE(isPlain(sink->newest()));
     ASSERT_TRUE(player->selectTrack(1));
     EXPECT_TRUE(seesText());

@@ -110,8 +110,9 @@ std::unique_ptr<Thumbnailer> open(const std::string& name, int stream = -1) {
 TEST(Thumbnailer, DrawsWhatFfmpegExtractsInEveryMode) {
     const auto thumbnailer = open("video.mp4");
     for (const Mode& mode : kModes) {
-        // Rows with padding and without, in modes of two and of four bytes.
-        for (const Size size : {Size{150, 1}, Size{96, 255}}) {
+        // Rows with padding and without, in modes of two and of four bytes. To fewer
+        // rows libswscale goes in two steps, on machines of 64 bits alone.
+        for (const Size size : {Size{150, 9}, Size{96, 255}}) {
             EXPECT_GT(psnr(mode, draw(*thumbnailer, 3480, size, mode),
                            reference("video.mp4", "3.48", size, mode)),
                       kSamePicture)
