@@ -33,7 +33,6 @@ public final class AudioOutput {
      * @param type the platform's number, such as 3 for music
      */
     public void setStreamType(int type) {
-        player.states.requireAlive("setStreamType()");
         player.run("setStreamType()", () -> player.native_setAudioStreamType(type));
     }
 
@@ -57,8 +56,7 @@ public final class AudioOutput {
      * @return what was last set, 0 at first
      */
     public int getSessionId() {
-        player.states.requireAlive("getSessionId()");
-        return player.native_getAudioSessionId();
+        return player.ask("getSessionId()", player::native_getAudioSessionId);
     }
 
     /**
@@ -67,7 +65,6 @@ public final class AudioOutput {
      * @param id the effect's number; 0 for none
      */
     public void attachAuxEffect(int id) {
-        player.states.requireAlive("attachAuxEffect()");
         player.run("attachAuxEffect()", () -> player.native_attachAuxEffect(id));
     }
 

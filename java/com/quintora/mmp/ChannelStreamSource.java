@@ -16,9 +16,10 @@ public final class ChannelStreamSource implements MediaStreamSource {
      * A source that begins at the channel's start.
      *
      * @param channel an open channel that nothing else moves
+     * @throws IllegalArgumentException when it is null
      */
     public ChannelStreamSource(SeekableByteChannel channel) {
-        this.channel = channel;
+        this.channel = Arguments.require(channel, "the channel");
     }
 
     /**

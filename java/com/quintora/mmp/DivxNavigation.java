@@ -3,9 +3,8 @@ package com.quintora.mmp;
 
 import com.quintora.mmp.util.DivxLastMemoryFilePosition;
 import java.util.List;
-import java.util.Objects;
 import java.util.Optional;
-import java.util.function.BooleanSupplier;
+import java.util.function.Supplier;
 
 /**
  * Titles, chapters and playlists of DivX media, on engines that know them: elsewhere nothing is
@@ -63,8 +62,7 @@ public final class DivxNavigation {
      * @return 0 for none
      */
     public int titleCount() {
-        player.states.requireAlive("titleCount()");
-        return player.native_getDivxTitleNum();
+        return player.ask("titleCount()", player::native_getDivxTitleNum);
     }
 
     /**
@@ -143,8 +141,7 @@ public final class DivxNavigation {
      * @return its number, 0 for none
      */
     public int lastMemoryFileId() {
-        player.states.requireAlive("lastMemoryFileId()");
-        return player.native_getDivxLastMemoryFileID();
+        return player.ask("lastMemoryFileId()", player::native_getDivxLastMemoryFileID);
     }
 
     /**
@@ -156,8 +153,8 @@ public final class DivxNavigation {
      * @return false when the engine cannot
      */
     public boolean setTitle(int value1, int value2, int value3) {
-        player.states.requireAlive("setTitle()");
-        return player.native_setDivxTitleInfo(value1, value2, value3) > 0;
+        return player.ask("setTitle()",
+                () -> player.native_setDivxTitleInfo(value1, value2, value3) > 0);
     }
 
     /**
@@ -170,8 +167,8 @@ public final class DivxNavigation {
      * @return false when the engine cannot
      */
     public boolean setChapter(int value1, int value2, int value3, int value4) {
-        player.states.requireAlive("setChapter()");
-        return player.native_setDivxChapInfo(value1, value2, value3, value4) > 0;
+        return player.ask("setChapter()",
+                () -> player.native_setDivxChapInfo(value1, value2, value3, value4) > 0);
     }
 
     /**
@@ -184,8 +181,8 @@ public final class DivxNavigation {
      * @return false when the engine cannot
      */
     public boolean setPlaylist(int value1, int value2, int value3, int value4) {
-        player.states.requireAlive("setPlaylist()");
-        return player.native_setDivxPlayListInfo(value1, value2, value3, value4) > 0;
+        return player.ask("setPlaylist()",
+                () -> player.native_setDivxPlayListInfo(value1, value2, value3, value4) > 0);
     }
 
     /**
@@ -196,8 +193,8 @@ public final class DivxNavigation {
      * @return false when the engine cannot
      */
     public boolean pressButton(int value1, int value2) {
-        player.states.requireAlive("pressButton()");
-        return player.native_setDivxBtnInfo(value1, value2) > 0;
+        return player.ask("pressButton()",
+                () -> player.native_setDivxBtnInfo(value1, value2) > 0);
     }
 
     /**
@@ -208,8 +205,8 @@ public final class DivxNavigation {
      * @return false when the engine cannot
      */
     public boolean setFilePosition(int value1, int value2) {
-        player.states.requireAlive("setFilePosition()");
-        return player.native_setDivxFilePosition(value1, value2) > 0;
+        return player.ask("setFilePosition()",
+                () -> player.native_setDivxFilePosition(value1, value2) > 0);
     }
 
     /**
@@ -217,11 +214,11 @@ public final class DivxNavigation {
      *
      * @param position the position
      * @return false when the engine cannot
+     * @throws IllegalArgumentException when the position is null
      */
     public boolean setLastMemory(DivxLastMemoryFilePosition position) {
-        player.states.requireAlive("setLastMemory()");
-        return player.native_setDivxLastMemoryFilePosition(
-                Objects.requireNonNull(position, "position")) > 0;
+        return player.ask("setLastMemory()", () -> player.native_setDivxLastMemoryFilePosition(
+                Arguments.require(position, "the position")) > 0);
     }
 
     /** Takes what the native half calls back with during a call. */
@@ -252,10 +249,9 @@ public final class DivxNavigation {
         return record;
     }
 
-    private synchronized <T> Optional<T> ask(String call, Class<T> type, BooleanSupplier getter) {
-        player.states.requireAlive(call);
+    private synchronized <T> Optional<T> ask(String call, Class<T> type, Supplier<Boolean> getter) {
         received = null;
-        getter.getAsBoolean();
+        player.ask(call, getter);
         return Optional.ofNullable(type.cast(received));
     }
 }

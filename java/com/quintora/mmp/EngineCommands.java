@@ -2,7 +2,6 @@
 package com.quintora.mmp;
 
 import android.os.Parcel;
-import java.util.Objects;
 import java.util.Set;
 
 /**
@@ -21,10 +20,11 @@ public final class EngineCommands {
      * Says what the player is for on the screen.
      *
      * @param role the role
+     * @throws IllegalArgumentException when it is null
      */
     public void setRole(PlayerRole role) {
-        player.states.requireAlive("setRole()");
-        player.native_setPlayerRole(role.ordinal());
+        player.run("setRole()",
+                () -> player.native_setPlayerRole(Arguments.require(role, "the role").ordinal()));
     }
 
     /**
@@ -39,7 +39,7 @@ public final class EngineCommands {
         if (setting < 0 || setting > 0xFFFF) {
             throw new IllegalArgumentException("the setting is 0 to 65535: " + setting);
         }
-        return player.native_setTS(setting);
+        return player.ask("setTransportStream()", () -> player.native_setTS(setting));
     }
 
     /**
@@ -49,8 +49,7 @@ public final class EngineCommands {
      * @return false when it is not the right one, or the engine knows no lock
      */
     public boolean unlock(int pin) {
-        player.states.requireAlive("unlock()");
-        return player.native_setUnLockPin(pin) == 0;
+        return player.ask("unlock()", () -> player.native_setUnLockPin(pin) == 0);
     }
 
     /**
@@ -59,11 +58,11 @@ public final class EngineCommands {
      * @param command the line
      * @param argument the interpreter's number
      * @return true when it was accepted
+     * @throws IllegalArgumentException when the line is null
      */
     public boolean sendCommand(String command, int argument) {
-        player.states.requireAlive("sendCommand()");
-        return player.native_QTVDECSendCliCommand(
-                Objects.requireNonNull(command, "command"), argument) == 0;
+        return player.ask("sendCommand()", () -> player.native_QTVDECSendCliCommand(
+                Arguments.require(command, "the command"), argument) == 0);
     }
 
     /**
@@ -72,10 +71,11 @@ public final class EngineCommands {
      * @param request what is asked
      * @param reply where the answer goes; stays empty where requests lead nowhere
      * @return 0, or a negative status
+     * @throws IllegalArgumentException when one of them is null
      */
     public int invoke(Parcel request, Parcel reply) {
-        player.states.requireAlive("invoke()");
-        return player.native_invoke(request, reply);
+        return player.ask("invoke()", () -> player.native_invoke(
+                Arguments.require(request, "the request"), Arguments.require(reply, "the reply")));
     }
 
     /**
@@ -84,10 +84,11 @@ public final class EngineCommands {
      * @param key the engine's number of it
      * @param value its value
      * @return false when the engine has no such parameter, or parameters lead nowhere
+     * @throws IllegalArgumentException when the value is null
      */
     public boolean setParameter(int key, Parcel value) {
-        player.states.requireAlive("setParameter()");
-        return player.native_setParameter(key, value);
+        return player.ask("setParameter()",
+                () -> player.native_setParameter(key, Arguments.require(value, "the value")));
     }
 
     /**
@@ -95,10 +96,11 @@ public final class EngineCommands {
      *
      * @param key the engine's number of it
      * @param reply where its value goes; stays empty where parameters lead nowhere
+     * @throws IllegalArgumentException when the reply is null
      */
     public void getParameter(int key, Parcel reply) {
-        player.states.requireAlive("getParameter()");
-        player.native_getParameter(key, reply);
+        player.run("getParameter()",
+                () -> player.native_getParameter(key, Arguments.require(reply, "the reply")));
     }
 
     /**
@@ -107,14 +109,16 @@ public final class EngineCommands {
      * @param allow the wanted kinds' codes, 64 at most; 0 among them means every kind
      * @param block the unwanted kinds' codes, the same way
      * @return 0, or a negative status
+     * @throws IllegalArgumentException when a set or a code is null
      */
     public int setMetadataFilter(Set<Integer> allow, Set<Integer> block) {
         player.states.requireAlive("setMetadataFilter()");
         Parcel filter = Parcel.obtain();
         try {
-            writeCodes(filter, allow);
-            writeCodes(filter, block);
-            return player.native_setMetadataFilter(filter);
+            writeCodes(filter, Arguments.require(allow, "the set of wanted kinds"));
+            writeCodes(filter, Arguments.require(block, "the set of unwanted kinds"));
+            return player.ask("setMetadataFilter()",
+                    () -> player.native_setMetadataFilter(filter));
         } finally {
             filter.recycle();
         }
@@ -127,14 +131,15 @@ public final class EngineCommands {
      * @param applyFilter leave out what the filter blocks
      * @param reply where it goes
      * @return false when there is none, or this way leads nowhere; see {@link Tracks#metadata()}
+     * @throws IllegalArgumentException when the reply is null
      */
     public boolean getMetadata(boolean updateOnly, boolean applyFilter, Parcel reply) {
-        player.states.requireAlive("getMetadata()");
-        return player.native_getMetadata(updateOnly, applyFilter, reply);
+        return player.ask("getMetadata()", () -> player.native_getMetadata(
+                updateOnly, applyFilter, Arguments.require(reply, "the reply")));
     }
 
     private static void writeCodes(Parcel filter, Set<Integer> codes) {
         filter.writeInt(codes.size());
-        codes.forEach(filter::writeInt);
+        codes.forEach(code -> filter.writeInt(Arguments.require(code, "a code")));
     }
 }

@@ -33,7 +33,10 @@ final class EventQueue {
         events.add(new Event(epoch, action));
     }
 
-    /** Has the queued events run. The executor may run them at once: hold no lock. */
+    /**
+     * Has the queued events run; they are lost when the executor throws. It may run them at once:
+     * hold no lock.
+     */
     void flush() {
         synchronized (this) {
             if (drainPending || events.isEmpty()) {
@@ -45,6 +48,9 @@ final class EventQueue {
             executor.execute(this::drain);
         } catch (RejectedExecutionException e) {
             dropAll();
+        } catch (RuntimeException | Error e) {
+            dropAll();
+            uncaught(e);
         }
     }
 
@@ -64,6 +70,16 @@ final class EventQueue {
                 return;
             }
             left = end - System.nanoTime();
+        }
+    }
+
+    /** What foreign code threw where it disturbs nothing else. */
+    static void uncaught(Throwable thrown) {
+        Thread thread = Thread.currentThread();
+        try {
+            thread.getUncaughtExceptionHandler().uncaughtException(thread, thrown);
+        } catch (RuntimeException | Error e) {
+            // A handler's own failures are ignored, as the virtual machine does.
         }
     }
 

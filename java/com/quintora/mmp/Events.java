@@ -43,38 +43,34 @@ final class Events {
     }
 
     void prepared(int epoch) {
-        if (player.states.move(epoch, EnumSet.of(PlayerState.PREPARING), PlayerState.PREPARED)) {
-            tell(epoch, listener -> listener.onPrepared(player));
+        boolean news = tellIf(
+                epoch, () -> move(epoch, PlayerState.PREPARING, PlayerState.PREPARED),
+                listener -> listener.onPrepared(player));
+        if (news) {
             watcher.wake();
         }
     }
 
     void completed(int epoch) {
-        if (player.states.move(epoch, EnumSet.of(PlayerState.STARTED), PlayerState.COMPLETED)) {
-            tell(epoch, listener -> listener.onCompletion(player));
-        }
+        tellIf(epoch, () -> ends(epoch), listener -> listener.onCompletion(player));
     }
 
     void failed(int epoch, Exception thrown) {
         MediaException error =
                 Failures.explain(player.source(), thrown, player.stream().failure());
-        if (player.states.move(epoch, CAN_FAIL, PlayerState.ERROR)) {
-            tell(epoch, listener -> listener.onError(player, error));
+        tellIf(epoch, () -> player.states.move(epoch, CAN_FAIL, PlayerState.ERROR),
+                listener -> listener.onError(player, error));
+    }
+
+    synchronized void seekBegins(int epoch) {
+        if (player.states.isCurrent(epoch)) {
+            told.seeks++;
         }
     }
 
-    synchronized void seekBegins() {
-        told.seeks++;
-    }
-
-    synchronized void seekFailed() {
-        told.seeks = Math.max(0, told.seeks - 1);
-    }
-
-    void seekDone(int epoch) {
-        if (firstTime(epoch, () -> told.seeks > 0 && told.seeks-- > 0)) {
-            tell(epoch, listener -> listener.onSeekComplete(player));
-        }
+    void seekEnds(int epoch, boolean done) {
+        tellIf(epoch, () -> told.endsSeek() && done,
+                listener -> listener.onSeekComplete(player));
     }
 
     synchronized boolean seeking() {
@@ -82,22 +78,19 @@ final class Events {
     }
 
     void videoSize(int epoch, int width, int height) {
-        if (width > 0 && height > 0 && firstTime(epoch, () -> told.isNewSize(width, height))) {
-            tell(epoch, listener -> listener.onVideoSizeChanged(player, width, height));
-        }
+        tellIf(epoch, () -> width > 0 && height > 0 && told.isNewSize(width, height),
+                listener -> listener.onVideoSizeChanged(player, width, height));
     }
 
     void buffering(int epoch, int percent) {
         int shown = Math.max(0, Math.min(percent, 100));
-        if (firstTime(epoch, () -> told.isNewPercent(shown))) {
-            tell(epoch, listener -> listener.onBufferingUpdate(player, shown));
-        }
+        tellIf(epoch, () -> told.isNewPercent(shown),
+                listener -> listener.onBufferingUpdate(player, shown));
     }
 
     void info(int epoch, int what, int extra) {
-        if (firstTime(epoch, () -> told.isNewInfo(what))) {
-            tell(epoch, listener -> listener.onInfo(player, what, extra));
-        }
+        tellIf(epoch, () -> told.isNewInfo(what),
+                listener -> listener.onInfo(player, what, extra));
     }
 
     /**
@@ -122,9 +115,10 @@ final class Events {
             case NATIVE_PREPARED -> prepared(epoch);
             case NATIVE_PLAYBACK_COMPLETE -> completed(epoch);
             case NATIVE_BUFFERING_UPDATE -> buffering(epoch, arg1);
-            case NATIVE_SEEK_COMPLETE -> seekDone(epoch);
+            case NATIVE_SEEK_COMPLETE -> seekEnds(epoch, true);
             case NATIVE_SET_VIDEO_SIZE -> videoSize(epoch, arg1, arg2);
-            case NATIVE_TIMED_TEXT -> tell(epoch, l -> l.onTimedText(player, payload));
+            case NATIVE_TIMED_TEXT -> tellIf(
+                    epoch, () -> true, listener -> listener.onTimedText(player, payload));
             case NATIVE_ERROR -> failed(epoch, nativeError(arg1, arg2));
             case NATIVE_INFO -> info(epoch, arg1, arg2);
             default -> System.getLogger(Events.class.getName())
@@ -137,34 +131,56 @@ final class Events {
                 String.format("the engine reported error %d: status=0x%X", what, status));
     }
 
-    private synchronized boolean firstTime(int epoch, BooleanSupplier isNew) {
-        return player.states.isCurrent(epoch) && isNew.getAsBoolean();
+    private boolean move(int epoch, PlayerState from, PlayerState to) {
+        return player.states.move(epoch, EnumSet.of(from), to);
     }
 
-    /** Has listeners called for what was told under the command lock. */
-    void flush() {
-        queue.flush();
+    private boolean ends(int epoch) {
+        boolean news = move(epoch, PlayerState.STARTED, PlayerState.COMPLETED);
+        if (news && told.isNewInfo(PlayerListener.INFO_RENDERING_STARTED)) {
+            // Media so short that nobody saw them run.
+            queue(epoch, listener ->
+                    listener.onInfo(player, PlayerListener.INFO_RENDERING_STARTED, 0));
+        }
+        return news;
     }
 
-    private void tell(int epoch, Consumer<PlayerListener> call) {
-        queue.add(epoch, () -> {
-            for (PlayerListener listener : listeners) {
-                if (player.states.isCurrent(epoch)) {
-                    tellOne(listener, call);
-                }
+    /**
+     * Tells what the change found to be news. Both happen under one lock: who sees the change and
+     * acts on it is told of that afterwards.
+     */
+    private boolean tellIf(int epoch, BooleanSupplier change, Consumer<PlayerListener> call) {
+        boolean news;
+        synchronized (this) {
+            news = player.states.isCurrent(epoch) && change.getAsBoolean();
+            if (news) {
+                queue(epoch, call);
             }
-        });
+        }
+        flush();
+        return news;
+    }
+
+    private void queue(int epoch, Consumer<PlayerListener> call) {
+        queue.add(epoch, () -> listeners.forEach(listener -> tellOne(epoch, listener, call)));
+    }
+
+    /** Has listeners called, unless the command lock is held: who gives that up must flush. */
+    void flush() {
         if (!player.commands.isHeldByCurrentThread()) {
             queue.flush();
         }
     }
 
-    private static void tellOne(PlayerListener listener, Consumer<PlayerListener> call) {
+    private void tellOne(int epoch, PlayerListener listener, Consumer<PlayerListener> call) {
+        // A listener before this one may have reset the player, or taken this one off.
+        if (!player.states.isCurrent(epoch) || !listeners.contains(listener)) {
+            return;
+        }
         try {
             call.accept(listener);
         } catch (RuntimeException | Error e) {
-            Thread thread = Thread.currentThread();
-            thread.getUncaughtExceptionHandler().uncaughtException(thread, e);
+            EventQueue.uncaught(e);
         }
     }
 
@@ -176,6 +192,12 @@ final class Events {
         private int seeks;
         private boolean rendering;
         private boolean waiting;
+
+        boolean endsSeek() {
+            boolean sought = seeks > 0;
+            seeks -= sought ? 1 : 0;
+            return sought;
+        }
 
         boolean isNewSize(int newWidth, int newHeight) {
             boolean isNew = width != newWidth || height != newHeight;

@@ -13,6 +13,9 @@ import java.io.IOException;
  * the first time while the data source is set. {@link #close} is called once, when the player has
  * no more use for the source: at its reset or release, after a cancel if a read still blocks.
  *
+ * <p>No method may call the player, nor wait for a thread that does: the player's reset and release
+ * wait for the method that is running.
+ *
  * <p>What a method throws ends the media with an error whose cause it is; see {@link
  * PlayerListener#onError}.
  *

@@ -31,7 +31,9 @@ import java.util.concurrent.Executor;
  * <p>A player stands in one {@link PlayerState}; each method says in which it may be called and
  * throws {@link IllegalStateException} with a sentence otherwise, in every case after {@link
  * #release()}. Any thread may call any method at any time, also from inside a {@link
- * PlayerListener}. Methods do not block unless they say so.
+ * PlayerListener}. Methods do not block unless they say so, but those that change whether the
+ * player runs wait for one another. Where null is not said to be possible it is refused with an
+ * {@link IllegalArgumentException}.
  *
  * <p>Times are in milliseconds, sizes in pixels, positions in bytes where the name says so.
  *
@@ -149,8 +151,7 @@ public final class OrvMediaPlayer extends Playback {
         native_finalize();
     }
 
-    // Fields that the native half reads and writes. They have no initialisers: native_setup
-    // writes them before those would run.
+    // Fields that the native half reads and writes, all of them 0, null or false at first.
 
     private long mNativeContext;
     long mNativeSurfaceTexture;

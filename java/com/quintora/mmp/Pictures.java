@@ -29,15 +29,16 @@ public final class Pictures {
      * @param height rows, 1 to {@link #MAX_THUMBNAIL_HEIGHT}
      * @param colorMode the pixels' format
      * @return the picture; empty when the media has none or is not prepared
-     * @throws IllegalArgumentException for a size out of range
+     * @throws IllegalArgumentException for a size out of range and when the format is null
      */
     public Optional<Thumbnail> thumbnail(int width, int height, ColorMode colorMode) {
         player.states.requireAlive("thumbnail()");
         requireRange("width", width, MAX_THUMBNAIL_WIDTH);
         requireRange("height", height, MAX_THUMBNAIL_HEIGHT);
-        byte[] pixels = player.native_getThumbnailInfo(
-                new ThumbnailInfo(colorMode.number(), width, height));
-        return Optional.ofNullable(pixels)
+        ThumbnailInfo request = new ThumbnailInfo(
+                Arguments.require(colorMode, "the pixels' format").number(), width, height);
+        return player.ask("thumbnail()",
+                        () -> Optional.ofNullable(player.native_getThumbnailInfo(request)))
                 .map(bytes -> new Thumbnail(width, height, colorMode, bytes));
     }
 
@@ -47,8 +48,8 @@ public final class Pictures {
      * @return the bytes of an image file, as they stand in the media; empty when there is none
      */
     public Optional<byte[]> embedded() {
-        player.states.requireAlive("embedded()");
-        return Optional.ofNullable(player.native_getEmbeddedPicture(0));
+        return player.ask("embedded()",
+                () -> Optional.ofNullable(player.native_getEmbeddedPicture(0)));
     }
 
     /**
@@ -58,8 +59,8 @@ public final class Pictures {
      * @return the frame; empty on platforms that cannot, see {@link #thumbnail} there
      */
     public Optional<Bitmap> frameAt(int millis) {
-        player.states.requireAlive("frameAt()");
-        return Optional.ofNullable(player.native_getFrameAt(millis));
+        return player.ask("frameAt()",
+                () -> Optional.ofNullable(player.native_getFrameAt(millis)));
     }
 
     private static void requireRange(String name, int value, int most) {

@@ -2,17 +2,13 @@
 package com.quintora.mmp;
 
 import android.view.Surface;
-import com.quintora.mmp.util.PcmMediaInfo;
-import java.io.FileDescriptor;
 import java.io.IOException;
 import java.util.EnumSet;
-import java.util.Map;
-import java.util.Objects;
 import java.util.Set;
 import java.util.concurrent.Executor;
 
-/** The part of {@link OrvMediaPlayer} that opens and plays media. */
-abstract sealed class Playback extends PlayerCore implements AutoCloseable permits OrvMediaPlayer {
+/** The part of {@link OrvMediaPlayer} that plays media. */
+abstract sealed class Playback extends DataSources implements AutoCloseable permits OrvMediaPlayer {
     private static final Set<PlayerState> CAN_PREPARE =
             EnumSet.of(PlayerState.INITIALIZED, PlayerState.STOPPED);
     private static final Set<PlayerState> RUNNING =
@@ -31,10 +27,12 @@ abstract sealed class Playback extends PlayerCore implements AutoCloseable permi
      * Adds someone to tell what happens. Allowed in every state.
      *
      * @param listener who is told from now on; adding one twice tells it twice
+     * @throws IllegalArgumentException when it is null
+     * @throws IllegalStateException after release
      */
     public void addListener(PlayerListener listener) {
         states.requireAlive("addListener()");
-        events().listeners.add(Objects.requireNonNull(listener, "listener"));
+        events().listeners.add(Arguments.require(listener, "the listener"));
     }
 
     /**
@@ -56,105 +54,6 @@ abstract sealed class Playback extends PlayerCore implements AutoCloseable permi
     }
 
     /**
-     * Plays a file or a URL next. State: IDLE; then INITIALIZED.
-     *
-     * @param pathOrUrl a file's path, or a URL such as {@code http://host/film.mp4}
-     * @throws IllegalArgumentException when it is null
-     * @throws MediaException when it is a file that is not there, or a directory
-     * @throws SecurityException when the file must not be read
-     * @throws IllegalStateException in another state
-     */
-    public void setDataSource(String pathOrUrl) throws IOException {
-        initialize(pathOrUrl, () -> peer.native_setDataSource(required(pathOrUrl)));
-    }
-
-    /**
-     * Plays a URL next, with headers in every request for it. State: IDLE; then INITIALIZED.
-     *
-     * @param url the URL
-     * @param headers names and values, none of them null
-     * @throws IllegalArgumentException when the URL, a name or a value is null
-     * @throws IOException as {@link #setDataSource(String)}
-     * @throws IllegalStateException in another state
-     */
-    public void setDataSource(String url, Map<String, String> headers) throws IOException {
-        headers.forEach((name, value) -> {
-            if (name == null || value == null) {
-                throw new IllegalArgumentException("a header's name or value is null: " + name);
-            }
-        });
-        String[] names = headers.keySet().toArray(String[]::new);
-        String[] values = headers.values().toArray(String[]::new);
-        initialize(url, () -> peer.native_setDataSource(required(url), names, values));
-    }
-
-    /**
-     * Plays an open file next. State: IDLE; then INITIALIZED.
-     *
-     * @param fd an open descriptor; the player keeps one of its own
-     * @throws IllegalArgumentException when it is null
-     * @throws MediaException when it is not open
-     * @throws IllegalStateException in another state
-     */
-    public void setDataSource(FileDescriptor fd) throws IOException {
-        setDataSource(fd, 0, Long.MAX_VALUE);
-    }
-
-    /**
-     * Plays a part of an open file next. State: IDLE; then INITIALIZED.
-     *
-     * @param fd an open descriptor; the player keeps one of its own
-     * @param offset where the media begins, in bytes
-     * @param length how long it is, in bytes; more than there is means up to the end
-     * @throws IllegalArgumentException when the descriptor is null
-     * @throws MediaException when it is not open, or the offset or length is negative
-     * @throws IllegalStateException in another state
-     */
-    public void setDataSource(FileDescriptor fd, long offset, long length) throws IOException {
-        if (fd == null) {
-            throw new IllegalArgumentException("the descriptor is null");
-        }
-        initialize("the descriptor", () -> peer.native_setDataSource(fd, offset, length));
-    }
-
-    /**
-     * Plays bytes that the program produces next. State: IDLE; then INITIALIZED. The source is
-     * closed at the next reset or release, or by this call when it throws.
-     *
-     * @param media where the bytes come from
-     * @throws IOException when the source cannot tell its size
-     * @throws IllegalStateException in another state
-     */
-    public void setDataSource(MediaStreamSource media) throws IOException {
-        StreamAdapter adapter = new StreamAdapter(Objects.requireNonNull(media, "media"));
-        try {
-            initialize("the stream source", () -> {
-                adapter.describeTo(peer);
-                useStream(adapter);
-                peer.native_setDataSourceByInputStream();
-            });
-        } catch (IOException | RuntimeException e) {
-            adapter.close();
-            useStream(StreamAdapter.none());
-            throw e;
-        }
-    }
-
-    /**
-     * Says that the next data source is raw PCM. State: IDLE, before the data source.
-     *
-     * @param format what the bytes mean
-     * @throws IllegalArgumentException naming the value that is out of range
-     * @throws IllegalStateException in another state
-     */
-    public void setPcmFormat(PcmMediaInfo format) {
-        format.check();
-        states.require("setPcmFormat()", EnumSet.of(PlayerState.IDLE));
-        peer.native_setPcmMediaInfo(format);
-        peer.native_setPcmFlag();
-    }
-
-    /**
      * Chooses where the picture goes. Every state. Waits for a {@link #prepare()} that blocks on
      * another thread.
      *
@@ -164,8 +63,7 @@ abstract sealed class Playback extends PlayerCore implements AutoCloseable permi
      * @throws IllegalStateException after release
      */
     public void setSurface(Surface surface) {
-        states.requireAlive("setSurface()");
-        bindSurface(surface);
+        run("setSurface()", () -> bindSurface(surface));
     }
 
     /**
@@ -186,7 +84,7 @@ abstract sealed class Playback extends PlayerCore implements AutoCloseable permi
      * Begins to open the media. State: INITIALIZED or STOPPED; then PREPARING, and later PREPARED
      * with {@link PlayerListener#onPrepared} or ERROR with {@link PlayerListener#onError}.
      *
-     * @throws MediaException when the engine refuses at once
+     * @throws MediaException when the engine refuses at once, or reset or release came between
      * @throws IllegalStateException in another state
      */
     public void prepareAsync() throws IOException {
@@ -209,7 +107,7 @@ abstract sealed class Playback extends PlayerCore implements AutoCloseable permi
 
     /**
      * Halts at the present position. State: STARTED, PAUSED or COMPLETED; then PAUSED, but
-     * COMPLETED stays.
+     * COMPLETED stays. A player that has just come to its end becomes COMPLETED.
      *
      * @throws IllegalStateException in another state, or when the engine refuses
      */
@@ -229,29 +127,32 @@ abstract sealed class Playback extends PlayerCore implements AutoCloseable permi
 
     /**
      * Forgets the media; no listener is told anything more of it. State: every one but RELEASED;
-     * then IDLE. Ends a {@link #prepare()} that blocks on another thread. A listener call that is
-     * running on another thread is waited for, at most 100 ms.
+     * then IDLE, and ERROR until that is done. Ends a {@link #prepare()} that blocks on another
+     * thread. A listener call that is running on another thread is waited for, at most 100 ms, and
+     * so is a {@link MediaStreamSource} whose methods are running.
      *
-     * @throws MediaException when the engine fails; the state is ERROR then
+     * @throws MediaException when the engine fails; the state stays ERROR then
      * @throws IllegalStateException after release
      */
     public void reset() throws IOException {
-        states.requireAlive("reset()");
-        states.endEpoch(PlayerState.IDLE);
+        int epoch = states.beginReset("reset()");
         try {
             peer.native_reset();
         } catch (IOException e) {
-            states.move(states.epoch(), EnumSet.of(PlayerState.IDLE), PlayerState.ERROR);
             throw new MediaException("reset() failed", MediaException.STATUS_UNKNOWN, e);
+        } catch (IllegalStateException e) {
+            throw refusal("reset()", e);
         } finally {
             forgetMedia();
         }
+        states.move(epoch, EnumSet.of(PlayerState.ERROR), PlayerState.IDLE);
     }
 
     /**
      * Gives up everything that the player holds. Listeners are told nothing more: a call that is
-     * running on another thread is waited for, at most 100 ms. State: every one; then RELEASED. A
-     * second call does nothing.
+     * running on another thread is waited for, at most 100 ms, and so is a {@link
+     * MediaStreamSource} whose methods are running. State: every one; then RELEASED. A second call
+     * does nothing.
      *
      * @throws IllegalStateException when the engine fails; the player is released all the same
      */
@@ -298,8 +199,8 @@ abstract sealed class Playback extends PlayerCore implements AutoCloseable permi
      * @throws IllegalStateException after release
      */
     public boolean isPlaying() {
-        states.requireAlive("isPlaying()");
-        return getState() == PlayerState.STARTED && peer.native_isPlaying();
+        return ask("isPlaying()",
+                () -> getState() == PlayerState.STARTED && peer.native_isPlaying());
     }
 
     /**
@@ -309,15 +210,7 @@ abstract sealed class Playback extends PlayerCore implements AutoCloseable permi
      * @throws IllegalStateException after release
      */
     public int getCurrentPosition() {
-        states.requireAlive("getCurrentPosition()");
-        if (!hasMedia()) {
-            return 0;
-        }
-        try {
-            return peer.native_getCurrentPosition();
-        } catch (IOException | IllegalStateException e) {
-            return 0; // The media failed or went just now; the watcher tells.
-        }
+        return ofMedia("getCurrentPosition()", peer::native_getCurrentPosition);
     }
 
     /**
@@ -327,8 +220,7 @@ abstract sealed class Playback extends PlayerCore implements AutoCloseable permi
      * @throws IllegalStateException after release
      */
     public int getDuration() {
-        states.requireAlive("getDuration()");
-        return hasMedia() ? peer.native_getDuration() : 0;
+        return ofMedia("getDuration()", peer::native_getDuration);
     }
 
     /**
@@ -338,8 +230,7 @@ abstract sealed class Playback extends PlayerCore implements AutoCloseable permi
      * @throws IllegalStateException after release
      */
     public int getVideoWidth() {
-        states.requireAlive("getVideoWidth()");
-        return peer.native_getVideoWidth();
+        return ask("getVideoWidth()", peer::native_getVideoWidth);
     }
 
     /**
@@ -349,8 +240,7 @@ abstract sealed class Playback extends PlayerCore implements AutoCloseable permi
      * @throws IllegalStateException after release
      */
     public int getVideoHeight() {
-        states.requireAlive("getVideoHeight()");
-        return peer.native_getVideoHeight();
+        return ask("getVideoHeight()", peer::native_getVideoHeight);
     }
 
     /**
@@ -360,7 +250,6 @@ abstract sealed class Playback extends PlayerCore implements AutoCloseable permi
      * @throws IllegalStateException after release, or when the engine refuses
      */
     public void setLooping(boolean looping) {
-        states.requireAlive("setLooping()");
         run("setLooping()", () -> peer.native_setLooping(looping));
     }
 
@@ -371,14 +260,20 @@ abstract sealed class Playback extends PlayerCore implements AutoCloseable permi
      * @throws IllegalStateException after release
      */
     public boolean isLooping() {
-        states.requireAlive("isLooping()");
-        return peer.native_isLooping();
+        return ask("isLooping()", peer::native_isLooping);
     }
 
-    private static String required(String pathOrUrl) {
-        if (pathOrUrl == null) {
-            throw new IllegalArgumentException("the path or URL is null");
+    /** What the engine says of its media; 0 when there are none. */
+    private int ofMedia(String call, EngineValue value) {
+        states.requireAlive(call);
+        try {
+            return hasMedia() ? value.get() : 0;
+        } catch (IOException | IllegalStateException e) {
+            return 0; // They failed or went just now; the watcher tells.
         }
-        return pathOrUrl;
+    }
+
+    private interface EngineValue {
+        int get() throws IOException;
     }
 }

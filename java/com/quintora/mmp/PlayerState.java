@@ -25,7 +25,7 @@ public enum PlayerState {
     COMPLETED,
     /** Stopped; must be prepared again. */
     STOPPED,
-    /** The media failed; only reset and release are possible. */
+    /** The media failed, or are being reset just now; only reset and release are possible. */
     ERROR,
     /** Given up; every other call throws {@link IllegalStateException}. */
     RELEASED

@@ -5,7 +5,7 @@ import java.util.EnumSet;
 import java.util.Set;
 
 /**
- * A player's state. Each data source begins an epoch: what was begun in one epoch must not act in a
+ * A player's state. Each reset begins an epoch: what was begun in one epoch must not act in a
  * later one, so every move names the epoch that it belongs to. Thread-safe.
  */
 final class StateMachine {
@@ -27,6 +27,10 @@ final class StateMachine {
         return this.epoch == epoch;
     }
 
+    synchronized boolean isStill(int epoch, PlayerState state) {
+        return this.epoch == epoch && this.state == state;
+    }
+
     /** Moves if the epoch still runs and the state is one of those; tells whether it did. */
     synchronized boolean move(int epoch, Set<PlayerState> from, PlayerState to) {
         if (this.epoch != epoch || !from.contains(state)) {
@@ -44,6 +48,16 @@ final class StateMachine {
             state = to;
         }
         return was;
+    }
+
+    /**
+     * Begins the next epoch with a reset: in ERROR, where nothing else is possible, until a move to
+     * IDLE says that it is done.
+     */
+    synchronized int beginReset(String call) {
+        requireAlive(call);
+        state = PlayerState.ERROR;
+        return ++epoch;
     }
 
     /** The running epoch, or an exception when the state is none of those. */

@@ -17,6 +17,9 @@ final class StreamAdapter {
     private static final int SEEK_CUR = 1;
     private static final int SEEK_END = 2;
 
+    // The kind of seeking that every source with positions can do.
+    private static final int SEEKS_BY_BYTES = 0;
+
     // The native half carries 32 bits of a size, all set for an unknown one.
     private static final long SIZE_LIMIT = 0xFFFF_FFFFL;
 
@@ -25,6 +28,7 @@ final class StreamAdapter {
     private long size;
     private long position;
     private final AtomicBoolean closed = new AtomicBoolean();
+    private volatile boolean reading;
     private volatile boolean cancelled;
     private volatile Throwable failure;
 
@@ -42,21 +46,22 @@ final class StreamAdapter {
         this.player = player;
         try {
             size = source.size();
-        } catch (IOException e) {
+            player.mStreamSize = size > 0 && size < SIZE_LIMIT ? size : 0;
+            player.mStreamCurPos = 0;
+            player.mStreamSeekable = source.isSeekable();
+            player.mStallingSupport = source.mayStall();
+            player.mStreamDuration = source.durationMillis();
+            player.mDataSourceType = 0;
+        } catch (IOException | RuntimeException e) {
             throw new MediaException(
-                    "the stream source cannot tell its size: " + e, MediaException.STATUS_IO, e);
+                    "the stream source cannot describe itself: " + e, MediaException.STATUS_IO, e);
         }
-        player.mStreamSize = size > 0 && size < SIZE_LIMIT ? size : 0;
-        player.mStreamCurPos = 0;
-        player.mStreamSeekable = source.isSeekable();
-        player.mStallingSupport = source.mayStall();
-        player.mStreamDuration = source.durationMillis();
-        player.mDataSourceType = 0;
     }
 
     /** The count of bytes put into the player's buffer, END or FAILED. */
     synchronized int read(int length) {
         cancelled = false;
+        reading = true;
         try {
             int count = closed.get() || length <= 0 ? END : source.read(buffer(length), length);
             if (count < -1 || count > length) {
@@ -67,7 +72,14 @@ final class StreamAdapter {
         } catch (Throwable e) { // Native code must not meet it.
             remember(e);
             return FAILED;
+        } finally {
+            reading = false;
         }
+    }
+
+    /** Whether the source is being read just now, as it is while it keeps the engine waiting. */
+    boolean isReading() {
+        return reading;
     }
 
     /** The new position, or FAILED. */
@@ -81,10 +93,13 @@ final class StreamAdapter {
         if (target == position) {
             return position;
         }
-        if (target < 0 || closed.get() || !source.isSeekable()) {
+        if (target < 0 || closed.get()) {
             return FAILED;
         }
         try {
+            if (!source.isSeekable()) {
+                return FAILED;
+            }
             source.seek(target);
             return moveTo(target);
         } catch (Throwable e) { // Native code must not meet it.
@@ -104,7 +119,12 @@ final class StreamAdapter {
     }
 
     int seekType() {
-        return source.seekType();
+        try {
+            return source.seekType();
+        } catch (Throwable e) { // Native code must not meet it.
+            remember(e);
+            return SEEKS_BY_BYTES;
+        }
     }
 
     // Not synchronized: it ends a read that holds the lock.

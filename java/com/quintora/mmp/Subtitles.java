@@ -2,7 +2,6 @@
 package com.quintora.mmp;
 
 import com.quintora.SubtitleAttr;
-import java.util.Objects;
 
 /**
  * Subtitles on a player's picture. Thread-safe; all methods throw {@link IllegalStateException}
@@ -22,58 +21,60 @@ public final class Subtitles {
      * @param index its number among the subtitle tracks, from 0
      */
     public void show(int index) {
-        player.states.requireAlive("show()");
-        player.native_onSubtitleTrack(index);
+        player.run("show()", () -> player.native_onSubtitleTrack(index));
     }
 
     /** Shows no subtitles. */
     public void hide() {
-        player.states.requireAlive("hide()");
-        player.native_offSubtitleTrack();
+        player.run("hide()", player::native_offSubtitleTrack);
     }
 
     /**
-     * Adds the subtitles of a file or URL, such as SRT or ASS, as a track and shows it.
+     * Adds the subtitles of a file or URL, such as SRT or ASS, as a track and shows it. Blocks
+     * while they are read, for a URL as long as its server takes.
      *
      * @param pathOrUrl where they are
+     * @throws IllegalArgumentException when it is null
      */
     public void add(String pathOrUrl) {
-        player.states.requireAlive("add()");
-        player.native_setSubtitleDataSource(Objects.requireNonNull(pathOrUrl, "pathOrUrl"));
+        player.run("add()", () -> player.native_setSubtitleDataSource(
+                Arguments.require(pathOrUrl, "the path or URL")));
     }
 
     /**
-     * Adds subtitles that are a pair of files as a track and shows it.
+     * Adds subtitles that are a pair of files as a track and shows it. Blocks while they are read.
      *
      * @param pictures the path of the file with the pictures (.sub)
      * @param index the path of the file with their times (.idx)
+     * @throws IllegalArgumentException when one of them is null
      */
     public void add(String pictures, String index) {
-        player.states.requireAlive("add()");
-        player.native_setSubtitleDataSourceEx(
-                Objects.requireNonNull(pictures, "pictures"),
-                Objects.requireNonNull(index, "index"));
+        player.run("add()", () -> player.native_setSubtitleDataSourceEx(
+                Arguments.require(pictures, "the path of the pictures"),
+                Arguments.require(index, "the path of the index")));
     }
 
     /**
-     * Adds a file or URL of timed text as a track, without showing it.
+     * Adds a file or URL of timed text as a track, without showing it. Blocks as {@link
+     * #add(String)} does.
      *
      * @param pathOrUrl where it is
+     * @throws IllegalArgumentException when it is null
      */
     public void addTimedText(String pathOrUrl) {
-        player.states.requireAlive("addTimedText()");
-        player.native_addTimedTextSource(Objects.requireNonNull(pathOrUrl, "pathOrUrl"));
+        player.run("addTimedText()", () -> player.native_addTimedTextSource(
+                Arguments.require(pathOrUrl, "the path or URL")));
     }
 
     /**
      * Changes how subtitles look; what the attributes do not name stays as it is.
      *
      * @param attr such as {@code SubtitleAttr.builder().textColor(0xFFFFFF00).build()}
-     * @throws IllegalArgumentException when the mask names a group that is null
+     * @throws IllegalArgumentException when they are null, or the mask names a group that is null
      */
     public void setStyle(SubtitleAttr attr) {
         player.states.requireAlive("setStyle()");
-        attr.check();
-        player.native_setSubtitleAttr(attr);
+        Arguments.require(attr, "the attributes' object").check();
+        player.run("setStyle()", () -> player.native_setSubtitleAttr(attr));
     }
 }

@@ -35,9 +35,8 @@ public final class Tracks {
      * @return in the order of their indices
      */
     public synchronized List<AudioTrack> audio() {
-        player.states.requireAlive("audio()");
         audio.clear();
-        player.native_getAllAudioTrackInfo(true);
+        player.ask("audio()", () -> player.native_getAllAudioTrackInfo(true));
         return List.copyOf(audio);
     }
 
@@ -47,9 +46,8 @@ public final class Tracks {
      * @return in the order of their indices
      */
     public synchronized List<VideoTrack> video() {
-        player.states.requireAlive("video()");
         video.clear();
-        player.native_getAllVideoTrackInfo();
+        player.ask("video()", player::native_getAllVideoTrackInfo);
         return List.copyOf(video);
     }
 
@@ -59,9 +57,8 @@ public final class Tracks {
      * @return the track, its index always 0; empty when there is none
      */
     public synchronized Optional<VideoTrack> currentVideo() {
-        player.states.requireAlive("currentVideo()");
         video.clear();
-        player.native_getVideoCodecInfo();
+        player.ask("currentVideo()", player::native_getVideoCodecInfo);
         return video.stream().findFirst();
     }
 
@@ -71,9 +68,8 @@ public final class Tracks {
      * @return in the order of their indices
      */
     public synchronized List<SubtitleTrack> subtitles() {
-        player.states.requireAlive("subtitles()");
         subtitles.clear();
-        player.native_getAllSubtitleTrackInfo();
+        player.ask("subtitles()", player::native_getAllSubtitleTrackInfo);
         return List.copyOf(subtitles);
     }
 
@@ -89,7 +85,7 @@ public final class Tracks {
             return Optional.empty();
         }
         subtitles.clear();
-        player.native_getSubtitleTrackInfo(index);
+        player.ask("subtitle()", () -> player.native_getSubtitleTrackInfo(index));
         return subtitles.stream().findFirst().map(track -> track.withIndex(index));
     }
 
@@ -99,9 +95,9 @@ public final class Tracks {
      * @return in the order of time
      */
     public synchronized List<Chapter> chapters() {
-        player.states.requireAlive("chapters()");
         List<Chapter> chapters = new ArrayList<>();
-        while (player.native_getSubtitleTrackInfo(CHAPTER_INDEX_BASE + chapters.size())) {
+        while (player.ask("chapters()", () ->
+                player.native_getSubtitleTrackInfo(CHAPTER_INDEX_BASE + chapters.size()))) {
             chapters.add(new Chapter(
                     chapters.size(), chapter.startMillis(), chapter.endMillis(), chapter.title()));
         }
@@ -114,9 +110,8 @@ public final class Tracks {
      * @return the metadata; empty before the media is prepared
      */
     public synchronized Optional<MediaMetadata> metadata() {
-        player.states.requireAlive("metadata()");
         metadata = null;
-        player.native_getMetaDataInfo();
+        player.ask("metadata()", player::native_getMetaDataInfo);
         return Optional.ofNullable(metadata);
     }
 
@@ -127,8 +122,7 @@ public final class Tracks {
      * @return false when there is no such track or it cannot be played
      */
     public boolean selectAudio(int index) {
-        player.states.requireAlive("selectAudio()");
-        return player.native_setAudioTrack(index);
+        return player.ask("selectAudio()", () -> player.native_setAudioTrack(index));
     }
 
     /**
@@ -137,8 +131,8 @@ public final class Tracks {
      * @return its number among the sound tracks; empty for none or before the media is prepared
      */
     public OptionalInt currentAudio() {
-        player.states.requireAlive("currentAudio()");
-        return current(player.native_getCurrentAudioIndex(), audio().size());
+        int index = player.ask("currentAudio()", player::native_getCurrentAudioIndex);
+        return current(index, audio().size());
     }
 
     /**
@@ -147,8 +141,8 @@ public final class Tracks {
      * @return its number among the subtitle tracks; empty for none or before the media is prepared
      */
     public OptionalInt currentSubtitle() {
-        player.states.requireAlive("currentSubtitle()");
-        return current(player.native_getCurrentSubtitleIndex(), subtitles().size());
+        int index = player.ask("currentSubtitle()", player::native_getCurrentSubtitleIndex);
+        return current(index, subtitles().size());
     }
 
     /**
@@ -157,8 +151,7 @@ public final class Tracks {
      * @param number counted over all kinds: picture, then sound, then subtitle tracks, from 0
      */
     public void select(int number) {
-        player.states.requireAlive("select()");
-        player.native_selectTrack(number);
+        player.run("select()", () -> player.native_selectTrack(number));
     }
 
     /**
@@ -167,8 +160,7 @@ public final class Tracks {
      * @param number counted as for {@link #select}
      */
     public void deselect(int number) {
-        player.states.requireAlive("deselect()");
-        player.native_deselectTrack(number);
+        player.run("deselect()", () -> player.native_deselectTrack(number));
     }
 
     void addAudio(AudioTrack track) {

@@ -9,7 +9,10 @@ import java.io.IOException;
  * the media is prepared.
  */
 public final class TrickPlay {
-    /** The highest speed; its negative is the highest backward speed. */
+    /** The lowest speed, forward and backward. */
+    public static final double MIN_SPEED = 0.25;
+
+    /** The highest speed, forward and backward. */
     public static final double MAX_SPEED = 32;
 
     // The engine counts speeds in thousandths.
@@ -28,13 +31,16 @@ public final class TrickPlay {
     /**
      * Changes the speed of playing.
      *
-     * @param speed 1 for normal, -{@link #MAX_SPEED} to {@link #MAX_SPEED}, in steps of 0.001;
-     *     negative plays backward
+     * @param speed 1 for normal, {@link #MIN_SPEED} to {@link #MAX_SPEED} in steps of 0.001, or
+     *     the negative of that to play backward; neither 0 nor what lies between
      * @throws IllegalArgumentException for a speed that {@link #canPlayAt} denies
+     * @throws IllegalStateException before the media is prepared
      */
     public void setSpeed(double speed) {
         requireMedia("setSpeed()");
-        if (!canPlayAt(speed) || player.native_setPlayMode(thousandths(speed)) != 0) {
+        if (!canPlayAt(speed)
+                || player.ask("setSpeed()",
+                        () -> player.native_setPlayMode(thousandths(speed)) != 0)) {
             throw new IllegalArgumentException("this media cannot be played at speed " + speed);
         }
         player.wake();
@@ -46,37 +52,39 @@ public final class TrickPlay {
      * @return 1 for normal, negative for backward
      */
     public double getSpeed() {
-        player.states.requireAlive("getSpeed()");
-        return player.native_getPlayMode() / (double) NORMAL_SPEED;
+        return player.ask("getSpeed()", player::native_getPlayMode) / (double) NORMAL_SPEED;
     }
 
     /**
      * Whether a seek is possible while playing at a speed.
      *
-     * @param speed as for {@link #setSpeed}
+     * @param speed as for {@link #setSpeed}, or 0 for halted
      * @return true if so
      */
     public boolean canSeekAt(double speed) {
-        player.states.requireAlive("canSeekAt()");
-        return inRange(speed) && player.native_canDoSeek(thousandths(speed));
+        return player.ask("canSeekAt()",
+                () -> inRange(speed) && player.native_canDoSeek(thousandths(speed)));
     }
 
     /**
      * Whether the media can be played at a speed.
      *
      * @param speed as for {@link #setSpeed}
-     * @return true if so
+     * @return true if so; false for every speed out of range
      */
     public boolean canPlayAt(double speed) {
-        player.states.requireAlive("canPlayAt()");
-        return inRange(speed) && player.native_canDoTrick(thousandths(speed));
+        return player.ask("canPlayAt()",
+                () -> inRange(speed) && player.native_canDoTrick(thousandths(speed)));
     }
 
     /**
-     * Goes some frames on and halts there. The player becomes PAUSED.
+     * Goes some frames on and halts there. Blocks until the last one is shown, at most 5 seconds
+     * for each frame forward and 10 for each back; reset and release end it. The player becomes
+     * PAUSED, also when there are fewer frames: it halts at the last one then. Media without a
+     * picture play on.
      *
      * @param frames how many; negative for back
-     * @throws IllegalStateException when the engine cannot
+     * @throws IllegalStateException when the media have no picture or no such frame
      */
     public void step(int frames) {
         requireMedia("step()");
@@ -118,11 +126,16 @@ public final class TrickPlay {
      */
     public long getBytePosition() throws IOException {
         requireMedia("getBytePosition()");
-        return Integer.toUnsignedLong(player.native_getCurrentBytePosition());
+        try {
+            return Integer.toUnsignedLong(player.native_getCurrentBytePosition());
+        } catch (IllegalStateException e) {
+            throw player.refusal("getBytePosition()", e);
+        }
     }
 
     /**
-     * Goes to a place in the media's bytes.
+     * Goes to a place in the media's bytes, and blocks until it is shown, for a limited time, as
+     * {@link OrvMediaPlayer#seekTo} does.
      *
      * @param position bytes from the start, below 2 GiB: the native half carries no more
      * @throws IllegalArgumentException for a position out of range
@@ -142,13 +155,12 @@ public final class TrickPlay {
      * @return 0 to 100
      */
     public int getBufferedPercent() {
-        player.states.requireAlive("getBufferedPercent()");
-        return player.native_getBufferPercent();
+        return player.ask("getBufferedPercent()", player::native_getBufferPercent);
     }
 
     private boolean repeat(String call, int type) {
         requireMedia(call);
-        return player.native_setABRepeat(type) > 0;
+        return player.ask(call, () -> player.native_setABRepeat(type) > 0);
     }
 
     private void requireMedia(String call) {

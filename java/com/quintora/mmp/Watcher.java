@@ -3,6 +3,7 @@ package com.quintora.mmp;
 
 import java.io.IOException;
 import java.lang.ref.WeakReference;
+import java.util.OptionalInt;
 import java.util.concurrent.RejectedExecutionException;
 import java.util.concurrent.ScheduledThreadPoolExecutor;
 import java.util.concurrent.TimeUnit;
@@ -21,8 +22,6 @@ final class Watcher {
     private static final int RESTING = 500;
     private static final int RESTING_LONG = 5000;
     private static final int NO_MORE = -1;
-
-    private static final int FULL = 100;
 
     // Every how many looks at a playing player the slow values are asked for.
     private static final int SLOW_EVERY = 10;
@@ -134,36 +133,49 @@ final class Watcher {
     }
 
     private int observePlaying(OrvMediaPlayer player, int epoch) {
-        int position;
-        try {
-            position = player.native_getCurrentPosition();
-        } catch (IllegalStateException e) {
-            return PLAYING; // Being reset just now.
-        } catch (IOException | SecurityException e) {
-            player.events().failed(epoch, e);
-            return NO_MORE;
+        OptionalInt position = position(player, epoch);
+        if (position.isEmpty()) {
+            return PLAYING; // The next look finds another state.
         }
-        if (position == lastPosition) {
-            observeStanding(player, epoch, position);
-        } else {
-            observeMoving(player, epoch);
-        }
-        lastPosition = position;
+        compare(player, epoch, position.getAsInt());
+        lastPosition = position.getAsInt();
         if (looks % SLOW_EVERY == 1) {
             observeSlow(player, epoch);
         }
         return PLAYING;
     }
 
-    private void observeStanding(OrvMediaPlayer player, int epoch, int position) {
-        if (player.events().seeking() || player.native_isPlaying()) {
+    /** The position, which tells whether the media failed; empty when they did or are gone. */
+    private OptionalInt position(OrvMediaPlayer player, int epoch) {
+        try {
+            return OptionalInt.of(player.native_getCurrentPosition());
+        } catch (IllegalStateException e) {
+            return OptionalInt.empty(); // Being reset just now.
+        } catch (IOException | SecurityException e) {
+            player.events().failed(epoch, e);
+            return OptionalInt.empty();
+        }
+    }
+
+    private void compare(OrvMediaPlayer player, int epoch, int position) {
+        if (looks == 1 || player.events().seeking()) {
+            return; // Where it was before is another round's, or left by a seek: no movement.
+        }
+        if (position == lastPosition) {
+            observeStanding(player, epoch);
+        } else {
+            observeMoving(player, epoch);
+        }
+    }
+
+    private void observeStanding(OrvMediaPlayer player, int epoch) {
+        if (player.native_isPlaying()) {
             return;
         }
-        int duration = player.native_getDuration();
-        if (position < duration) {
-            player.events().info(epoch, PlayerListener.INFO_BUFFERING_STARTED, 0);
-        } else {
+        if (player.atEnd()) {
             player.events().completed(epoch);
+        } else {
+            player.events().info(epoch, PlayerListener.INFO_BUFFERING_STARTED, 0);
         }
     }
 
@@ -174,9 +186,8 @@ final class Watcher {
 
     private int observeResting(OrvMediaPlayer player, int epoch) {
         int before = lastPercent;
-        observeSlow(player, epoch);
-        if (lastPercent >= FULL) {
-            return NO_MORE;
+        if (position(player, epoch).isPresent()) {
+            observeSlow(player, epoch);
         }
         return lastPercent == before ? RESTING_LONG : RESTING;
     }

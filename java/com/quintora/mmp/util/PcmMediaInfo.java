@@ -1,6 +1,8 @@
 // SPDX-License-Identifier: Apache-2.0
 package com.quintora.mmp.util;
 
+import java.util.Set;
+
 /**
  * The description of a raw PCM stream, which does not describe itself. The fields are read by the
  * native half; {@link #of} and the {@code with} methods make complete descriptions.
@@ -18,7 +20,7 @@ public class PcmMediaInfo {
     /** Milliseconds, 0 when unknown. */
     public int totalDuration;
 
-    /** Bytes, 0 when unknown. The native half carries sizes below 2 GiB. */
+    /** Bytes, 0 when unknown. The native half carries sizes below 2 GiB alone. */
     public long size;
 
     /** Whether audio and video are kept in step: 0 or 1. */
@@ -74,7 +76,7 @@ public class PcmMediaInfo {
      * Says how long the stream is.
      *
      * @param millis milliseconds, 0 when unknown
-     * @param bytes bytes, 0 when unknown
+     * @param bytes bytes below 2 GiB, 0 when unknown
      * @return this
      */
     public PcmMediaInfo withLength(int millis, long bytes) {
@@ -86,14 +88,18 @@ public class PcmMediaInfo {
     /**
      * Checks the description as a player will.
      *
-     * @throws IllegalArgumentException naming the value that is out of range
+     * @throws IllegalArgumentException naming the value that is out of range and its range
      */
     public void check() {
         require(audioPcmInfo != null, "audioPcmInfo is null");
-        require(mediaType == MEDIA_TYPE_AUDIO, "mediaType is " + mediaType);
-        require(audioCodec == AUDIO_CODEC_PCM, "audioCodec is " + audioCodec);
-        require(totalDuration >= 0, "totalDuration is " + totalDuration);
-        require(size >= 0, "size is " + size);
+        require(mediaType == MEDIA_TYPE_AUDIO,
+                "the media type " + mediaType + "; only 1, audio, is possible");
+        require(audioCodec == AUDIO_CODEC_PCM,
+                "the codec " + audioCodec + "; only 1, PCM, is possible");
+        require(totalDuration >= 0,
+                "a duration of " + totalDuration + " ms; 0, for unknown, or more is possible");
+        require(size >= 0 && size <= Integer.MAX_VALUE,
+                "a size of " + size + " bytes; 0, for unknown, to 2147483647 are possible");
         audioPcmInfo.check();
     }
 
@@ -142,20 +148,29 @@ public class PcmMediaInfo {
         public AudioPcmInfo() {}
 
         void check() {
-            require(pcm_type >= SIGNED && pcm_type <= MU_LAW, "pcm_type is " + pcm_type);
-            require(channelNumber >= 1 && channelNumber <= 8, "channelNumber is " + channelNumber);
-            require(sampleRate >= 1000 && sampleRate <= 384_000, "sampleRate is " + sampleRate);
-            require(fits(), bitsPerSample + " bits do not go with pcm_type " + pcm_type);
-            require(blockAlign == channelNumber * bitsPerSample / 8, "blockAlign is " + blockAlign);
+            require(pcm_type >= SIGNED && pcm_type <= MU_LAW,
+                    "samples of type " + pcm_type + "; 0 to 4 are possible");
+            require(channelNumber >= 1 && channelNumber <= 8,
+                    channelNumber + " channels; 1 to 8 are possible");
+            require(sampleRate >= 1000 && sampleRate <= 384_000,
+                    sampleRate + " samples per second; 1000 to 384000 are possible");
+            checkBits();
+            int frame = channelNumber * bitsPerSample / 8;
+            require(blockAlign == frame,
+                    "a block of " + blockAlign + " bytes; one sample of all channels has " + frame);
         }
 
-        private boolean fits() {
-            return switch (pcm_type) {
-                case SIGNED -> bitsPerSample == 16 || bitsPerSample == 24 || bitsPerSample == 32
-                        || bitsPerSample == 8;
-                case FLOAT -> bitsPerSample == 32;
-                default -> bitsPerSample == 8;
-            };
+        private void checkBits() {
+            switch (pcm_type) {
+                case SIGNED -> require(Set.of(8, 16, 24, 32).contains(bitsPerSample),
+                        bitsPerSample + " bits; signed samples have 8, 16, 24 or 32");
+                case UNSIGNED -> require(bitsPerSample == 8,
+                        bitsPerSample + " bits; unsigned samples have 8");
+                case FLOAT -> require(bitsPerSample == 32,
+                        bitsPerSample + " bits; floating-point samples have 32");
+                default -> require(bitsPerSample == 8,
+                        bitsPerSample + " bits; A-law and mu-law samples have 8");
+            }
         }
     }
 }

@@ -8,6 +8,7 @@ import static org.junit.jupiter.api.Assertions.assertTrue;
 import static org.junit.jupiter.api.Assumptions.assumeFalse;
 
 import android.media.ImageReader;
+import android.os.Parcel;
 import android.view.Surface;
 import java.io.FileDescriptor;
 import java.io.FileInputStream;
@@ -17,11 +18,14 @@ import java.nio.charset.StandardCharsets;
 import java.nio.file.Files;
 import java.nio.file.Path;
 import java.nio.file.attribute.PosixFilePermissions;
+import java.util.Collections;
 import java.util.HashMap;
 import java.util.Map;
 import java.util.Random;
+import java.util.Set;
 import org.junit.jupiter.api.AfterEach;
 import org.junit.jupiter.api.Test;
+import org.junit.jupiter.api.function.Executable;
 import org.junit.jupiter.api.io.TempDir;
 
 /** What cannot be played is named, and the player serves on. */
@@ -153,12 +157,49 @@ class BadInputTest extends PlayerFixture {
     void headersThatAreNull() {
         Map<String, String> headers = new HashMap<>();
         headers.put("Accept", null);
-        assertThrows(IllegalArgumentException.class,
+        assertNullRefused("the value of the header Accept",
                 () -> player.setDataSource("http://h/", headers));
         headers.clear();
         headers.put(null, "x");
-        assertThrows(IllegalArgumentException.class,
-                () -> player.setDataSource("http://h/", headers));
+        assertNullRefused("a header's name", () -> player.setDataSource("http://h/", headers));
+    }
+
+    @Test
+    void argumentsThatAreNull() throws Exception {
+        Parcel parcel = Parcel.obtain();
+        EngineCommands engine = player.engine();
+        assertNullRefused("the headers' map", () -> player.setDataSource("http://h/", null));
+        MediaStreamSource none = null;
+        assertNullRefused("the stream source", () -> player.setDataSource(none));
+        assertNullRefused("the PCM description", () -> player.setPcmFormat(null));
+        assertNullRefused("the listener", () -> player.addListener(null));
+        assertNullRefused("the role", () -> engine.setRole(null));
+        assertNullRefused("the command", () -> engine.sendCommand(null, 1));
+        assertNullRefused("the request", () -> engine.invoke(null, parcel));
+        assertNullRefused("the reply", () -> engine.invoke(parcel, null));
+        assertNullRefused("the value", () -> engine.setParameter(1, null));
+        assertNullRefused("the reply", () -> engine.getParameter(1, null));
+        assertNullRefused("the reply", () -> engine.getMetadata(true, true, null));
+        assertNullRefused("the set of wanted kinds",
+                () -> engine.setMetadataFilter(null, Set.of()));
+        assertNullRefused("the set of unwanted kinds",
+                () -> engine.setMetadataFilter(Set.of(), null));
+        assertNullRefused("a code",
+                () -> engine.setMetadataFilter(Collections.singleton(null), Set.of()));
+        assertNullRefused("the path or URL", () -> player.subtitles().add(null));
+        assertNullRefused("the path of the pictures", () -> player.subtitles().add(null, "x"));
+        assertNullRefused("the path of the index", () -> player.subtitles().add("x", null));
+        assertNullRefused("the path or URL", () -> player.subtitles().addTimedText(null));
+        assertNullRefused("the attributes' object", () -> player.subtitles().setStyle(null));
+        assertNullRefused("the pixels' format", () -> player.pictures().thumbnail(1, 1, null));
+        assertNullRefused("the position", () -> player.divx().setLastMemory(null));
+        assertNullRefused("the channel", () -> new ChannelStreamSource(null));
+        parcel.recycle();
+    }
+
+    private static void assertNullRefused(String name, Executable call) {
+        IllegalArgumentException e = assertThrows(IllegalArgumentException.class, call);
+        assertEquals(name + " is null", e.getMessage());
     }
 
     @Test

@@ -134,6 +134,28 @@ class EventQueueTest {
         assertEquals(List.of("next"), ran);
     }
 
+    @Test
+    void anExecutorThatFailsLosesTheEventsAndIsReported() {
+        List<Throwable> uncaught = new CopyOnWriteArrayList<>();
+        Thread.currentThread().setUncaughtExceptionHandler((thread, e) -> uncaught.add(e));
+        RuntimeException idle = new IllegalStateException("the toolkit does not run");
+        AtomicBoolean fails = new AtomicBoolean(true);
+        EventQueue queue = new EventQueue(task -> {
+            if (fails.get()) {
+                throw idle;
+            }
+            task.run();
+        }, any -> true);
+        queue.add(0, () -> ran.add("lost"));
+        queue.flush();
+        fails.set(false);
+        queue.add(0, () -> ran.add("next"));
+        queue.flush();
+        Thread.currentThread().setUncaughtExceptionHandler(null);
+        assertEquals(List.of("next"), ran);
+        assertEquals(List.of(idle), uncaught);
+    }
+
     private static void sleep(long millis) {
         try {
             Thread.sleep(millis);

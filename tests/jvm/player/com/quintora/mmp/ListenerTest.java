@@ -137,7 +137,8 @@ class ListenerTest extends PlayerFixture {
     @Test
     void nothingIsToldAfterRelease() throws Exception {
         for (int i = 0; i < 20; i++) {
-            OrvMediaPlayer other = new OrvMediaPlayer();
+            ExecutorService executor = Executors.newSingleThreadExecutor();
+            OrvMediaPlayer other = new OrvMediaPlayer(executor);
             AtomicBoolean released = new AtomicBoolean();
             AtomicInteger late = new AtomicInteger();
             other.addListener(new Recorder() {
@@ -163,6 +164,8 @@ class ListenerTest extends PlayerFixture {
             other.seekTo(2000);
             other.release();
             released.set(true);
+            executor.submit(() -> null).get();
+            executor.shutdown();
             assertEquals(0, late.get());
         }
     }
@@ -220,6 +223,23 @@ class ListenerTest extends PlayerFixture {
         prepare("silent.mkv");
         second.await("prepared");
         assertEquals(List.of(), recorder.told);
+    }
+
+    @Test
+    void aListenerThatAnEarlierOneTakesOffIsNotToldOfTheSame() throws Exception {
+        Recorder second = new Recorder();
+        Recorder third = new Recorder();
+        player.addListener(new PlayerListener() {
+            @Override
+            public void onPrepared(OrvMediaPlayer told) {
+                told.removeListener(second);
+            }
+        });
+        player.addListener(second);
+        player.addListener(third);
+        prepare("silent.mkv");
+        third.await("prepared");
+        assertEquals(0, second.count("prepared"));
     }
 
     @Test

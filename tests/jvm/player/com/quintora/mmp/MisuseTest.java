@@ -13,9 +13,13 @@ import java.io.FileDescriptor;
 import java.lang.reflect.InvocationTargetException;
 import java.lang.reflect.Method;
 import java.lang.reflect.Modifier;
+import java.util.ArrayList;
 import java.util.Arrays;
+import java.util.List;
 import java.util.Map;
 import java.util.Set;
+import java.util.concurrent.CountDownLatch;
+import java.util.concurrent.ExecutionException;
 import java.util.concurrent.ExecutorService;
 import java.util.concurrent.Executors;
 import java.util.concurrent.Future;
@@ -26,6 +30,8 @@ import org.junit.jupiter.api.Tag;
 import org.junit.jupiter.api.Test;
 import org.junit.jupiter.api.TestFactory;
 import org.junit.jupiter.api.function.Executable;
+import org.junit.jupiter.params.ParameterizedTest;
+import org.junit.jupiter.params.provider.CsvSource;
 
 /** Calls in the wrong state, after release, twice, and from several threads. */
 class MisuseTest extends PlayerFixture {
@@ -93,8 +99,10 @@ class MisuseTest extends PlayerFixture {
                                 () -> assertRefusedAfterRelease(object, method))));
     }
 
-    @Test
-    void releaseEndsAPrepareThatBlocks() throws Exception {
+    @ParameterizedTest
+    @CsvSource({"true, RELEASED", "false, IDLE"})
+    void releaseAndResetEndAPrepareThatBlocks(boolean release, PlayerState state)
+            throws Exception {
         ScriptedSource source = new ScriptedSource(new byte[10_000]);
         source.misreading(0, source::block);
         player.setDataSource(source);
@@ -104,18 +112,22 @@ class MisuseTest extends PlayerFixture {
             return null;
         });
         Wait.until("the engine reads", () -> source.reads.get() > 0);
-        player.release();
-        Exception thrown = assertThrows(Exception.class,
-                () -> preparing.get(Wait.LIMIT.toSeconds(), TimeUnit.SECONDS));
-        assertTrue(thrown.getCause() instanceof MediaException
-                || thrown.getCause() instanceof IllegalStateException, thrown.toString());
-        assertEquals(PlayerState.RELEASED, player.getState());
+        if (release) {
+            player.release();
+        } else {
+            player.reset();
+        }
+        Throwable thrown = causeOf(preparing);
+        assertEquals(MediaException.class, thrown.getClass(), thrown.toString());
+        assertEquals("the stream source: reset or released while it was being opened",
+                thrown.getMessage());
+        assertEquals(state, player.getState());
         assertEquals(1, source.closes.get());
         other.shutdown();
     }
 
     @Test
-    void resetEndsAPrepareThatBlocks() throws Exception {
+    void resetEndsAnAsynchronousPrepare() throws Exception {
         ScriptedSource source = new ScriptedSource(new byte[10_000]);
         source.misreading(0, source::block);
         player.setDataSource(source);
@@ -150,15 +162,44 @@ class MisuseTest extends PlayerFixture {
     void releaseDuringCallsOfOtherThreadsEndsThem() throws Exception {
         prepare("video.mp4");
         player.start();
-        ExecutorService callers = Executors.newFixedThreadPool(3);
-        Stream.<Runnable>of(player::getCurrentPosition, () -> player.seekTo(2000),
-                        () -> player.tracks().audio())
-                .forEach(call -> callers.submit(() -> repeat(Integer.MAX_VALUE, call)));
-        Thread.sleep(50);
+        List<Runnable> calls = List.of(player::getCurrentPosition, player::getDuration,
+                player::getVideoWidth, player::isPlaying, player::start,
+                () -> player.seekTo(2000), () -> player.setLooping(true),
+                () -> player.tracks().audio(), () -> player.trickPlay().getSpeed());
+        ExecutorService callers = Executors.newFixedThreadPool(calls.size());
+        CountDownLatch called = new CountDownLatch(calls.size());
+        List<Future<?>> running = new ArrayList<>();
+        for (Runnable call : calls) {
+            running.add(callers.submit(() -> {
+                call.run();
+                called.countDown();
+                repeat(Integer.MAX_VALUE, call);
+            }));
+        }
+        assertTrue(called.await(Wait.LIMIT.toSeconds(), TimeUnit.SECONDS));
         player.release();
+        for (Future<?> one : running) {
+            Throwable thrown = causeOf(one);
+            assertEquals(IllegalStateException.class, thrown.getClass(), thrown.toString());
+            assertTrue(thrown.getMessage() != null
+                    && thrown.getMessage().endsWith(" was called after the player was released"),
+                    thrown.toString());
+        }
         callers.shutdown();
-        assertTrue(callers.awaitTermination(
-                Wait.LIMIT.toSeconds(), TimeUnit.SECONDS));
+    }
+
+    @Test
+    void callsThatAReleaseOvertakesHaveASentence() {
+        player.native_release(); // As by another thread, between a call's look and the engine's.
+        assertRefused("the engine refused getVideoWidth()", player::getVideoWidth);
+        assertRefused("the engine refused isLooping()", player::isLooping);
+        assertRefused("the engine refused setLooping()", () -> player.setLooping(true));
+        assertRefused("the engine refused setSurface()", () -> player.setSurface(null));
+    }
+
+    private static Throwable causeOf(Future<?> call) {
+        return assertThrows(ExecutionException.class,
+                () -> call.get(Wait.LIMIT.toSeconds(), TimeUnit.SECONDS)).getCause();
     }
 
     private static void repeat(int times, Runnable call) {

@@ -103,6 +103,52 @@ class PlaybackTest extends PlayerFixture {
     }
 
     @Test
+    void anEndThatNobodySawIsToldBeforeTheSeekThatLeavesIt() throws Exception {
+        playToAnUnseenEnd();
+        player.seekTo(0);
+        assertEquals(PlayerState.PAUSED, player.getState());
+        goOnWatching();
+        recorder.await("seek");
+        assertTrue(recorder.told.indexOf("completion") < recorder.told.indexOf("seek"));
+        assertEquals(1, recorder.count("completion"));
+        player.start();
+        awaitMoving();
+    }
+
+    @Test
+    void anEndThatNobodySawIsNotPaused() throws Exception {
+        playToAnUnseenEnd();
+        player.pause();
+        assertEquals(PlayerState.COMPLETED, player.getState());
+        goOnWatching();
+        recorder.await("completion");
+    }
+
+    @Test
+    void aSeekOfAPlayingPlayerLeavesItPlaying() throws Exception {
+        prepare("video.mp4");
+        player.start();
+        player.native_pause(); // As the engine does when a seek leaves the end.
+        player.seekTo(2000);
+        awaitMoving();
+        assertTrue(player.isPlaying());
+    }
+
+    /** The engine is at the end; the watcher is kept from seeing it. */
+    private void playToAnUnseenEnd() throws Exception {
+        prepare("silent.mkv");
+        player.start();
+        player.commands.lock();
+        Wait.until("the engine is at the end", player::atEnd);
+        assertEquals(PlayerState.STARTED, player.getState());
+    }
+
+    private void goOnWatching() {
+        player.commands.unlock();
+        player.events().flush();
+    }
+
+    @Test
     void seeksGoToTheKeyFrameBefore() throws Exception {
         prepare("video.mp4");
         player.seekTo(5300);

@@ -31,6 +31,13 @@ final class Screen implements AutoCloseable {
         return last;
     }
 
+    /** Whether no frame has ever been shown. */
+    boolean isBlank() {
+        try (Image image = reader.acquireLatestImage()) {
+            return last == null && image == null;
+        }
+    }
+
     @Override
     public void close() {
         reader.close();

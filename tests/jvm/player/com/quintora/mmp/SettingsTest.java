@@ -65,7 +65,10 @@ class SettingsTest extends PlayerFixture {
             prepare("video.mp4");
             player.start();
             awaitMoving();
-            if (role != PlayerRole.BACKGROUND) {
+            if (role == PlayerRole.BACKGROUND) {
+                awaitMoving();
+                assertTrue(screen.isBlank(), "the background has no picture");
+            } else {
                 screen.await("a picture", frame -> frame.width() == 320);
             }
             player.release();

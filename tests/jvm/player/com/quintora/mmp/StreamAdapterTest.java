@@ -117,6 +117,25 @@ class StreamAdapterTest {
         assertSame(first, adapter.failure(), "the first is remembered");
     }
 
+    @Test
+    void nothingThatADescriptionThrowsGetsThrough() {
+        Error mute = new AssertionError("mute");
+        StreamAdapter described = new StreamAdapter(new ScriptedSource(new byte[10]) {
+            @Override
+            public boolean isSeekable() {
+                throw mute;
+            }
+
+            @Override
+            public int seekType() {
+                throw mute;
+            }
+        });
+        assertEquals(0, described.seekType(), "by bytes");
+        assertSame(mute, described.failure());
+        assertEquals(-1, described.seek(0, 5));
+    }
+
     @ParameterizedTest
     @CsvSource({
         "0, 0, 0", "0, 999, 999", "0, 1000, 1000", "0, -1, -1",
@@ -205,13 +224,16 @@ class StreamAdapterTest {
     }
 
     @Test
-    void aSourceThatCannotTellItsSizeIsRefused() {
+    void aSourceThatCannotDescribeItselfIsRefused() {
         StreamAdapter mute = new StreamAdapter(new ScriptedSource(new byte[0]) {
             @Override
             public long size() {
                 throw new IllegalStateException("mute");
             }
         });
-        assertThrows(IllegalStateException.class, () -> mute.describeTo(player));
+        MediaException e = assertThrows(
+                MediaException.class, () -> mute.describeTo(player));
+        assertEquals("the stream source cannot describe itself:"
+                + " java.lang.IllegalStateException: mute", e.getMessage());
     }
 }

@@ -259,29 +259,6 @@ class StreamSourceTest extends PlayerFixture {
         assertEquals(1, source.closes.get());
     }
 
-    @Test
-    void aStreamMayStallAndGoOn() throws Exception {
-        byte[] file = Files.readAllBytes(Path.of(Media.path("long.mkv")));
-        ScriptedSource source = new ScriptedSource(file) {
-            @Override
-            public boolean mayStall() {
-                return true;
-            }
-        };
-        prepare(source);
-        source.misreading(0, (buffer, length) -> {
-            source.blockedReads.acquireUninterruptibly();
-            source.misreadFrom = Integer.MAX_VALUE;
-            return source.read(buffer, length);
-        });
-        player.start();
-        recorder.await("info " + PlayerListener.INFO_BUFFERING_STARTED + " 0");
-        source.blockedReads.release();
-        recorder.await("info " + PlayerListener.INFO_BUFFERING_ENDED + " 0");
-        awaitMoving();
-        assertEquals(PlayerState.STARTED, player.getState());
-    }
-
     private ScriptedSource source(String media) throws Exception {
         return new ScriptedSource(Files.readAllBytes(Path.of(Media.path(media))));
     }

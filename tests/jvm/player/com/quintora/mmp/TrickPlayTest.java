@@ -62,13 +62,49 @@ class TrickPlayTest extends PlayerFixture {
     void speedsOutOfRangeAreRefused() throws Exception {
         prepare("long.mkv");
         for (double speed : new double[] {33, -33, Double.NaN, Double.POSITIVE_INFINITY}) {
-            assertFalse(player.trickPlay().canPlayAt(speed));
             assertFalse(player.trickPlay().canSeekAt(speed));
+        }
+        for (double speed : new double[] {
+            33, -33, Double.NaN, Double.POSITIVE_INFINITY, 0, 0.2, -0.2
+        }) {
+            assertFalse(player.trickPlay().canPlayAt(speed));
             assertThrows(IllegalArgumentException.class,
                     () -> player.trickPlay().setSpeed(speed));
         }
         assertEquals(1, player.trickPlay().getSpeed());
         assertTrue(player.trickPlay().canSeekAt(1));
+        player.trickPlay().setSpeed(-TrickPlay.MIN_SPEED);
+        assertEquals(-0.25, player.trickPlay().getSpeed());
+    }
+
+    @Test
+    void aStepPastTheEndHaltsThePlayer() throws Exception {
+        prepare("silent.mkv");
+        player.start();
+        IllegalStateException e = assertThrows(
+                IllegalStateException.class, () -> player.trickPlay().step(100_000));
+        assertTrue(e.getMessage().startsWith("the engine refused step()"), e.getMessage());
+        assertEquals(PlayerState.PAUSED, player.getState());
+        player.pause();
+        player.trickPlay().step(-1);
+        player.start();
+        recorder.await("completion");
+        assertThrows(IllegalStateException.class, () -> player.trickPlay().step(1));
+        assertEquals(PlayerState.COMPLETED, player.getState());
+        assertThrows(IllegalStateException.class, () -> player.trickPlay().step(-100_000));
+        assertEquals(PlayerState.PAUSED, player.getState(), "it left the end");
+    }
+
+    @Test
+    void aStepWithoutAPictureChangesNothing() throws Exception {
+        prepare("tone.mp3");
+        assertThrows(IllegalStateException.class, () -> player.trickPlay().step(1));
+        assertEquals(PlayerState.PREPARED, player.getState());
+        player.start();
+        awaitMoving();
+        assertThrows(IllegalStateException.class, () -> player.trickPlay().step(1));
+        assertEquals(PlayerState.STARTED, player.getState());
+        awaitMoving();
     }
 
     @Test

@@ -130,21 +130,42 @@ class ValueClassesTest {
     void badPcmDescriptionsAreNamed() {
         assertAll(
                 () -> assertBadPcm("audioPcmInfo is null", info -> info.audioPcmInfo = null),
-                () -> assertBadPcm("mediaType is 0", info -> info.mediaType = 0),
-                () -> assertBadPcm("audioCodec is 2", info -> info.audioCodec = 2),
-                () -> assertBadPcm("totalDuration is -1", info -> info.totalDuration = -1),
-                () -> assertBadPcm("size is -1", info -> info.size = -1),
-                () -> assertBadPcm("pcm_type is 5", info -> info.audioPcmInfo.pcm_type = 5),
-                () -> assertBadPcm("channelNumber is 0",
+                () -> assertBadPcm("the media type 0; only 1, audio, is possible",
+                        info -> info.mediaType = 0),
+                () -> assertBadPcm("the codec 2; only 1, PCM, is possible",
+                        info -> info.audioCodec = 2),
+                () -> assertBadPcm("a duration of -1 ms; 0, for unknown, or more is possible",
+                        info -> info.totalDuration = -1),
+                () -> assertBadPcm(
+                        "a size of -1 bytes; 0, for unknown, to 2147483647 are possible",
+                        info -> info.size = -1),
+                () -> assertBadPcm(
+                        "a size of 2147483648 bytes; 0, for unknown, to 2147483647 are possible",
+                        info -> info.withLength(0, 1L << 31)));
+        PcmMediaInfo.of(48_000, 2, 16).withLength(0, Integer.MAX_VALUE).check();
+    }
+
+    @Test
+    void badSamplesAreNamed() {
+        assertAll(
+                () -> assertBadPcm("samples of type 5; 0 to 4 are possible",
+                        info -> info.audioPcmInfo.pcm_type = 5),
+                () -> assertBadPcm("0 channels; 1 to 8 are possible",
                         info -> info.audioPcmInfo.channelNumber = 0),
-                () -> assertBadPcm("channelNumber is 9",
+                () -> assertBadPcm("9 channels; 1 to 8 are possible",
                         info -> info.audioPcmInfo.channelNumber = 9),
-                () -> assertBadPcm("sampleRate is 999", info -> info.audioPcmInfo.sampleRate = 999),
-                () -> assertBadPcm("12 bits do not go with pcm_type 0",
+                () -> assertBadPcm("999 samples per second; 1000 to 384000 are possible",
+                        info -> info.audioPcmInfo.sampleRate = 999),
+                () -> assertBadPcm("12 bits; signed samples have 8, 16, 24 or 32",
                         info -> info.audioPcmInfo.bitsPerSample = 12),
-                () -> assertBadPcm("16 bits do not go with pcm_type 2",
+                () -> assertBadPcm("16 bits; unsigned samples have 8",
+                        info -> info.audioPcmInfo.pcm_type = 1),
+                () -> assertBadPcm("16 bits; floating-point samples have 32",
                         info -> info.audioPcmInfo.pcm_type = 2),
-                () -> assertBadPcm("blockAlign is 3", info -> info.audioPcmInfo.blockAlign = 3));
+                () -> assertBadPcm("16 bits; A-law and mu-law samples have 8",
+                        info -> info.audioPcmInfo.pcm_type = 4),
+                () -> assertBadPcm("a block of 3 bytes; one sample of all channels has 4",
+                        info -> info.audioPcmInfo.blockAlign = 3));
     }
 
     @Test
