@@ -17,7 +17,7 @@ TarnPlayer::Engine::Engine(int decoder, orvtarn::Notifier::Deliver deliver)
       seeker(mpv, state, notifier, events),
       transport(mpv, state, events),
       speed(mpv, state, seeker, transport),
-      stepper(mpv, state, seeker, transport),
+      stepper(mpv, state, seeker, transport, events),
       abRepeat(mpv, state),
       audio(mpv, video),
       tracks(mpv, state, loader, seeker),

@@ -189,16 +189,18 @@ void EventLoop::onRestart() {
     const bool hasSound = mMpv.getInt("aid").value_or(0) > 0;
     const double duration = durationOf(mMpv.getDouble("duration").value_or(0));
     const bool seekable = mMpv.getFlag("seekable").value_or(false);
-    const bool empty = mState.update([&](PlayerState::Values& v) {
+    const bool opened = mState.update([&](PlayerState::Values& v) {
         v.restarts++;
         if (v.phase != Phase::Preparing) return false;
         v.restarted = true;
         v.hasVideo = hasVideo;
         v.duration = std::max(duration, v.duration);
         v.seekable = seekable;
-        return !hasVideo && !hasSound;
+        return true;
     });
-    if (empty) return failWith(ORV_ERROR_MALFORMED);
+    if (!opened) return;
+    if (!hasVideo && !hasSound) return failWith(ORV_ERROR_MALFORMED);
+    applyLooping();
     becomePreparedIfReady();
 }
 
@@ -236,14 +238,21 @@ void EventLoop::onProperty(const mpv_event_property& property) {
             case kEndReached:
                 return flagOf(property) ? onEndReached() : void();
             case kSeekable:
-                return mState.update(
-                    [&](PlayerState::Values& v) { v.seekable = flagOf(property); });
+                mState.update([&](PlayerState::Values& v) { v.seekable = flagOf(property); });
+                return applyLooping();
             case kBuffering:
                 return onBuffering(flagOf(property));
             case kBufferedUntil:
                 return onBuffered(numberOf(property));
         }
     }
+}
+
+// At the end of media that cannot seek, the core would try without a pause.
+void EventLoop::applyLooping() {
+    const bool loops =
+        mState.read([](const PlayerState::Values& v) { return v.looping && v.seekable; });
+    mMpv.set("loop-file", loops ? "inf" : "no");
 }
 
 void EventLoop::onTime(double seconds) {

@@ -41,6 +41,8 @@ public:
     void setOpenedHandler(std::function<void()> handler) { mOpenedHandler = std::move(handler); }
     // A new picture was drawn, or had no surface to go to.
     void onFrame();
+    // Brings the core in line with the state's looping. Any thread.
+    void applyLooping();
     // The media time of a frame that was just drawn, microseconds. While nothing
     // plays, only the core knows it: then it is asked on the loop's thread, and the
     // video output told. Does not wait.

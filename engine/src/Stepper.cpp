@@ -18,11 +18,14 @@ bool Stepper::step(int amount) {
     if (mState.requireOpen("step") != android::NO_ERROR) return false;
     if (mMpv.getInt("vid").value_or(0) <= 0) return refused("step", "no picture");
     mTransport.becomePaused();
+    // The last frame is the last of a loop, too.
+    mMpv.set("loop-file", "no");
     const bool towardsEnd = amount > 0;
     bool found = true;
     for (; found && amount != 0; amount += towardsEnd ? -1 : 1) {
         found = towardsEnd ? forward() : back();
     }
+    mEvents.applyLooping();
     const double now = mMpv.getDouble("time-pos").value_or(0);
     mState.update([now](PlayerState::Values& v) { v.position = now; });
     return found || refused("step", "no such frame");

@@ -1,6 +1,7 @@
 // SPDX-License-Identifier: Apache-2.0
 #pragma once
 
+#include "EventLoop.h"
 #include "MpvHandle.h"
 #include "PlayerState.h"
 #include "Seeker.h"
@@ -12,8 +13,9 @@ namespace orvtarn {
 // by it.
 class Stepper {
 public:
-    Stepper(MpvHandle& mpv, PlayerState& state, Seeker& seeker, Transport& transport)
-        : mMpv(mpv), mState(state), mSeeker(seeker), mTransport(transport) {}
+    Stepper(MpvHandle& mpv, PlayerState& state, Seeker& seeker, Transport& transport,
+            EventLoop& events)
+        : mMpv(mpv), mState(state), mSeeker(seeker), mTransport(transport), mEvents(events) {}
 
     // Blocks until the last of the frames is shown. False when one of them is
     // not there.
@@ -27,6 +29,7 @@ private:
     PlayerState& mState;
     Seeker& mSeeker;
     Transport& mTransport;
+    EventLoop& mEvents;
 };
 
 }  // namespace orvtarn

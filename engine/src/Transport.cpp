@@ -129,7 +129,7 @@ status_t Transport::setLooping(bool looping) {
     const Phase phase = mState.phase();
     if (phase == Phase::Error) return PlayerState::wrongPhase("setLooping", phase);
     mState.update([looping](PlayerState::Values& v) { v.looping = looping; });
-    mMpv.set("loop-file", looping ? "inf" : "no");
+    mEvents.applyLooping();
     return android::NO_ERROR;
 }
 

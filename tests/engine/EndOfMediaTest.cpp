@@ -55,6 +55,7 @@ TEST_F(EndOfMediaTest, StartOnTheLastFrameOfALoopGoesRound) {
     ASSERT_EQ(NO_ERROR, player->setLooping(1));
     ASSERT_EQ(NO_ERROR, player->seekTo(1900, Mode::SEEK_CLOSEST));
     ASSERT_FALSE(player->step(1000));
+    ASSERT_NEAR(1967, position(), 1);
     ASSERT_EQ(NO_ERROR, player->start());
     EXPECT_TRUE(eventually([&] { return position() < 1000; }));
     EXPECT_TRUE(player->isPlaying());

@@ -7,6 +7,7 @@
 #include <thread>
 
 #include "FakeStream.h"
+#include "LogCapture.h"
 #include "PlayerTest.h"
 
 using namespace android;
@@ -74,7 +75,10 @@ TEST_F(StreamSourceTest, WhatCannotSeekDoesNotLoop) {
         ASSERT_EQ(NO_ERROR, player->setLooping(1));
         ASSERT_EQ(NO_ERROR, prepareStream());
         ASSERT_EQ(NO_ERROR, player->start());
+        LogCapture log;
         ASSERT_TRUE(events->waitFor(MEDIA_PLAYBACK_COMPLETE, before + 1));
+        EXPECT_TRUE(remains([&] { return log.lines("TarnPlayer").empty(); }))
+            << "the core tries in vain";
         EXPECT_EQ(INVALID_OPERATION, player->start());
     }
 }

@@ -19,11 +19,10 @@ class IOrvStreamSource;
 namespace android {
 
 // One playback engine. Any thread may call any operation at any time, but for
-// two that the player itself waits for: a source must not reset or release the
-// player from inside its read or seek, and a surface must not set the player's
-// surface from inside its dequeueBuffer, queueBuffer or cancelBuffer. None calls
-// the listener on the caller's thread. Statuses are 0 or a negative error, bools
-// are true for success.
+// those that the player waits for: a source must not stop, reset or release the
+// player from inside its own operations, and a surface must not call the player
+// at all from inside its own. None calls the listener on the caller's thread.
+// Statuses are 0 or a negative error, bools are true for success.
 //
 // A player is idle, initialized (setDataSource), preparing, prepared, started,
 // paused, stopped, completed, in error or released. An operation that its state
