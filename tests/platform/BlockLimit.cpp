@@ -8,9 +8,13 @@
 
 #include <new>
 
-void* operator new(size_t bytes) {
+void* operator new(size_t bytes, const std::nothrow_t&) noexcept {
     constexpr size_t kLimit = size_t{1} << 30;
-    void* const memory = bytes < kLimit ? malloc(bytes != 0 ? bytes : 1) : nullptr;
+    return bytes < kLimit ? malloc(bytes != 0 ? bytes : 1) : nullptr;
+}
+
+void* operator new(size_t bytes) {
+    void* const memory = operator new(bytes, std::nothrow);
     if (memory == nullptr) throw std::bad_alloc();
     return memory;
 }

@@ -87,7 +87,7 @@ jbyte* getByteArrayElements(JNIEnv* env, jbyteArray handle, jboolean* isCopy) {
     auto* block = static_cast<uint8_t*>(malloc(size + 2 * kGuard));
     memset(block, kGuardByte, size + 2 * kGuard);
     std::copy(array->bytes.begin(), array->bytes.end(), block + kGuard);
-    entry.vm.pin(block + kGuard, entry.function(), array);
+    entry.vm.pin(block + kGuard, block, entry.function(), array);
     if (isCopy != nullptr) *isCopy = JNI_TRUE;
     return reinterpret_cast<jbyte*>(block + kGuard);
 }

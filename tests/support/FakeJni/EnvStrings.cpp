@@ -53,7 +53,7 @@ const Unit* handOut(Entry& entry, const ObjectPtr& string, const Unit* units, si
     Unit* copy = static_cast<Unit*>(malloc((count + 1) * sizeof(Unit)));
     memcpy(copy, units, count * sizeof(Unit));
     copy[count] = 0;
-    entry.vm.pin(copy, entry.function(), string);
+    entry.vm.pin(copy, copy, entry.function(), string);
     if (isCopy != nullptr) *isCopy = JNI_TRUE;
     return copy;
 }

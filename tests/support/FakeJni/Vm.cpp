@@ -38,7 +38,9 @@ Vm::Vm() : mMachine(new Machine) {
     attach(&env, true);
 }
 
-Vm::~Vm() = default;
+Vm::~Vm() {
+    for (const auto& [buffer, pin] : mPins) free(pin.block);
+}
 
 JavaVM* Vm::javaVm() { return &mMachine->vm; }
 

@@ -145,7 +145,9 @@ public:
     // Field and method IDs: only those that a lookup of this machine gave are good.
     void handOut(const void* id);
     bool isHandedOut(const void* id) const;
-    void pin(const void* buffer, const std::string& function, ObjectPtr owner);
+    // The buffer lies in a block from malloc; the machine's end frees those that
+    // unreleased() still names.
+    void pin(const void* buffer, void* block, const std::string& function, ObjectPtr owner);
     // Null, and a violation, for a buffer that was not given or was given back.
     ObjectPtr unpin(const void* buffer, const std::string& function, bool keep = false);
     jint attach(JNIEnv** env, bool asJava);
@@ -154,6 +156,7 @@ public:
 private:
     struct Machine;
     struct Pin {
+        void* block;
         std::string function;
         ObjectPtr owner;
     };

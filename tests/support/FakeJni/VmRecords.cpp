@@ -127,8 +127,8 @@ void Vm::handOut(const void* id) { mIds.insert(id); }
 
 bool Vm::isHandedOut(const void* id) const { return mIds.count(id) != 0; }
 
-void Vm::pin(const void* buffer, const std::string& function, ObjectPtr owner) {
-    mPins[buffer] = {function, std::move(owner)};
+void Vm::pin(const void* buffer, void* block, const std::string& function, ObjectPtr owner) {
+    mPins[buffer] = {block, function, std::move(owner)};
 }
 
 ObjectPtr Vm::unpin(const void* buffer, const std::string& function, bool keep) {
