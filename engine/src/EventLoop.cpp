@@ -104,11 +104,16 @@ std::optional<int64_t> EventLoop::frameTime(uint64_t frame) {
     return {};
 }
 
+// Until a seek or the load is done, the core's time may be the one that it left
+// or the one that was asked for.
 void EventLoop::tellFrameTime() {
-    const uint64_t frame = mUntimedFrame.exchange(0);
+    uint64_t frame = mUntimedFrame;
     if (frame == 0) return;
-    const double last = mState.read([](const PlayerState::Values& v) { return v.position; });
-    mVideo.setFrameTime(frame, toMicroseconds(mMpv.getDouble("time-pos").value_or(last)));
+    const PlayerState::Values now = mState.read([](const PlayerState::Values& v) { return v; });
+    if (now.seeking || (now.phase == Phase::Preparing && !now.restarted)) return;
+    const double time = mMpv.getDouble("time-pos").value_or(now.position);
+    mVideo.setFrameTime(frame, toMicroseconds(time));
+    mUntimedFrame.compare_exchange_strong(frame, 0);  // unless the next one is here
 }
 
 void EventLoop::lookForEnd() {
