@@ -83,7 +83,7 @@ std::shared_ptr<Thumbnailer> MediaDetails::thumbnailer(int streamIndex) {
     std::unique_ptr<Thumbnailer> created;
     Thumbnailer::create(std::move(opened), streamIndex, created);
     if (created == nullptr) mUndrawable = streamIndex;
-    const std::shared_ptr<Thumbnailer> shared = std::move(created);
+    std::shared_ptr<Thumbnailer> shared = std::move(created);
     if (!keep(mThumbnailer, shared)) return nullptr;
     mThumbnailerStream = streamIndex;
     return shared;

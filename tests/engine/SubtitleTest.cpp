@@ -64,8 +64,8 @@ protected:
     };
     static Pair pairApart(const std::string& name) {
         const std::string test = testing::UnitTest::GetInstance()->current_test_info()->name();
-        const Pair pair = {mediaPath(test + name + " pictures.sub"),
-                           mediaPath(test + name + "-apart.idx")};
+        Pair pair = {mediaPath(test + name + " pictures.sub"),
+                     mediaPath(test + name + "-apart.idx")};
         outputOf("cp '" + mediaPath(name + ".sub") + "' '" + pair.pictures + "'");
         outputOf("cp '" + mediaPath(name + ".idx") + "' '" + pair.index + "'");
         return pair;
