@@ -37,7 +37,7 @@ expect() {
 # part FUNCTION…: calls a function of tools/shell as the commands do.
 # shellcheck disable=SC2016
 part() {
-    bash -c 'set -euo pipefail; ORV_ROOT=$1; . "$1/tools/shell/common.sh"; use packages build
+    "$BASH" -c 'set -euo pipefail; ORV_ROOT=$1; . "$1/tools/shell/common.sh"; use packages build
         shift; "$@"' part "$root" "$@"
 }
 
@@ -65,6 +65,26 @@ rm "$folder/asked"
 expect "nothing missing" 0 "" part need_packages try play
 ORV_NO_INSTALL=1 expect "no installation wanted" 0 "" part need_packages try armhf
 check "asks for nothing" no "$([ -e "$folder/asked" ] && echo yes || echo no)"
+
+# without NAME COMMAND…: where that program is not installed.
+without() {
+    local program others=$folder/without
+    rm -rf -- "$others" && mkdir "$others"
+    for program in awk dpkg-query find id paste sed apt-get; do
+        [ "$program" = "$1" ] || ln -s "$(command -v "$program")" "$others/$program"
+    done
+    shift
+    PATH=$others "$@"
+}
+expect "no apt-get" 1 "names in your system's way, then set ORV_NO_INSTALL=1: tools/packages-play.txt" \
+    without apt-get part need_packages try play test
+stand_in id <<<'echo 1000'
+expect "no sudo" 1 "there is no sudo here. As root: apt-get install --no-install-recommends mmdebstrap" \
+    without sudo part need_packages try armhf
+stand_in sudo <<<'exit 1'
+expect "no password" 1 "sudo did not give root, so nothing was installed" part need_packages try armhf
+check "asks for nothing before" no "$([ -e "$folder/asked" ] && echo yes || echo no)"
+stand_in id <<<'echo 0'
 touch "$folder/fails"
 expect "apt-get fails" 1 "could not be installed" part need_packages try armhf
 

@@ -28,7 +28,7 @@ need_packages() {
     [ -z "${ORV_NO_INSTALL:-}" ] || return 0
     command -v apt-get >/dev/null || die \
         "this system has no apt-get. Install what these name in your system's way," \
-        "then set ORV_NO_INSTALL=1: $(printf ' tools/packages-%s.txt' "$@")"
+        "then set ORV_NO_INSTALL=1:$(printf ' tools/packages-%s.txt' "$@")"
     missing=$(missing_packages "$@")
     [ -n "$missing" ] || return 0
     mapfile -t names < <(awk '{print $1}' <<<"$missing")
