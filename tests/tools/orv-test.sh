@@ -76,7 +76,7 @@ without() {
     shift
     PATH=$others "$@"
 }
-expect "no apt-get" 1 "names in your system's way, then set ORV_NO_INSTALL=1: tools/packages-play.txt" \
+expect "no apt-get" 1 "name in your system's way, then set ORV_NO_INSTALL=1: tools/packages-play.txt" \
     without apt-get part need_packages try play test
 stand_in id <<<'echo 1000'
 expect "no sudo" 1 "there is no sudo here. As root: apt-get install --no-install-recommends mmdebstrap" \
