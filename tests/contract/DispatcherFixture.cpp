@@ -7,15 +7,8 @@
 
 namespace orvtest {
 
-struct DispatcherMutex {
-    friend auto memberOf(DispatcherMutex);
-};
-template struct PrivateMember<DispatcherMutex, &ORV::SyncToAsync::m_mutex>;
-
-struct DispatcherActions {
-    friend auto memberOf(DispatcherActions);
-};
-template struct PrivateMember<DispatcherActions, &ORV::SyncToAsync::m_actions>;
+ORV_OPEN_MEMBER(DispatcherMutex, ORV::SyncToAsync, m_mutex);
+ORV_OPEN_MEMBER(DispatcherActions, ORV::SyncToAsync, m_actions);
 
 DispatcherFixture::DispatcherFixture()
     : dispatcher(ORV::SyncToAsync::getInstance()),

@@ -8,15 +8,8 @@
 
 namespace orvtest {
 
-struct CallMutex {
-    friend auto memberOf(CallMutex);
-};
-template struct PrivateMember<CallMutex, &JavaInputStream::mCallMutex>;
-
-struct StreamMutex {
-    friend auto memberOf(StreamMutex);
-};
-template struct PrivateMember<StreamMutex, &JavaInputStream::mStreamMutex>;
+ORV_OPEN_MEMBER(CallMutex, JavaInputStream, mCallMutex);
+ORV_OPEN_MEMBER(StreamMutex, JavaInputStream, mStreamMutex);
 
 namespace {
 

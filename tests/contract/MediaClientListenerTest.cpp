@@ -10,15 +10,8 @@
 
 namespace orvtest {
 
-struct ListenedActions {
-    friend auto memberOf(ListenedActions);
-};
-template struct PrivateMember<ListenedActions, &ORV::SyncToAsync::m_actions>;
-
-struct ListenedMutex {
-    friend auto memberOf(ListenedMutex);
-};
-template struct PrivateMember<ListenedMutex, &ORV::SyncToAsync::m_mutex>;
+ORV_OPEN_MEMBER(ListenedActions, ORV::SyncToAsync, m_actions);
+ORV_OPEN_MEMBER(ListenedMutex, ORV::SyncToAsync, m_mutex);
 
 namespace {
 

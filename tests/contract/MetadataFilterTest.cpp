@@ -12,20 +12,9 @@ namespace orvtest {
 
 using android::OrvMediaService;
 
-struct AllowSet {
-    friend auto memberOf(AllowSet);
-};
-template struct PrivateMember<AllowSet, &OrvMediaService::mMetadataAllow>;
-
-struct DropSet {
-    friend auto memberOf(DropSet);
-};
-template struct PrivateMember<DropSet, &OrvMediaService::mMetadataDrop>;
-
-struct MetadataLock {
-    friend auto memberOf(MetadataLock);
-};
-template struct PrivateMember<MetadataLock, &OrvMediaService::mMetadataLock>;
+ORV_OPEN_MEMBER(AllowSet, OrvMediaService, mMetadataAllow);
+ORV_OPEN_MEMBER(DropSet, OrvMediaService, mMetadataDrop);
+ORV_OPEN_MEMBER(MetadataLock, OrvMediaService, mMetadataLock);
 
 namespace {
 

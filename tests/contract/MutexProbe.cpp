@@ -7,10 +7,7 @@
 
 namespace orvtest {
 
-struct NativeMutex {
-    friend auto memberOf(NativeMutex);
-};
-template struct PrivateMember<NativeMutex, &os::Mutex::mMutex>;
+ORV_OPEN_MEMBER(NativeMutex, os::Mutex, mMutex);
 
 int tryFromAnotherThread(os::Mutex& mutex) {
     int result = -1;

@@ -21,11 +21,7 @@
 namespace orvtest {
 
 // Opens Class::member to this file under the name tag.
-#define OPEN(tag, Class, member)           \
-    struct Layout##tag {                   \
-        friend auto memberOf(Layout##tag); \
-    };                                     \
-    template struct PrivateMember<Layout##tag, &Class::member>
+#define OPEN(tag, Class, member) ORV_OPEN_MEMBER(Layout##tag, Class, member)
 
 using android::OrvMediaService;
 using ActionQueue = os::MessageQueue<ORV::SyncToAsyncAction*>;

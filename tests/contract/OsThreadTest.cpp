@@ -16,10 +16,7 @@
 
 namespace orvtest {
 
-struct EndSignal {
-    friend auto memberOf(EndSignal);
-};
-template struct PrivateMember<EndSignal, &os::Thread::mImplmentation>;
+ORV_OPEN_MEMBER(EndSignal, os::Thread, mImplmentation);
 
 namespace {
 

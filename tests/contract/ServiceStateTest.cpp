@@ -10,30 +10,11 @@ namespace orvtest {
 
 using android::OrvMediaService;
 
-struct StreamType {
-    friend auto memberOf(StreamType);
-};
-template struct PrivateMember<StreamType, &OrvMediaService::mStreamType>;
-
-struct Speed {
-    friend auto memberOf(Speed);
-};
-template struct PrivateMember<Speed, &OrvMediaService::mSpeed>;
-
-struct Loop {
-    friend auto memberOf(Loop);
-};
-template struct PrivateMember<Loop, &OrvMediaService::mLoop>;
-
-struct ServiceFlag {
-    friend auto memberOf(ServiceFlag);
-};
-template struct PrivateMember<ServiceFlag, &OrvMediaService::sServiceFlag>;
-
-struct NotifyCookie {
-    friend auto memberOf(NotifyCookie);
-};
-template struct PrivateMember<NotifyCookie, &OrvMediaService::sNotifyCookie>;
+ORV_OPEN_MEMBER(StreamType, OrvMediaService, mStreamType);
+ORV_OPEN_MEMBER(Speed, OrvMediaService, mSpeed);
+ORV_OPEN_MEMBER(Loop, OrvMediaService, mLoop);
+ORV_OPEN_MEMBER(ServiceFlag, OrvMediaService, sServiceFlag);
+ORV_OPEN_MEMBER(NotifyCookie, OrvMediaService, sNotifyCookie);
 
 namespace {
 

@@ -11,10 +11,7 @@
 
 namespace orvtest {
 
-struct GlobalMutex {
-    friend auto memberOf(GlobalMutex);
-};
-template struct PrivateMember<GlobalMutex, &ORV::SyncToAsync::s_mutexGlobal>;
+ORV_OPEN_MEMBER(GlobalMutex, ORV::SyncToAsync, s_mutexGlobal);
 
 namespace {
 

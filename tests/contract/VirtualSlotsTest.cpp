@@ -20,14 +20,8 @@
 
 namespace orvtest {
 
-struct SlotsQueue {
-    friend auto memberOf(SlotsQueue);
-};
-template struct PrivateMember<SlotsQueue, &ORV::SyncToAsync::m_queue>;
-struct SlotsAttributes {
-    friend auto memberOf(SlotsAttributes);
-};
-template struct PrivateMember<SlotsAttributes, &os::Thread::mAttributes>;
+ORV_OPEN_MEMBER(SlotsQueue, ORV::SyncToAsync, m_queue);
+ORV_OPEN_MEMBER(SlotsAttributes, os::Thread, mAttributes);
 
 namespace {
 

@@ -11,15 +11,8 @@
 
 namespace orvtest {
 
-struct InstalledListener {
-    friend auto memberOf(InstalledListener);
-};
-template struct PrivateMember<InstalledListener, &android::MediaPlayerBase::mListener>;
-
-struct SendEvent {
-    friend auto memberOf(SendEvent);
-};
-template struct PrivateMember<SendEvent, &android::MediaPlayerBase::sendEvent>;
+ORV_OPEN_MEMBER(InstalledListener, android::MediaPlayerBase, mListener);
+ORV_OPEN_MEMBER(SendEvent, android::MediaPlayerBase, sendEvent);
 
 namespace {
 
