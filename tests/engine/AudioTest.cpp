@@ -78,7 +78,9 @@ protected:
         return bytesOf(file);
     }
 
-    const std::string file = mediaPath("heard.pcm");
+    // Tests run side by side.
+    const std::string file = mediaPath(
+        std::string(testing::UnitTest::GetInstance()->current_test_info()->name()) + ".pcm");
     MpvHandle mpv;
     VideoOutput video{[] {}, [](uint64_t) { return int64_t{0}; }};
     Audio audio{mpv, video};
