@@ -14,36 +14,44 @@ namespace {
 
 class SpeedTest : public PlayerTest {
 protected:
-    // Media seconds played in a second of the clock, measured from position to
-    // position.
-    double measure(int from, int to) {
-        const bool forward = to > from;
-        const auto passed = [&](int mark) {
-            return forward ? position() >= mark : position() <= mark;
-        };
-        EXPECT_TRUE(eventually([&] { return passed(from); }, 30));
+    // Whether playback comes to about that speed, in media seconds for a second of
+    // the clock. It is measured again and again: a busy machine lets playback wait
+    // and then catch up.
+    bool comesTo(double factor) {
+        return eventually([&] {
+            measured = measure(std::abs(factor) * 1000);
+            return std::abs(measured - factor) < std::abs(factor) * 0.2;
+        });
+    }
+
+    double measured = 0;
+
+private:
+    // From one change of the position to another that far away.
+    double measure(double milliseconds) const {
+        const int shown = position();
+        eventually([&] { return position() != shown; });
         const int begin = position();
         const auto beginTime = std::chrono::steady_clock::now();
-        EXPECT_TRUE(eventually([&] { return passed(to); }, 30));
+        int end = begin;
+        eventually([&] {
+            end = position();
+            return std::abs(end - begin) >= milliseconds;
+        });
         const std::chrono::duration<double> taken = std::chrono::steady_clock::now() - beginTime;
-        return (position() - begin) / 1000.0 / taken.count();
+        return (end - begin) / 1000.0 / taken.count();
     }
 };
 
 class ForwardSpeedTest : public SpeedTest, public testing::WithParamInterface<int> {};
 
 TEST_P(ForwardSpeedTest, PlaysAtThatSpeed) {
-    const double factor = GetParam() / 1000.0;
-    open("long.mkv");
+    open("light.mkv");
     ASSERT_EQ(NO_ERROR, player->setSpeed(GetParam()));
     EXPECT_EQ(GetParam(), speed());
     EXPECT_FALSE(player->isPlaying()) << "a speed does not start";
     ASSERT_EQ(NO_ERROR, player->start());
-    const int from = std::min(2000, static_cast<int>(factor * 500));
-    const double measured = measure(from, std::min(50000, from + static_cast<int>(factor * 1500)));
-    EXPECT_LT(measured, factor * 1.25);
-    // A machine with other work does not decode a thousand frames a second.
-    EXPECT_GT(measured, factor * (factor > 16 ? 0.4 : 0.75));
+    EXPECT_TRUE(comesTo(GetParam() / 1000.0)) << measured;
 }
 
 INSTANTIATE_TEST_SUITE_P(Speeds, ForwardSpeedTest,
@@ -52,16 +60,13 @@ INSTANTIATE_TEST_SUITE_P(Speeds, ForwardSpeedTest,
 class BackwardSpeedTest : public SpeedTest, public testing::WithParamInterface<int> {};
 
 TEST_P(BackwardSpeedTest, PlaysBackAtThatSpeed) {
-    const double factor = GetParam() / 1000.0;
-    open("long.mkv");
-    ASSERT_EQ(NO_ERROR, player->seekTo(55000, 0));
+    open("light.mkv");
+    ASSERT_EQ(NO_ERROR, player->seekTo(295000, 0));
     ASSERT_EQ(NO_ERROR, player->setSpeed(GetParam()));
     EXPECT_EQ(GetParam(), speed());
     ASSERT_EQ(NO_ERROR, player->start());
     EXPECT_TRUE(player->isPlaying());
-    const int from = 53500;
-    const double measured = measure(from, std::max(3000, from + static_cast<int>(factor * 2000)));
-    EXPECT_NEAR(factor, measured, -factor * 0.3);
+    EXPECT_TRUE(comesTo(GetParam() / 1000.0)) << measured;
 }
 
 INSTANTIATE_TEST_SUITE_P(Speeds, BackwardSpeedTest,

@@ -12,7 +12,7 @@ FILES="video.mp4 video.mkv video.ts video.avi slides.mkv rotated.mp4 hd.mp4 hd70
        alpha.mov still.png silent.mkv tracks.mkv tracks.mp4 tagged.mp3 tagged.ogg broken-tags.mp4
        front.jpg back.png covered.mp3 covered.flac covered.m4a covered.mkv noise.bin
        cut.mp4 cut.mkv
-       feature.mkv short.mp4 short.ts long.mkv distant.mkv silent.mp4 plain.mkv plain.mp4 pictures.mkv
+       feature.mkv short.mp4 short.ts long.mkv light.mkv distant.mkv silent.mp4 plain.mkv plain.mp4 pictures.mkv
        lines.srt latin1.srt lines.ass words.idx words.sub languages.idx languages.sub tone.mp3
        tone.flac tone-s16le.pcm tone-s16be.pcm subtitles-only.mkv garbage.bin empty.bin unseen.mkv dead.mkv first-of-two.m3u
        first-missing.m3u nothing.m3u locale"
@@ -212,11 +212,20 @@ playing_short() {
 make_short_mp4() { playing_short -movflags +faststart "$1"; }
 make_short_ts() { playing_short "$1"; }
 
-# A minute for fast play, forward and back; key frames every second.
+# A minute, key frames every second.
 make_long_mkv() {
     # shellcheck disable=SC2046
     quiet_ffmpeg -f lavfi -i "$(playing 320x180 60)" -f lavfi -i "$(tone 440 60)" \
         $(fast_h264) -g 30 -c:a flac -ac 2 "$1"
+}
+
+# Five minutes of few and small frames and few samples: 32 times the speed is no
+# work even for an emulator on a busy machine.
+make_light_mkv() {
+    # shellcheck disable=SC2046
+    quiet_ffmpeg -f lavfi -i "testsrc2=size=64x36:rate=5:duration=300" \
+        -f lavfi -i "sine=440:duration=300:sample_rate=8000" \
+        $(fast_h264) -g 5 -c:a flac -ac 1 "$1"
 }
 
 # Half a minute with a key frame every 15 seconds.
