@@ -17,7 +17,6 @@ import java.util.concurrent.TimeUnit;
 import java.util.concurrent.atomic.AtomicBoolean;
 import java.util.concurrent.atomic.AtomicInteger;
 import java.util.concurrent.atomic.AtomicReference;
-import org.junit.jupiter.api.Tag;
 import org.junit.jupiter.api.Test;
 
 /** What listeners are told, in which order, on which thread, and when no more. */
@@ -133,7 +132,6 @@ class ListenerTest extends PlayerFixture {
         assertEquals(0, second.count("completion"), "told after a release that another did");
     }
 
-    @Tag("slow-on-emulator")
     @Test
     void nothingIsToldAfterRelease() throws Exception {
         for (int i = 0; i < 20; i++) {

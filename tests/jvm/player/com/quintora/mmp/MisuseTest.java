@@ -26,7 +26,6 @@ import java.util.concurrent.Future;
 import java.util.concurrent.TimeUnit;
 import java.util.stream.Stream;
 import org.junit.jupiter.api.DynamicTest;
-import org.junit.jupiter.api.Tag;
 import org.junit.jupiter.api.Test;
 import org.junit.jupiter.api.TestFactory;
 import org.junit.jupiter.api.function.Executable;
@@ -139,7 +138,6 @@ class MisuseTest extends PlayerFixture {
         assertEquals(0, recorder.count("error"));
     }
 
-    @Tag("slow-on-emulator")
     @Test
     void threadsThatCallAtTheSameTimeDoNotDisturbEachOther() throws Exception {
         prepare("video.mp4");

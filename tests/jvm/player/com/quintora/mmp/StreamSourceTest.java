@@ -13,7 +13,6 @@ import java.nio.file.Path;
 import java.security.MessageDigest;
 import java.util.EnumSet;
 import java.util.Set;
-import org.junit.jupiter.api.Tag;
 import org.junit.jupiter.api.Test;
 import org.junit.jupiter.params.ParameterizedTest;
 import org.junit.jupiter.params.provider.CsvSource;
@@ -35,7 +34,6 @@ class StreamSourceTest extends PlayerFixture {
         assertEquals(1, source.closes.get());
     }
 
-    @Tag("slow-on-emulator")
     @Test
     void theEngineReadsWhatTheFileHolds() throws Exception {
         byte[] file = Files.readAllBytes(Path.of(Media.path("short.ts")));
@@ -70,7 +68,6 @@ class StreamSourceTest extends PlayerFixture {
         awaitMoving();
     }
 
-    @Tag("slow-on-emulator")
     @Test
     void singleBytesPlayToo() throws Exception {
         byte[] file = Files.readAllBytes(Path.of(Media.path("tone.mp3")));

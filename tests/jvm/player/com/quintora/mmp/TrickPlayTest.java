@@ -6,7 +6,6 @@ import static org.junit.jupiter.api.Assertions.assertFalse;
 import static org.junit.jupiter.api.Assertions.assertThrows;
 import static org.junit.jupiter.api.Assertions.assertTrue;
 
-import org.junit.jupiter.api.Tag;
 import org.junit.jupiter.api.Test;
 import org.junit.jupiter.params.ParameterizedTest;
 import org.junit.jupiter.params.provider.ValueSource;
@@ -23,11 +22,10 @@ class TrickPlayTest extends PlayerFixture {
         assertEquals(0, player.trickPlay().getBufferedPercent());
     }
 
-    @Tag("slow-on-emulator")
     @ParameterizedTest
     @ValueSource(doubles = {2, 4, 0.5})
     void forwardSpeedsMoveOn(double speed) throws Exception {
-        prepare("long.mkv");
+        prepare("light.mkv");
         assertTrue(player.trickPlay().canPlayAt(speed));
         player.trickPlay().setSpeed(speed);
         assertEquals(speed, player.trickPlay().getSpeed());
@@ -43,11 +41,10 @@ class TrickPlayTest extends PlayerFixture {
         assertEquals(1, player.trickPlay().getSpeed());
     }
 
-    @Tag("slow-on-emulator")
     @ParameterizedTest
     @ValueSource(doubles = {-1, -4, -16})
     void backwardSpeedsMoveBack(double speed) throws Exception {
-        prepare("long.mkv");
+        prepare("light.mkv");
         player.seekTo(40_000);
         assertTrue(player.trickPlay().canPlayAt(speed));
         player.trickPlay().setSpeed(speed);
