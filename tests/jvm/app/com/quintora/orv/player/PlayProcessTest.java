@@ -45,8 +45,7 @@ class PlayProcessTest {
         play("info", Media.path("long.mkv"));
         Wait.until("it plays", () -> process.out().contains("shown"));
         process.interrupt();
-        assertTrue(
-                process.err().contains("OrvMediaClient_release(): Leave"), process::all);
+        assertTrue(process.err().contains("OrvMediaClient_release(): Leave"), process::all);
     }
 
     @Test
