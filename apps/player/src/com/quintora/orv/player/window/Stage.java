@@ -4,7 +4,6 @@ package com.quintora.orv.player.window;
 import android.media.Image;
 import com.quintora.orv.player.Snapshot;
 import java.awt.BorderLayout;
-import java.awt.CardLayout;
 import java.awt.Color;
 import java.awt.Component;
 import java.awt.Dimension;
@@ -19,7 +18,6 @@ import java.awt.event.WindowEvent;
 import java.util.List;
 import java.util.Locale;
 import javax.swing.JFrame;
-import javax.swing.JPanel;
 import javax.swing.LayoutFocusTraversalPolicy;
 import javax.swing.SwingUtilities;
 import javax.swing.WindowConstants;
@@ -32,8 +30,7 @@ final class Stage {
 
     private final String name;
     private final VideoPane video = new VideoPane();
-    private final CardLayout cards = new CardLayout();
-    private final JPanel room = new JPanel(cards);
+    private final NoticePane room = new NoticePane();
     private JFrame frame;
     private ControlBar bar;
     private final Help help = new Help();
@@ -115,9 +112,9 @@ final class Stage {
         tellInstead(Glyph.ALERT, Theme.ALERT, "This cannot be played", sentence);
     }
 
-    /** A few words on the picture. */
+    /** A few words on the picture, or on the message in its place. */
     void tell(String words) {
-        video.tell(words);
+        room.tell(words);
     }
 
     void toggleFullScreen() {
@@ -155,7 +152,7 @@ final class Stage {
 
     private void tellInstead(Glyph glyph, Color color, String title, String text) {
         message.tell(glyph, color, title, text);
-        cards.show(room, MESSAGE);
+        room.show(MESSAGE);
     }
 
     /** As large as the video, within a part of the screen. */

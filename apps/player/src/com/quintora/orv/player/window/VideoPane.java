@@ -1,7 +1,6 @@
 // SPDX-License-Identifier: Apache-2.0
 package com.quintora.orv.player.window;
 
-import java.awt.Color;
 import java.awt.Dimension;
 import java.awt.Graphics;
 import java.awt.Graphics2D;
@@ -11,22 +10,15 @@ import java.awt.image.BufferedImage;
 import java.awt.image.DataBufferInt;
 import java.nio.ByteBuffer;
 import javax.swing.JPanel;
-import javax.swing.Timer;
 
-/** Shows the newest frame, as large as fits with its proportions kept, and short notices on it. */
+/** Shows the newest frame, as large as fits with its proportions kept. */
 final class VideoPane extends JPanel {
-    private static final int NOTICE_MS = 1_200;
-
     // The one that is painted and the one that is filled; they change places under the lock.
     private final Object lock = new Object();
     private BufferedImage front;
     private BufferedImage back;
 
-    private String notice = "";
-    private final Timer noticeEnd = new Timer(NOTICE_MS, event -> setNotice(""));
-
     VideoPane() {
-        noticeEnd.setRepeats(false);
         getAccessibleContext().setAccessibleName("Video");
     }
 
@@ -57,18 +49,6 @@ final class VideoPane extends JPanel {
         repaint();
     }
 
-    /** Writes a few words onto the picture for a moment. Call on the window's thread. */
-    void tell(String words) {
-        setNotice(words);
-        noticeEnd.restart();
-    }
-
-    private void setNotice(String words) {
-        notice = words;
-        getAccessibleContext().setAccessibleDescription(words);
-        repaint();
-    }
-
     @Override
     public Dimension getMinimumSize() {
         return new Dimension(160, 90);
@@ -78,9 +58,6 @@ final class VideoPane extends JPanel {
     protected void paintComponent(Graphics graphics) {
         synchronized (lock) {
             paintFrame((Graphics2D) graphics);
-        }
-        if (!notice.isEmpty()) {
-            paintNotice(graphics);
         }
     }
 
@@ -94,19 +71,6 @@ final class VideoPane extends JPanel {
         g.setRenderingHint(
                 RenderingHints.KEY_INTERPOLATION, RenderingHints.VALUE_INTERPOLATION_BILINEAR);
         g.drawImage(front, place.x, place.y, place.width, place.height, null);
-    }
-
-    private void paintNotice(Graphics graphics) {
-        Graphics2D g = Theme.smooth(graphics);
-        g.setFont(Theme.BODY.deriveFont(16f));
-        var metrics = g.getFontMetrics();
-        int width = metrics.stringWidth(notice) + 28;
-        int height = metrics.getHeight() + 16;
-        g.setColor(new Color(0, 0, 0, 170));
-        g.fillRoundRect(20, 20, width, height, Theme.CORNER * 2, Theme.CORNER * 2);
-        g.setColor(Theme.TEXT);
-        g.drawString(notice, 34, 28 + metrics.getAscent());
-        g.dispose();
     }
 
     /** The largest centred place of those proportions in a room. */

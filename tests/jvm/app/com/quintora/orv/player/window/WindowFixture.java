@@ -72,7 +72,7 @@ abstract class WindowFixture {
     }
 
     final void awaitPicture() throws Exception {
-        Wait.until("a picture shows", () -> brightest(find(VideoPane.class, null)) > 100);
+        Wait.until("a picture shows", () -> brightest(find(VideoPane.class, null), 150) > 100);
     }
 
     final void awaitButton(String name) throws Exception {
@@ -121,15 +121,16 @@ abstract class WindowFixture {
                 : name.equals(component.getAccessibleContext().getAccessibleName());
     }
 
-    private static int brightest(Component component) throws Exception {
+    /** The brightest red or blue of a row. */
+    static int brightest(Component component, int y) throws Exception {
         return onWindow(
                 () -> {
                     var image = new BufferedImage(400, 300, BufferedImage.TYPE_INT_RGB);
                     component.paint(image.getGraphics());
                     int brightest = 0;
-                    for (int x = 0; x < 400; x += 10) {
-                        brightest = Math.max(brightest, image.getRGB(x, 150) & 255);
-                        brightest = Math.max(brightest, image.getRGB(x, 150) >> 16 & 255);
+                    for (int x = 0; x < 400; x++) {
+                        brightest = Math.max(brightest, image.getRGB(x, y) & 255);
+                        brightest = Math.max(brightest, image.getRGB(x, y) >> 16 & 255);
                     }
                     return brightest;
                 });

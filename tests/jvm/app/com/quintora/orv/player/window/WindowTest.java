@@ -96,6 +96,17 @@ class WindowTest extends WindowFixture {
     }
 
     @Test
+    void noticesStandOnAMessageToo() throws Exception {
+        open("tone.mp3");
+        awaitButton("Pause (Space)");
+        NoticePane room = find(NoticePane.class, null);
+        Wait.until("the title shows", () -> find(MessagePanel.class, null) != null);
+        assertTrue(brightest(room, 37) < 100, "nothing stands there");
+        press("S");
+        Wait.until("it says so", () -> brightest(room, 37) > 100);
+    }
+
+    @Test
     void aFailureIsSaidInTheWindow() throws Exception {
         open("noise.bin");
         Wait.until("it says so", () -> find(JLabel.class, "This cannot be played") != null);
@@ -108,6 +119,6 @@ class WindowTest extends WindowFixture {
 
     /** The words on the picture. */
     private String notice() throws Exception {
-        return find(VideoPane.class, null).getAccessibleContext().getAccessibleDescription();
+        return find(NoticePane.class, null).getAccessibleContext().getAccessibleDescription();
     }
 }

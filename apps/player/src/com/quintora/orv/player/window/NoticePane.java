@@ -1,0 +1,67 @@
+// SPDX-License-Identifier: Apache-2.0
+package com.quintora.orv.player.window;
+
+import java.awt.CardLayout;
+import java.awt.Color;
+import java.awt.Graphics;
+import java.awt.Graphics2D;
+import javax.swing.JPanel;
+import javax.swing.Timer;
+
+/** Shows one of its components, and for a moment a few words on it. */
+final class NoticePane extends JPanel {
+    private static final int NOTICE_MS = 1_200;
+
+    private final CardLayout cards = new CardLayout();
+    private final Timer noticeEnd = new Timer(NOTICE_MS, event -> setNotice(""));
+    private String notice = "";
+
+    NoticePane() {
+        setLayout(cards);
+        noticeEnd.setRepeats(false);
+    }
+
+    /** Shows the component that was added under that name. */
+    void show(String name) {
+        cards.show(this, name);
+    }
+
+    /** Writes a few words onto what is shown. */
+    void tell(String words) {
+        setNotice(words);
+        noticeEnd.restart();
+    }
+
+    private void setNotice(String words) {
+        notice = words;
+        getAccessibleContext().setAccessibleDescription(words);
+        repaint();
+    }
+
+    /** A new frame is painted from here on, or it would cover the words. */
+    @Override
+    protected boolean isPaintingOrigin() {
+        return true;
+    }
+
+    @Override
+    public void paint(Graphics graphics) {
+        super.paint(graphics);
+        if (!notice.isEmpty()) {
+            paintNotice(graphics);
+        }
+    }
+
+    private void paintNotice(Graphics graphics) {
+        Graphics2D g = Theme.smooth(graphics);
+        g.setFont(Theme.BODY.deriveFont(16f));
+        var metrics = g.getFontMetrics();
+        int width = metrics.stringWidth(notice) + 28;
+        int height = metrics.getHeight() + 16;
+        g.setColor(new Color(0, 0, 0, 170));
+        g.fillRoundRect(20, 20, width, height, Theme.CORNER * 2, Theme.CORNER * 2);
+        g.setColor(Theme.TEXT);
+        g.drawString(notice, 34, 28 + metrics.getAscent());
+        g.dispose();
+    }
+}
