@@ -47,6 +47,8 @@ expect "a path as a command" 2 "there is no command" "$root/orv" ../shell/common
 expect "an option first" 2 "options come after one" "$root/orv" --json info
 expect "another target" 2 "not 'mips'" "$root/orv" test --target mips
 expect "a target without a name" 2 "lacks its value" "$root/orv" test --target
+expect "another option of bench" 2 "bench does not know '--fast'" "$root/orv" bench --fast
+expect "a filter of bench without a pattern" 2 "lacks its value" "$root/orv" bench --filter
 expect "another doctor" 2 "doctor does not know '--spell'" "$root/orv" doctor --spell x
 for script in "$root"/tools/cmd-*.sh; do
     name=$(basename -- "${script#*cmd-}" .sh)
