@@ -13,8 +13,9 @@ while [ $# -gt 0 ]; do
     shift || die_usage "an option of bench lacks its value."
 done
 
-need_packages "build and run the benchmarks" play bench
-in_bench_build build_targets off orv_bench
+need_packages "build and run the benchmarks" play test
+build_targets on orv_bench
+"$ORV_ROOT/tests/media/make-media.sh" "$ORV_BUILD/media" feature.mkv tone-s16le.pcm
 use_utf8
 say "these figures are this machine's: compare those of one run with each other"
-exec "$ORV_BUILD/bench/bin/orv_bench" ${filter:+"--benchmark_filter=$filter"}
+exec "$ORV_BUILD/bin/orv_bench" ${filter:+"--benchmark_filter=$filter"}

@@ -2,9 +2,6 @@
 # shellcheck shell=bash
 # Configures and builds into $ORV_BUILD, quiet unless something fails.
 
-# What a command's own build folder is configured with besides.
-CMAKE_SETTINGS=()
-
 # build_targets WITH_TESTS TARGET…: WITH_TESTS is on or off. A build folder
 # that once had tests keeps them, so that play and test can take turns.
 build_targets() {
@@ -18,13 +15,6 @@ build_targets() {
     exec {build_lock}>&-
 }
 
-# in_bench_build FUNCTION…: one of these for the benchmarks' own folder, which
-# is built as for playing, without tests.
-in_bench_build() {
-    local ORV_BUILD=$ORV_BUILD/bench CMAKE_SETTINGS=(-D ORV_BENCH=ON)
-    "$@"
-}
-
 configure() {
     is_configured "$1" && return
     if [ ! -f "$ORV_BUILD/build.ninja" ]; then
@@ -33,7 +23,7 @@ configure() {
         rm -f -- "$ORV_BUILD/CMakeCache.txt"
     fi
     run_logged "$ORV_BUILD/log/configure.log" cmake -S "$ORV_ROOT" -B "$ORV_BUILD" -G Ninja \
-        -D "ORV_TESTS=${1^^}" "${CMAKE_SETTINGS[@]}" || die "the build could not be configured."
+        -D "ORV_TESTS=${1^^}" || die "the build could not be configured."
 }
 
 is_configured() {
