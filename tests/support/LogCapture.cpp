@@ -148,11 +148,12 @@ ExpectedLine warning(const std::string& text) { return {ANDROID_LOG_WARN, text, 
 ExpectedLine error(const std::string& text) { return {ANDROID_LOG_ERROR, text, ""}; }
 
 LogCapture::LogCapture() {
+    // Not under the lock: the log holds one of its own when it calls the sink.
+    __android_log_set_logger(sink);
+    __android_log_set_minimum_priority(ANDROID_LOG_VERBOSE);
     std::lock_guard<std::mutex> lock(sCurrentMutex);
     if (sCurrent != nullptr) ADD_FAILURE() << "a log capture lives already";
     sCurrent = this;
-    __android_log_set_logger(sink);
-    __android_log_set_minimum_priority(ANDROID_LOG_VERBOSE);
 }
 
 LogCapture::~LogCapture() {
