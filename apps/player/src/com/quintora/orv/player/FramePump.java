@@ -16,6 +16,7 @@ final class FramePump implements AutoCloseable {
     // What the pump's thread is told, and what it tells.
     private volatile double framesPerSecond;
     private volatile boolean jumped;
+    private volatile boolean hidden;
     private volatile long shown;
     private volatile long dropped;
     private volatile long firstFrameAt;
@@ -44,6 +45,11 @@ final class FramePump implements AutoCloseable {
     /** The next frame may have any time, as after a seek. */
     void expectJump() {
         jumped = true;
+    }
+
+    /** Frames that come meanwhile are neither shown nor counted. */
+    void hide(boolean hide) {
+        hidden = hide;
     }
 
     long shown() {
@@ -75,7 +81,7 @@ final class FramePump implements AutoCloseable {
             throws InterruptedException {
         while (!closed && rate == framesPerSecond) {
             try (Image image = reader.awaitImage(WAIT_MS)) {
-                if (image == null) {
+                if (image == null || hidden) {
                     continue;
                 }
                 if (firstFrameAt == 0) {

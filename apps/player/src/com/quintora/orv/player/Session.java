@@ -65,6 +65,7 @@ public final class Session implements AutoCloseable {
         if (options.section != null) {
             new SectionRepeater(player, options.section).start();
         }
+        frames.expectJump();
         stopwatch.start(player.getCurrentPosition());
         player.start();
     }
@@ -199,7 +200,17 @@ public final class Session implements AutoCloseable {
         }
         if (start > 0) {
             seekTo(start);
+            approach(start);
         }
+    }
+
+    /** Shows the last frame of the way alone. */
+    private void approach(int start) {
+        int way = options.speed > 0 ? Approach.framesTo(player, start) : 0;
+        frames.hide(true);
+        Approach.step(player, Math.max(0, way - 1));
+        frames.hide(false);
+        Approach.step(player, Math.min(way, 1));
     }
 
     private void applyOptions() throws Failure {

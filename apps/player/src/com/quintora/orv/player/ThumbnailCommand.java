@@ -5,7 +5,6 @@ import com.quintora.mmp.ColorMode;
 import com.quintora.mmp.OrvMediaPlayer;
 import com.quintora.mmp.Pictures;
 import com.quintora.mmp.Thumbnail;
-import com.quintora.mmp.VideoTrack;
 import java.awt.image.BufferedImage;
 import java.awt.image.DataBufferInt;
 import java.io.IOException;
@@ -96,26 +95,7 @@ final class ThumbnailCommand implements Callable<Integer> {
             throw Failure.endsBefore(source, duration, "that moment");
         }
         player.seekTo(at);
-        stepTo(player);
-    }
-
-    /** A seek ends at a key frame; the rest of the way goes frame by frame. */
-    private void stepTo(OrvMediaPlayer player) {
-        double framesPerSecond =
-                player.tracks().currentVideo().map(VideoTrack::frameRate).orElse(0.0);
-        int frames = (int) ((at - player.getCurrentPosition()) * framesPerSecond / 1000);
-        if (frames > 0) {
-            stepUpTo(player, frames);
-        }
-    }
-
-    // The last frame may be nearer than the duration says, and is the nearest then.
-    private static void stepUpTo(OrvMediaPlayer player, int frames) {
-        try {
-            player.trickPlay().step(frames);
-        } catch (IllegalStateException e) {
-            // The player stands at the last frame.
-        }
+        Approach.step(player, Approach.framesTo(player, at));
     }
 
     private Thumbnail draw(OrvMediaPlayer player) throws Failure {

@@ -41,6 +41,14 @@ class PlayCommandTest {
         assertEquals(1, play("short.mp4", "--start", "2").media, 0.2);
     }
 
+    /** The key frame before is 13 seconds away. */
+    @Test
+    void aStartBetweenKeyFramesIsExact() throws Exception {
+        Report report = play("distant.mkv", "--start", "28");
+        assertEquals(2, report.media, 0.2);
+        assertTrue(report.frames < 100, "the way is not shown: " + report);
+    }
+
     @Test
     void aSpeedTakesLessTime() throws Exception {
         Report report = play("long.mkv", "--start", "40", "--speed", "8");
