@@ -12,7 +12,7 @@ FILES="video.mp4 video.mkv video.ts video.avi slides.mkv rotated.mp4 hd.mp4 hd70
        alpha.mov still.png silent.mkv tracks.mkv tracks.mp4 tagged.mp3 tagged.ogg broken-tags.mp4
        front.jpg back.png covered.mp3 covered.flac covered.m4a covered.mkv noise.bin
        cut.mp4 cut.mkv
-       feature.mkv short.mp4 short.ts long.mkv light.mkv distant.mkv silent.mp4 plain.mkv plain.mp4 pictures.mkv
+       feature.mkv short.mp4 short.ts long.mkv light.mkv sparse.mkv distant.mkv silent.mp4 plain.mkv plain.mp4 pictures.mkv
        lines.srt latin1.srt lines.ass words.idx words.sub languages.idx languages.sub tone.mp3
        tone.flac tone-s16le.pcm tone-s16be.pcm subtitles-only.mkv garbage.bin empty.bin unseen.mkv dead.mkv first-of-two.m3u
        first-missing.m3u nothing.m3u locale"
@@ -226,6 +226,13 @@ make_light_mkv() {
     quiet_ffmpeg -f lavfi -i "testsrc2=size=64x36:rate=5:duration=300" \
         -f lavfi -i "sine=440:duration=300:sample_rate=8000" \
         $(fast_h264) -g 5 -c:a flac -ac 1 "$1"
+}
+
+# Five seconds at 30 frames a second, of which after the first only one is there.
+make_sparse_mkv() {
+    # shellcheck disable=SC2046
+    quiet_ffmpeg -f lavfi -i "$(playing 160x90 6),select=lt(t\,1)+not(mod(n\,30))" -vsync vfr \
+        $(fast_h264) -g 60 "$1"
 }
 
 # Half a minute with a key frame every 15 seconds.

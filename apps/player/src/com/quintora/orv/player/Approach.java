@@ -8,29 +8,38 @@ import com.quintora.mmp.VideoTrack;
 final class Approach {
     // The fastest at which no frame is left out.
     private static final double SPEED = 16;
+    private static final int ROUNDING_MS = 1;
 
     private Approach() {}
 
-    /** How many frames it is from where the player stands; 0 without a picture. */
-    static int framesTo(OrvMediaPlayer player, int millis) {
+    /**
+     * Goes on to the frame of that moment, or to the last one. The speed is the normal one
+     * afterwards.
+     */
+    static void to(OrvMediaPlayer player, int millis) {
         double framesPerSecond =
                 player.tracks().currentVideo().map(VideoTrack::frameRate).orElse(0.0);
-        int frames = (int) ((millis - player.getCurrentPosition()) * framesPerSecond / 1000);
-        return Math.max(0, frames);
-    }
-
-    /** Goes that many frames on, or to the last one. The speed is the normal one afterwards. */
-    static void step(OrvMediaPlayer player, int frames) {
-        if (frames == 0) {
+        double last = millis + ROUNDING_MS - 1000 / framesPerSecond;
+        if (framesPerSecond == 0 || player.getCurrentPosition() > last) {
             return;
         }
         player.trickPlay().setSpeed(SPEED);
         try {
-            player.trickPlay().step(frames);
+            stepTo(player, millis, last);
         } catch (IllegalStateException e) {
             // The last frame may be nearer than the duration says: the player stands there.
         } finally {
             player.trickPlay().setSpeed(1);
+        }
+    }
+
+    // One by one: some media have fewer frames than their rate says.
+    private static void stepTo(OrvMediaPlayer player, int millis, double last) {
+        while (player.getCurrentPosition() <= last) {
+            player.trickPlay().step(1);
+        }
+        if (player.getCurrentPosition() > millis + ROUNDING_MS) {
+            player.trickPlay().step(-1);
         }
     }
 }

@@ -200,17 +200,12 @@ public final class Session implements AutoCloseable {
         }
         if (start > 0) {
             seekTo(start);
-            approach(start);
         }
-    }
-
-    /** Shows the last frame of the way alone. */
-    private void approach(int start) {
-        int way = options.speed > 0 ? Approach.framesTo(player, start) : 0;
-        frames.hide(true);
-        Approach.step(player, Math.max(0, way - 1));
-        frames.hide(false);
-        Approach.step(player, Math.min(way, 1));
+        if (start > 0 && options.speed > 0) {
+            frames.hide(true);
+            Approach.to(player, start);
+            frames.hide(false);
+        }
     }
 
     private void applyOptions() throws Failure {

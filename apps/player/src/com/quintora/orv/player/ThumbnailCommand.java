@@ -95,7 +95,7 @@ final class ThumbnailCommand implements Callable<Integer> {
             throw Failure.endsBefore(source, duration, "that moment");
         }
         player.seekTo(at);
-        Approach.step(player, Approach.framesTo(player, at));
+        Approach.to(player, at);
     }
 
     private Thumbnail draw(OrvMediaPlayer player) throws Failure {

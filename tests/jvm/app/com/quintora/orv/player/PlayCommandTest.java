@@ -50,6 +50,11 @@ class PlayCommandTest {
     }
 
     @Test
+    void aStartAmongFewFramesIsExact() throws Exception {
+        assertEquals(1, play("sparse.mkv", "--start", "4.5").media, 0.2);
+    }
+
+    @Test
     void aSpeedTakesLessTime() throws Exception {
         Report report = play("long.mkv", "--start", "40", "--speed", "8");
         assertEquals(20, report.media, 1.1);
