@@ -149,11 +149,12 @@ TEST_F(OrvMediaServiceTest, NullUrlIsRefusedBeforeThePlayerIsLookedAt) {
     EXPECT_TRUE(engine->calls().empty());
 }
 
-TEST_F(OrvMediaServiceTest, NullSubtitleUrlIsRefusedBeforeThePlayerIsLookedAt) {
+TEST_F(OrvMediaServiceTest, NullSubtitleUrlIsLoggedAndRefusedBeforeThePlayerIsLookedAt) {
     for (int round = 0; round < 2; round++) {
         EXPECT_FALSE(service->setSubtitleDataSource(nullptr));
         EXPECT_THAT(log.take(),
                     LinesAre({info("OrvMediaService::setSubtitleDataSource()"),
+                              info("OrvMediaService::setSubtitleDataSource(): url=(null)"),
                               error("OrvMediaService::setSubtitleDataSource(): url==null, "
                                     "return directly!!!!")}));
         if (round == 0) attachPlayer();

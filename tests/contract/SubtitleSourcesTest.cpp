@@ -39,6 +39,7 @@ TEST_F(SubtitleSourceTest, NullGoesOnToTheServiceWhichRefusesIt) {
                 ReturnsNothing().logs(
                     {enter(name), null, url("(null)"),
                      serviceInfo("OrvMediaService::setSubtitleDataSource()"),
+                     serviceInfo("OrvMediaService::setSubtitleDataSource(): url=(null)"),
                      serviceError("OrvMediaService::setSubtitleDataSource(): url==null, return "
                                   "directly!!!!"),
                      leave(name)}));

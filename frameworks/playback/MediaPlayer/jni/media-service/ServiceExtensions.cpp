@@ -170,11 +170,11 @@ bool OrvMediaService::addTimedTextSource(const char* path) {
 
 bool OrvMediaService::setSubtitleDataSource(const char* url) {
     logEntry(__func__);
+    ALOGI("OrvMediaService::setSubtitleDataSource(): url=%s", url);  // also a null one
     if (url == nullptr) {
         ALOGE("OrvMediaService::setSubtitleDataSource(): url==null, return directly!!!!");
         return false;
     }
-    ALOGI("OrvMediaService::setSubtitleDataSource(): url=%s", url);
     return forward(__func__, false, &TarnPlayer::setSubtitleDataSource, url);
 }
 
