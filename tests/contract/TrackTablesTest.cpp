@@ -50,6 +50,14 @@ TEST_F(AllSubtitleTrackInfoTest, UnreadableEntryIsSentEmptyAndTheRestGoesOn) {
                    "setAllSubtitleTrackInfo(4, 3, 4, 5, \"d\", -4)"}));
 }
 
+TEST_F(AllSubtitleTrackInfoTest, WhatTheEngineLeftInAnUnreadableEntryIsNotSent) {
+    setUpPlayer().put("getSubtitleTrackCount", 2);
+    engine->subtitleTracks = {{0, subtitle(7, "half")}, {1, subtitle(9, "whole")}};
+    engine->answer("getSubtitleTrackInfo", {0, 1});  // both are written
+    EXPECT_THAT(getAll().java, ElementsAre("setAllSubtitleTrackInfo(2, 0, 0, 0, \"\", 0)",
+                                           "setAllSubtitleTrackInfo(2, 1, 9, 10, \"whole\", -9)"));
+}
+
 TEST_F(AllSubtitleTrackInfoTest, EngineGetsAFreshRecordForEveryEntry) {
     setUpPlayer().put("getSubtitleTrackCount", 2);
     engine->subtitleTracks = {{0, subtitle(7, "eng;")}};

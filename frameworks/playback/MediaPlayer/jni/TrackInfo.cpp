@@ -122,7 +122,8 @@ jint OrvMediaClient_getAllSubtitleTrackInfo(JNIEnv* env, jobject thiz) {
     for (int index = 0; index < count; ++index) {
         SubtitleTrackInfo info;
         if (!service->getSubtitleTrackInfo(index, info)) {
-            // Java still gets the entry, empty.
+            // Java still gets the entry, empty whatever the engine wrote before it failed.
+            info = SubtitleTrackInfo();
             ALOGE(
                 "OrvMediaClient_getAllSubtitleTrackInfo(): getSubtitleTrackInfo(%d), service get "
                 "failed\n",
