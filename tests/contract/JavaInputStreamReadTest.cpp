@@ -92,6 +92,20 @@ TEST_F(JavaInputStreamReadTest, MoreThanAskedForIsCutButReported) {
     EXPECT_EQ(copied(), 200u);
 }
 
+TEST_F(JavaInputStreamReadTest, BytesAreCopiedBeforeTheCutIsLoggedAndTheArrayReleased) {
+    size_t copiedThen = 0;
+    size_t releasedThen = 99;
+    log.whenLogged(
+        bridgeError("JavaInputStream::read(): copy i4ReadResult>len Issue handle \n"), [&] {
+            copiedThen = copied();
+            releasedThen = vm.callsOf("ReleaseByteArrayElements").size();
+        });
+    read(300, 200);
+    EXPECT_EQ(copiedThen, 200u);
+    EXPECT_EQ(releasedThen, 0u);
+    EXPECT_EQ(vm.callsOf("ReleaseByteArrayElements").size(), 1u);
+}
+
 // A count beyond the end of Java's own array must not read what is behind it.
 TEST_F(JavaInputStreamReadTest, CountBeyondJavasArrayReadsNothingBehindIt) {
     read(350, 400);

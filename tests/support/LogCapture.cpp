@@ -15,13 +15,17 @@ std::mutex sCurrentMutex;
 LogCapture* sCurrent = nullptr;
 
 void sink(const __android_logger_data* data, const char* message) {
-    std::lock_guard<std::mutex> lock(sCurrentMutex);
-    if (sCurrent == nullptr) {
-        __android_log_stderr_logger(data, message);
-        return;
+    std::function<void()> action;
+    {
+        std::lock_guard<std::mutex> lock(sCurrentMutex);
+        if (sCurrent == nullptr) {
+            __android_log_stderr_logger(data, message);
+            return;
+        }
+        action = sCurrent->add({data->priority, data->tag == nullptr ? "" : data->tag, message,
+                                std::this_thread::get_id()});
     }
-    sCurrent->add({data->priority, data->tag == nullptr ? "" : data->tag, message,
-                   std::this_thread::get_id()});
+    if (action) action();  // it may log
 }
 
 // Both return the character behind what they matched, or null.
@@ -187,10 +191,18 @@ bool LogCapture::waitFor(const ExpectedLine& line, size_t count) const {
     });
 }
 
-void LogCapture::add(LogLine line) {
+void LogCapture::whenLogged(const ExpectedLine& line, std::function<void()> action) {
+    std::lock_guard<std::mutex> lock(mMutex);
+    mActionLine = line;
+    mAction = std::move(action);
+}
+
+std::function<void()> LogCapture::add(LogLine line) {
     std::lock_guard<std::mutex> lock(mMutex);
     mLines.push_back(std::move(line));
     mArrived.notify_all();
+    if (mAction && mActionLine.matches(mLines.back())) return std::exchange(mAction, nullptr);
+    return nullptr;
 }
 
 testing::Matcher<const std::vector<LogLine>&> LinesAre(std::vector<ExpectedLine> expected) {

@@ -4,6 +4,7 @@
 #include <gmock/gmock.h>
 
 #include <condition_variable>
+#include <functional>
 #include <iosfwd>
 #include <mutex>
 #include <string>
@@ -58,12 +59,19 @@ public:
     // Waits until that many matching lines are there; false after ten seconds.
     bool waitFor(const ExpectedLine& line, size_t count = 1) const;
 
-    void add(LogLine line);
+    // Runs the action once, inside the next call that logs such a line, on the
+    // thread of that call. The action may log.
+    void whenLogged(const ExpectedLine& line, std::function<void()> action);
+
+    // Takes a line; what the thread that logged it then has to run.
+    std::function<void()> add(LogLine line);
 
 private:
     mutable std::mutex mMutex;
     mutable std::condition_variable mArrived;
     std::vector<LogLine> mLines;
+    ExpectedLine mActionLine;
+    std::function<void()> mAction;
 };
 
 // Matches a list of lines that is exactly the expected one, in order. A

@@ -110,10 +110,10 @@ void JavaInputStream::copyReadBuffer(JNIEnv* env, char* buffer, int len, int cou
         ALOGE("JavaInputStream::read(): pByte_readBuffer=null, please check!\n");
         return;
     }
-    if (count > len) ALOGE("JavaInputStream::read(): copy i4ReadResult>len Issue handle \n");
     // Java's count is not trusted beyond the end of its own array.
     const int available = std::min(count, env->GetArrayLength(array));
     memcpy(buffer, bytes, std::max(0, std::min(available, len)));
+    if (count > len) ALOGE("JavaInputStream::read(): copy i4ReadResult>len Issue handle \n");
     env->ReleaseByteArrayElements(array, bytes, 0);
 }
 
