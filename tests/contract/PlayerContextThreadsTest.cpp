@@ -1,6 +1,7 @@
 // SPDX-License-Identifier: Apache-2.0
 // A player's service under other threads: lookups, releases, the dispatcher.
 #include <jni/PlayerContext.h>
+#include <jni/VideoSurface.h>
 
 #include <chrono>
 #include <functional>
@@ -101,6 +102,33 @@ TEST_F(PlayerContextThreadsTest, ServiceOutlivesAReleaseOnAnotherThread) {
     });
     EXPECT_EQ(held->getStrongCount(), 1);
     EXPECT_TRUE(held->isPlayerExists());
+}
+
+// A release on another thread, at the method's last line: the service must stay
+// until the method has returned.
+TEST_F(PlayerContextThreadsTest, ServiceOutlivesAReleaseInsideACallThatOnlyLooksItUp) {
+    const auto expectToOutliveARelease = [&](const std::string& function, const auto& body) {
+        setUpPlayer();
+        bool released = false;
+        log.whenLogged(leave(function), [&] {
+            vm.onJavaThread([&] {
+                fakejni::callNative<void>(vm, playerClass, vm.local(player), "native_release",
+                                          "()V");
+            });
+            released = true;
+            EXPECT_EQ(ScriptedEngine::live(), 1) << function;
+        });
+        body();
+        EXPECT_TRUE(released) << function;
+        EXPECT_EQ(ScriptedEngine::live(), 0) << function;
+        EXPECT_EQ(context(), 0) << function;
+    };
+    expectToOutliveARelease("OrvMediaClient_getParameter", [&] {
+        call<void>("native_getParameter", "(ILandroid/os/Parcel;)V", 1, jobject{nullptr});
+    });
+    expectToOutliveARelease("decVideoSurfaceRef", [&] {
+        android::decVideoSurfaceRef(vm.env(), vm.local(player));
+    });
 }
 
 // The other thread must get its answer before the engine gives its own: nobody

@@ -246,7 +246,8 @@ jboolean OrvMediaClient_setParameter(JNIEnv* env, jobject thiz, jint, jobject) {
 
 void OrvMediaClient_getParameter(JNIEnv* env, jobject thiz, jint, jobject) {
     logEnter(__func__);
-    if (serviceOrThrow(env, thiz) == nullptr) return;
+    sp<OrvMediaService> service = serviceOrThrow(env, thiz);
+    if (service == nullptr) return;
     logLeave(__func__);
 }
 

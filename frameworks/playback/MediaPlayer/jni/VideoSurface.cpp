@@ -44,7 +44,8 @@ sp<IGraphicBufferProducer> getVideoSurfaceTexture(JNIEnv* env, jobject thiz) {
 
 void decVideoSurfaceRef(JNIEnv* env, jobject thiz) {
     ALOGI("decVideoSurfaceRef(): Enter\n");
-    if (getMediaService(env, thiz) == nullptr) return;
+    sp<OrvMediaService> service = getMediaService(env, thiz);
+    if (service == nullptr) return;
     sp<IGraphicBufferProducer> old = getVideoSurfaceTexture(env, thiz);
     if (old != nullptr) old->decStrong(thiz);
     ALOGI("decVideoSurfaceRef(): Leave\n");
