@@ -187,12 +187,18 @@ TEST(ObjectLayout, DispatcherAndItsQueue) {
             OPENED(os::Semaphore, QueueWakeUp, 72),
         },
         0);
+    struct ThreeFields {
+        std::queue<ORV::SyncToAsyncAction*> items;
+        os::Mutex mutex;
+        os::Semaphore wakeUp;
+    };
+    EXPECT_EQ(sizeof(ActionQueue), sizeof(ThreeFields));
     expectFields(
         {
             OPENED(ActionQueue, DispatcherQueue, 40),
-            OPENED(os::Mutex, DispatcherMutex, 132),
-            OPENED(std::list<ORV::SyncToAsyncAction*>, DispatcherActions, 164),
-            OPENED(std::list<ORV::MsgHandler*>, DispatcherHandlers, 176),
+            OPENED(os::Mutex, DispatcherMutex, 128),
+            OPENED(std::list<ORV::SyncToAsyncAction*>, DispatcherActions, 160),
+            OPENED(std::list<ORV::MsgHandler*>, DispatcherHandlers, 172),
         },
         sizeof(os::Thread));
 }
