@@ -1,8 +1,10 @@
 // SPDX-License-Identifier: Apache-2.0
 #include "MediaMetaData.h"
 
+#include <binder/Parcel.h>
 #include <media/Metadata.h>
 #include <stdlib.h>
+#include <utils/String16.h>
 #include <utils/String8.h>
 
 #include <algorithm>
@@ -42,16 +44,28 @@ std::string utf8Of(const OrvWideText& text) {
     const auto* end = std::find(text, text + ORV_TEXT_UNITS, uint16_t{0});
     const android::String8 utf8(reinterpret_cast<const char16_t*>(text),
                                 static_cast<size_t>(end - text));
-    return utf8.string();
+    return utf8.c_str();
+}
+
+// A text's record. The platform's class has no operation for those.
+void appendText(android::Parcel* records, Metadata::Type key, const std::string& utf8) {
+    constexpr int32_t kText = 1;
+    const size_t begin = records->dataPosition();
+    for (const int32_t word : {0, key, kText}) records->writeInt32(word);
+    records->writeString16(android::String16(utf8.c_str()));
+    const size_t end = records->dataPosition();
+    records->setDataPosition(begin);
+    records->writeInt32(static_cast<int32_t>(end - begin));
+    records->setDataPosition(end);
 }
 
 class RecordWriter {
 public:
     RecordWriter(const android::SortedVector<int>& keys, android::Parcel* records)
-        : mKeys(keys), mMetadata(records) {}
+        : mKeys(keys), mRecords(records), mMetadata(records) {}
 
     void text(Metadata::Type key, const std::string& value) {
-        if (!value.empty() && wants(key)) mMetadata.appendString(key, value.c_str());
+        if (!value.empty() && wants(key)) appendText(mRecords, key, value);
     }
     void number(Metadata::Type key, int32_t value) {
         if (value > 0 && wants(key)) mMetadata.appendInt32(key, value);
@@ -66,6 +80,7 @@ private:
     }
 
     const android::SortedVector<int>& mKeys;
+    android::Parcel* const mRecords;
     Metadata mMetadata;
 };
 
@@ -106,7 +121,7 @@ android::status_t MediaMetaData::write(const android::SortedVector<int>& keys,
     if (info.mYear > 0) writer.text(Metadata::kDate, std::to_string(info.mYear));
     const NumberKey numbers[] = {
         {Metadata::kDuration, toMilliseconds(now.duration)},
-        {Metadata::kCdTrackNumber, info.mTrackNumber},
+        {Metadata::kCdTrackNum, info.mTrackNumber},
         {Metadata::kBitRate, info.mBitRate},
         {Metadata::kVideoHeight, now.height},
         {Metadata::kVideoWidth, now.width},

@@ -46,7 +46,7 @@ const NumberParameter* numberOf(int key) {
 status_t textOf(const Parcel& request, std::string& text) {
     android::String16 wide;
     const status_t status = request.readString16(&wide);
-    if (status == android::NO_ERROR) text = android::String8(wide).string();
+    if (status == android::NO_ERROR) text = android::String8(wide).c_str();
     return status;
 }
 

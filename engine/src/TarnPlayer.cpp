@@ -13,7 +13,7 @@ constexpr int kLargestPin = 9999;
 orvtarn::RequestHeaders pairsOf(const KeyedVector<String8, String8>* headers) {
     orvtarn::RequestHeaders pairs;
     for (size_t i = 0; headers != nullptr && i < headers->size(); i++) {
-        pairs.emplace_back(headers->keyAt(i).string(), headers->valueAt(i).string());
+        pairs.emplace_back(headers->keyAt(i).c_str(), headers->valueAt(i).c_str());
     }
     return pairs;
 }

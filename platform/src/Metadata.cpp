@@ -1,7 +1,6 @@
 // SPDX-License-Identifier: Apache-2.0
 #include <binder/Parcel.h>
 #include <media/Metadata.h>
-#include <utils/String16.h>
 
 namespace android {
 namespace media {
@@ -9,6 +8,11 @@ namespace media {
 namespace {
 
 constexpr int32_t kMarker = ('M' << 24) | ('E' << 16) | ('T' << 8) | 'A';
+
+enum ValueType : int32_t {
+    INTEGER_VAL = 2,
+    BOOLEAN_VAL = 3,
+};
 
 // Overwrites the length word at begin with the number of bytes since begin,
 // and goes back to the end.
@@ -20,14 +24,9 @@ bool writeLengthAt(Parcel* parcel, size_t begin) {
     return written;
 }
 
-// One record: the length word is known once the value is written.
-template <typename WriteValue>
-bool appendRecord(Parcel* parcel, Metadata::Type key, Metadata::ValueType type,
-                  const WriteValue& writeValue) {
-    const size_t begin = parcel->dataPosition();
-    return parcel->writeInt32(0) == NO_ERROR && parcel->writeInt32(key) == NO_ERROR &&
-           parcel->writeInt32(type) == NO_ERROR && writeValue() == NO_ERROR &&
-           writeLengthAt(parcel, begin);
+bool appendRecord(Parcel* parcel, Metadata::Type key, ValueType type, int32_t value) {
+    const int32_t words[] = {4 * sizeof(int32_t), key, type, value};
+    return parcel->write(words, sizeof(words)) == NO_ERROR;
 }
 
 }  // namespace
@@ -41,16 +40,11 @@ bool Metadata::appendHeader() {
 void Metadata::updateLength() { writeLengthAt(mData, mBegin); }
 
 bool Metadata::appendBool(Type key, bool value) {
-    return appendRecord(mData, key, BOOLEAN_VAL, [&] { return mData->writeInt32(value ? 1 : 0); });
+    return appendRecord(mData, key, BOOLEAN_VAL, value ? 1 : 0);
 }
 
 bool Metadata::appendInt32(Type key, int32_t value) {
-    return appendRecord(mData, key, INTEGER_VAL, [&] { return mData->writeInt32(value); });
-}
-
-bool Metadata::appendString(Type key, const char* utf8) {
-    return appendRecord(mData, key, STRING_VAL,
-                        [&] { return mData->writeString16(String16(utf8)); });
+    return appendRecord(mData, key, INTEGER_VAL, value);
 }
 
 void Metadata::resetParcel() {

@@ -25,7 +25,7 @@ protected:
     std::string text() const {
         std::string all;
         for (size_t i = 0; i < pairs.size(); ++i)
-            all += std::string(pairs.keyAt(i).string()) + "=" + pairs.valueAt(i).string() + ";";
+            all += std::string(pairs.keyAt(i).c_str()) + "=" + pairs.valueAt(i).c_str() + ";";
         return all;
     }
 

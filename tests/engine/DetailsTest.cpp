@@ -6,6 +6,7 @@
 #include <media/Metadata.h>
 #include <orvtarn/Parameters.h>
 #include <stdlib.h>
+#include <utils/String16.h>
 
 #include <algorithm>
 #include <map>
@@ -111,6 +112,11 @@ TEST_F(DetailsTest, MetadataOfAStreamThatIsReadOnce) {
     player->release();
 }
 
+// Types of the platform's metadata values.
+constexpr int kText = 1;
+constexpr int kInteger = 2;
+constexpr int kFlag = 3;
+
 // Keys and value types of the records that getMetadata appends.
 std::map<int, int> recordsOf(TarnPlayer& player, const SortedVector<int>& ids) {
     Parcel records;
@@ -132,14 +138,31 @@ TEST_F(DetailsTest, MetadataRecordsAreThoseAskedFor) {
     using media::Metadata;
     SortedVector<int> ids;
     const std::map<int, int> all = recordsOf(*player, ids);
-    EXPECT_EQ(Metadata::STRING_VAL, all.at(Metadata::kTitle));
-    EXPECT_EQ(Metadata::INTEGER_VAL, all.at(Metadata::kDuration));
-    EXPECT_EQ(Metadata::BOOLEAN_VAL, all.at(Metadata::kSeekAvailable));
+    EXPECT_EQ(kText, all.at(Metadata::kTitle));
+    EXPECT_EQ(kInteger, all.at(Metadata::kDuration));
+    EXPECT_EQ(kFlag, all.at(Metadata::kSeekAvailable));
     EXPECT_EQ(0u, all.count(Metadata::kVideoWidth)) << "there is no video";
     ids.add(Metadata::kTitle);
     ids.add(Metadata::kVideoWidth);
-    const std::map<int, int> one = {{Metadata::kTitle, Metadata::STRING_VAL}};
+    const std::map<int, int> one = {{Metadata::kTitle, kText}};
     EXPECT_EQ(one, recordsOf(*player, ids));
+}
+
+TEST_F(DetailsTest, MetadataTextsAreUtf16AfterTheirOwnLength) {
+    open("tagged.mp3");
+    using media::Metadata;
+    SortedVector<int> ids;
+    ids.add(Metadata::kArtist);
+    Parcel records;
+    ASSERT_EQ(NO_ERROR, player->getMetadata(ids, &records));
+    records.setDataPosition(0);
+    EXPECT_EQ(4 * 4 + 8 * 2, records.readInt32());  // 7 units, one of zero
+    EXPECT_EQ(Metadata::kArtist, records.readInt32());
+    EXPECT_EQ(kText, records.readInt32());
+    String16 artist;
+    EXPECT_EQ(NO_ERROR, records.readString16(&artist));
+    EXPECT_EQ(String16(u"東京交響楽団"), artist);
+    EXPECT_EQ(0u, records.dataAvail());
 }
 
 IORV_PB_CTRL_SET_MEDIA_INFO_T stereo16(bool bigEndian) {

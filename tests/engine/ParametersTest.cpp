@@ -38,7 +38,7 @@ protected:
         EXPECT_EQ(NO_ERROR, player->getParameter(key, &reply));
         reply.setDataPosition(0);
         EXPECT_EQ(NO_ERROR, reply.readString16(&text));
-        return String8(text).string();
+        return String8(text).c_str();
     }
     status_t invoke(int method, int32_t argument) {
         Parcel request;

@@ -32,7 +32,7 @@ std::string text(const KeyedVector<String8, String8>* headers) {
     std::string out = "{";
     for (size_t i = 0; i < headers->size(); i++) {
         if (i != 0) out += ", ";
-        out += std::string(headers->keyAt(i).string()) + ": " + headers->valueAt(i).string();
+        out += std::string(headers->keyAt(i).c_str()) + ": " + headers->valueAt(i).c_str();
     }
     return out + "}";
 }

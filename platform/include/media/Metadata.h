@@ -12,39 +12,45 @@ namespace media {
 
 // Writes metadata records into a parcel. Format, all 32-bit words in native
 // byte order: total length in bytes from the header's start, the marker
-// 'M' 'E' 'T' 'A', then records of {record length, key, type, value}.
+// 'M' 'E' 'T' 'A', then records of {record length, key, type, value}. Types: 1
+// is a UTF-16 text, 2 an integer, 3 a flag. Texts are written by their owners.
 class Metadata {
 public:
     typedef int32_t Type;
-    enum ValueType : int32_t {
-        STRING_VAL = 1,
-        INTEGER_VAL = 2,
-        BOOLEAN_VAL = 3,
-        LONG_VAL = 4,
-        DOUBLE_VAL = 5,
-    };
 
     // Keys of the platform's player metadata.
     static constexpr Type kAny = 0;
-    static constexpr Type kTitle = 1;
-    static constexpr Type kComment = 2;
-    static constexpr Type kCopyright = 3;
-    static constexpr Type kAlbum = 4;
-    static constexpr Type kArtist = 5;
-    static constexpr Type kAuthor = 6;
-    static constexpr Type kComposer = 7;
-    static constexpr Type kGenre = 8;
-    static constexpr Type kDate = 9;
-    static constexpr Type kDuration = 10;
-    static constexpr Type kCdTrackNumber = 11;
-    static constexpr Type kBitRate = 13;
-    static constexpr Type kVideoHeight = 23;
-    static constexpr Type kVideoWidth = 24;
-    static constexpr Type kNumTracks = 25;
-    static constexpr Type kPauseAvailable = 29;
-    static constexpr Type kSeekBackwardAvailable = 30;
-    static constexpr Type kSeekForwardAvailable = 31;
-    static constexpr Type kSeekAvailable = 32;
+    static constexpr Type kPauseAvailable = 1;
+    static constexpr Type kSeekBackwardAvailable = 2;
+    static constexpr Type kSeekForwardAvailable = 3;
+    static constexpr Type kSeekAvailable = 4;
+    static constexpr Type kTitle = 5;
+    static constexpr Type kComment = 6;
+    static constexpr Type kCopyright = 7;
+    static constexpr Type kAlbum = 8;
+    static constexpr Type kArtist = 9;
+    static constexpr Type kAuthor = 10;
+    static constexpr Type kComposer = 11;
+    static constexpr Type kGenre = 12;
+    static constexpr Type kDate = 13;
+    static constexpr Type kDuration = 14;
+    static constexpr Type kCdTrackNum = 15;
+    static constexpr Type kCdTrackMax = 16;
+    static constexpr Type kRating = 17;
+    static constexpr Type kAlbumArt = 18;
+    static constexpr Type kVideoFrame = 19;
+    static constexpr Type kBitRate = 20;
+    static constexpr Type kAudioBitRate = 21;
+    static constexpr Type kVideoBitRate = 22;
+    static constexpr Type kAudioSampleRate = 23;
+    static constexpr Type kVideoframeRate = 24;
+    static constexpr Type kMimeType = 25;
+    static constexpr Type kAudioCodec = 26;
+    static constexpr Type kVideoCodec = 27;
+    static constexpr Type kVideoHeight = 28;
+    static constexpr Type kVideoWidth = 29;
+    static constexpr Type kNumTracks = 30;
+    static constexpr Type kDrmCrippled = 31;
 
     // Starts at the parcel's current position; the parcel must outlive this.
     explicit Metadata(Parcel* parcel);
@@ -56,10 +62,8 @@ public:
 
     bool appendBool(Type key, bool value);
     bool appendInt32(Type key, int32_t value);
-    // UTF-8, zero-terminated; written as UTF-16, as the platform's readers expect.
-    bool appendString(Type key, const char* utf8);
 
-    // Drops the header and everything written behind it.
+    // Drops the header and everything written after it.
     void resetParcel();
 
 private:

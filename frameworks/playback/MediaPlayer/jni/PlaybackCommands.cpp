@@ -3,6 +3,9 @@
 
 #include <media/MediaTrack.h>
 #include <nativehelper/JNIHelp.h>
+#if __has_include(<nativehelper/JNIPlatformHelp.h>)
+#include <nativehelper/JNIPlatformHelp.h>  // file descriptors, from Android 12 on
+#endif
 #include <utils/KeyedVector.h>
 #include <utils/String8.h>
 
@@ -49,7 +52,7 @@ void OrvMediaClient_setDataSourceAndHeaders(JNIEnv* env, jobject thiz, jstring p
     if (!ConvertKeyValueArraysToKeyedVector(env, keys, values, &headers)) return;
 
     const status_t status =
-        service->setDataSource(url.string(), headers.size() > 0 ? &headers : nullptr);
+        service->setDataSource(url.c_str(), headers.size() > 0 ? &headers : nullptr);
     process_media_player_call(env, thiz, status, "java/io/IOException", "setDataSource failed.");
     logLeave(__func__);
 }

@@ -20,7 +20,7 @@ class IOrvStreamSource;
 namespace android {
 
 class IGraphicBufferProducer;
-class IStreamSource;
+struct IStreamSource;
 class Parcel;
 
 // The native service of one Java player. It owns one engine player, guards
