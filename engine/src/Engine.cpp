@@ -37,8 +37,9 @@ TarnPlayer::Engine::Engine(int decoder, orvtarn::Notifier::Deliver deliver)
 }
 
 bool TarnPlayer::Engine::create(bool hardwareDecoder) {
-    return mpv.create(hardwareDecoder) && protocol.install(mpv.get()) && video.create(mpv.get()) &&
-           events.start();
+    if (!mpv.create(hardwareDecoder)) return false;
+    subtitles.readUsualLook();
+    return protocol.install(mpv.get()) && video.create(mpv.get()) && events.start();
 }
 
 void TarnPlayer::Engine::release() {

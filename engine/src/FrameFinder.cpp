@@ -7,6 +7,8 @@
 #include <algorithm>
 #include <iterator>
 
+#include "LibraryVersions.h"
+
 extern "C" {
 #include <libavcodec/avcodec.h>
 #include <libavformat/avformat.h>
@@ -81,10 +83,9 @@ bool FrameFinder::openDecoder() {
 }
 
 int FrameFinder::rotation() const {
-    const uint8_t* matrix = av_stream_get_side_data(mStream, AV_PKT_DATA_DISPLAYMATRIX, nullptr);
+    const int32_t* matrix = displayMatrix(*mStream);
     if (matrix == nullptr) return 0;
-    const double counterclockwise =
-        av_display_rotation_get(reinterpret_cast<const int32_t*>(matrix));
+    const double counterclockwise = av_display_rotation_get(matrix);
     if (isnan(counterclockwise)) return 0;
     const int quarters = static_cast<int>(lround(-counterclockwise / 90));
     return (quarters % 4 + 4) % 4 * 90;

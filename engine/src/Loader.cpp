@@ -15,6 +15,7 @@
 
 #include "EngineLog.h"
 #include "MpvError.h"
+#include "MpvLoad.h"
 #include "StreamMediaSource.h"
 
 namespace orvtarn {
@@ -183,12 +184,12 @@ android::status_t Loader::load() {
     setHeaders();
     details()->tryAgain();
     if (mBeforeLoad) mBeforeLoad();
-    std::string options;
+    MpvOptions options;
     {
         std::lock_guard<std::mutex> lock(mSourceMutex);
-        if (mRawFormat) options = loadfileOptions(*mRawFormat);
+        if (mRawFormat) options = mRawFormat->options;
     }
-    const int error = mMpv.command({"loadfile", media->name().c_str(), "replace", options.c_str()});
+    const int error = loadMedia(mMpv.get(), media->name(), options);
     if (error >= 0) return android::NO_ERROR;
     const android::status_t status = statusOfMpvError(error);
     mState.update([&](PlayerState::Values& v) {

@@ -8,6 +8,7 @@
 #include <mutex>
 
 #include "EngineLog.h"
+#include "LibraryVersions.h"
 
 namespace orvtarn {
 namespace {
@@ -17,20 +18,22 @@ struct Option {
     const char* value;
 };
 
-// Nothing comes from configuration files or from beside the media, nothing is
-// drawn but video and subtitles, and the core stays when a file ends.
-const Option kOptions[] = {
-    {"vo", "libmpv"},
+// Without these nothing plays, or not as the contract has it: frames come to
+// the engine, and the core stays when a file ends.
+const Option kNeeded[] = {
+    {"vo", "libmpv"}, {"idle", "yes"},  {"keep-open", "yes"}, {"keep-open-pause", "no"},
+    {"config", "no"}, {"pause", "yes"}, {"sid", "no"},
+};
+
+// A library that was built without what these are about plays all the same.
+// Nothing comes from beside the media, nothing is drawn but video and subtitles.
+const Option kWished[] = {
     {"audio-client-name", "orvtarn"},
-    {"idle", "yes"},
-    {"keep-open", "yes"},
-    {"keep-open-pause", "no"},
-    {"config", "no"},
     {"terminal", "no"},
     {"osc", "no"},
     {"load-scripts", "no"},
     {"load-auto-profiles", "no"},
-    {"load-osd-console", "no"},
+    {"load-console", "no"},
     {"load-stats-overlay", "no"},
     {"ytdl", "no"},
     {"osd-level", "0"},
@@ -49,9 +52,28 @@ const Option kOptions[] = {
     {"network-timeout", "20"},
     // A connection that broke is taken up again, four times in seven seconds.
     {"stream-lavf-o", "reconnect=1,reconnect_delay_max=4"},
-    {"pause", "yes"},
-    {"sid", "no"},
 };
+
+int setOption(mpv_handle* mpv, const char* name, const char* value) {
+    const int error = mpv_set_option_string(mpv, name, value);
+    const char* former = formerMpvName(name);
+    if (error != MPV_ERROR_OPTION_NOT_FOUND || former == nullptr) return error;
+    return mpv_set_option_string(mpv, former, value);
+}
+
+bool setNeeded(mpv_handle* mpv, const Option& option) {
+    const int error = setOption(mpv, option.name, option.value);
+    if (error == 0) return true;
+    ALOGE("create: mpv refuses %s=%s, which is needed: %s", option.name, option.value,
+          mpv_error_string(error));
+    return false;
+}
+
+void setWished(mpv_handle* mpv, const Option& option) {
+    const int error = setOption(mpv, option.name, option.value);
+    if (error == 0) return;
+    ALOGW("create: mpv refuses %s=%s: %s", option.name, option.value, mpv_error_string(error));
+}
 
 // "null" keeps time where no device is: without it, media without video fail
 // there. ALSA is only asked where it has cards; it complains at length.
@@ -78,15 +100,24 @@ mpv_handle* createWithPointInNumbers() {
 bool MpvHandle::create(bool hardwareDecoder) {
     mHandle = createWithPointInNumbers();
     if (mHandle == nullptr) return refused(__func__, "no playback core");
-    int error = mpv_set_option_string(mHandle, "hwdec", hardwareDecoder ? "auto-copy-safe" : "no");
-    if (error == 0) error = mpv_set_option_string(mHandle, "ao", audioOutputs());
-    for (const Option& option : kOptions) {
-        if (error == 0) error = mpv_set_option_string(mHandle, option.name, option.value);
-    }
-    if (error == 0) error = mpv_initialize(mHandle);
-    if (error == 0) return true;
+    if (setOptions(hardwareDecoder) && initialize()) return true;
     destroy();
-    return refused(__func__, mpv_error_string(error));
+    return false;
+}
+
+bool MpvHandle::setOptions(bool hardwareDecoder) {
+    for (const Option& option : kNeeded) {
+        if (!setNeeded(mHandle, option)) return false;
+    }
+    for (const Option& option : kWished) setWished(mHandle, option);
+    setWished(mHandle, {"hwdec", hardwareDecoder ? "auto-copy-safe" : "no"});
+    setWished(mHandle, {"ao", audioOutputs()});
+    return true;
+}
+
+bool MpvHandle::initialize() {
+    const int error = mpv_initialize(mHandle);
+    return error == 0 || refused("create", mpv_error_string(error));
 }
 
 void MpvHandle::destroy() {

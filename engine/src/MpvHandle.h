@@ -31,7 +31,7 @@ private:
 class MpvHandle {
 public:
     // Creates and initialises the core with the options every player has.
-    // False without memory or with a library that refuses them.
+    // False without memory or with a library that refuses a needed one.
     bool create(bool hardwareDecoder);
     // Ends the core; its streams are closed and its threads gone afterwards.
     void destroy();
@@ -57,6 +57,9 @@ public:
     int seek(double seconds, const char* flags);
 
 private:
+    bool setOptions(bool hardwareDecoder);
+    bool initialize();
+
     mpv_handle* mHandle = nullptr;
 };
 

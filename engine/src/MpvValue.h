@@ -4,6 +4,7 @@
 #include <mpv/client.h>
 #include <stdint.h>
 
+#include <optional>
 #include <string>
 #include <variant>
 
@@ -16,7 +17,11 @@ struct MpvAssignment {
     std::variant<double, int64_t, std::string> value;
 };
 
-// Sets the property. 0 or an mpv_error.
+// What the property is set to now, in mpv's own type for it.
+std::optional<MpvAssignment> currentValue(mpv_handle* mpv, const char* property);
+
+// Sets the property. 0 or an mpv_error. Both know a property by its name in the
+// newest mpv.
 int assign(mpv_handle* mpv, const MpvAssignment& assignment);
 
 }  // namespace orvtarn

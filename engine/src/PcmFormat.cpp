@@ -102,14 +102,4 @@ bool pcmFormat(const IORV_PB_CTRL_SET_MEDIA_INFO_T& info, PcmFormat& format, std
     return true;
 }
 
-std::string loadfileOptions(const PcmFormat& format) {
-    std::string text;
-    for (const auto& [name, value] : format.options) {
-        if (!text.empty()) text += ',';
-        // Told by its length, a value may hold the separators itself.
-        text += name + "=%" + std::to_string(value.size()) + "%" + value;
-    }
-    return text;
-}
-
 }  // namespace orvtarn

@@ -5,15 +5,14 @@
 #include <stdint.h>
 
 #include <string>
-#include <utility>
-#include <vector>
+
+#include "MpvLoad.h"
 
 namespace orvtarn {
 
 // How mpv is told to read a stream of raw samples.
 struct PcmFormat {
-    // Options of "loadfile", names and values as they are (not quoted).
-    std::vector<std::pair<std::string, std::string>> options;
+    MpvOptions options;
     int bytesPerSecond = 0;
     int64_t durationMs = 0;  // 0 when the description does not tell
 };
@@ -22,8 +21,5 @@ struct PcmFormat {
 // format, or false with the reason, such as "blockAlign is 3, must be 4": a
 // wrong description would play as noise.
 bool pcmFormat(const IORV_PB_CTRL_SET_MEDIA_INFO_T& info, PcmFormat& format, std::string& reason);
-
-// The options as the third argument of the command "loadfile", values quoted.
-std::string loadfileOptions(const PcmFormat& format);
 
 }  // namespace orvtarn

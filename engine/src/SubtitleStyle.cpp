@@ -10,34 +10,30 @@
 namespace orvtarn {
 namespace {
 
-// Sizes of mpv's sub-font-size, which counts pixels on a picture of 720 rows.
-const int64_t kSmallFont = 40;
-const int64_t kMediumFont = 55;
-const int64_t kLargeFont = 75;
+// Sizes of mpv's sub-font-size, which counts pixels on a picture of 720 rows,
+// beside the medium one, which is mpv's own.
+const double kSmallFont = 40.0 / 55;
+const double kLargeFont = 75.0 / 55;
 
 // mpv lays plain-text subtitles out on a canvas 960 units wide and takes
 // margins of up to 300.
 const double kCanvasWidth = 960;
 const int64_t kMaxMargin = 300;
-const int64_t kUsualMargin = 25;
 
 const int64_t kUsualPosition = 100;  // percent of the picture's height
 const int64_t kMaxPosition = 150;
 
-// The number of mpv for a font, or 0 for one that is refused.
-int64_t fontSize(const Subtitle_FontInfo& font) {
-    switch (font.mFontSizeType) {
-        case ORV_SUBTITLE_FONT_SMALL:
-            return kSmallFont;
-        case ORV_SUBTITLE_FONT_MEDIUM:
-            return kMediumFont;
-        case ORV_SUBTITLE_FONT_LARGE:
-            return kLargeFont;
-        case ORV_SUBTITLE_FONT_CUSTOM:
-            return font.mCustomSize;
-        default:
-            return 0;
-    }
+// All that an attribute may change.
+const char* const kLook[] = {
+    "sub-delay", "sub-ass-override",  "sub-font-size", "sub-back-color",
+    "sub-color", "sub-outline-color", "sub-align-x",   "sub-margin-x",
+    "sub-pos",
+};
+
+int64_t integerOf(const MpvAssignment& assignment) {
+    if (const double* number = std::get_if<double>(&assignment.value)) return std::llround(*number);
+    const int64_t* integer = std::get_if<int64_t>(&assignment.value);
+    return integer != nullptr ? *integer : 0;
 }
 
 bool isTimeOffset(const Subtitle_TimeOffset& offset) {
@@ -65,11 +61,6 @@ int64_t marginOf(int x) {
     return std::min<int64_t>(std::llround(std::abs(x) * kCanvasWidth / 1000), kMaxMargin);
 }
 
-void addHorizontal(int x, std::vector<MpvAssignment>& style) {
-    style.push_back({"sub-align-x", std::string(x > 0 ? "left" : x < 0 ? "right" : "center")});
-    style.push_back({"sub-margin-x", x == 0 ? kUsualMargin : marginOf(x)});
-}
-
 void addVertical(int y, std::vector<MpvAssignment>& style) {
     const int64_t position = kUsualPosition + std::lround(y / 10.0);
     style.push_back({"sub-pos", std::clamp<int64_t>(position, 0, kMaxPosition)});
@@ -86,9 +77,30 @@ bool put(const void* record, std::optional<Record>& place, Check check) {
 
 }  // namespace
 
+// The number of mpv for a font, or 0 for one that is refused.
+int64_t SubtitleStyle::fontSize(const Subtitle_FontInfo& font) const {
+    switch (font.mFontSizeType) {
+        case ORV_SUBTITLE_FONT_SMALL:
+            return std::llround(mMediumFont * kSmallFont);
+        case ORV_SUBTITLE_FONT_MEDIUM:
+            return mMediumFont;
+        case ORV_SUBTITLE_FONT_LARGE:
+            return std::llround(mMediumFont * kLargeFont);
+        case ORV_SUBTITLE_FONT_CUSTOM:
+            return font.mCustomSize;
+        default:
+            return 0;
+    }
+}
+
+void SubtitleStyle::addHorizontal(int x, std::vector<MpvAssignment>& style) const {
+    style.push_back({"sub-align-x", std::string(x > 0 ? "left" : x < 0 ? "right" : "center")});
+    style.push_back({"sub-margin-x", x == 0 ? mUsualMargin : marginOf(x)});
+}
+
 bool SubtitleStyle::stage(int type, const void* record) {
     const auto anyColor = [](const Subtitle_Color&) { return true; };
-    const auto knownFont = [](const Subtitle_FontInfo& font) { return fontSize(font) != 0; };
+    const auto knownFont = [this](const Subtitle_FontInfo& font) { return fontSize(font) != 0; };
     if (record == nullptr) return false;
     switch (type) {
         case E_SUBTITLE_ATTR_TYPE_TIME_OFFSET:
@@ -118,7 +130,7 @@ std::vector<MpvAssignment> SubtitleStyle::flush() {
     if (mFontInfo) style.push_back({"sub-font-size", fontSize(*mFontInfo)});
     if (mBackColor) style.push_back({"sub-back-color", colorText(*mBackColor)});
     if (mTextColor) style.push_back({"sub-color", colorText(*mTextColor)});
-    if (mEdgeColor) style.push_back({"sub-border-color", colorText(*mEdgeColor)});
+    if (mEdgeColor) style.push_back({"sub-outline-color", colorText(*mEdgeColor)});
     if (mDisplayOffset) {
         addHorizontal(mDisplayOffset->mTimeOffsetType, style);
         addVertical(mDisplayOffset->mOffsetValue, style);
@@ -127,18 +139,24 @@ std::vector<MpvAssignment> SubtitleStyle::flush() {
     return style;
 }
 
-void SubtitleStyle::clear() { *this = SubtitleStyle(); }
+void SubtitleStyle::clear() {
+    mTimeOffset.reset();
+    mFontInfo.reset();
+    mBackColor.reset();
+    mTextColor.reset();
+    mEdgeColor.reset();
+    mDisplayOffset.reset();
+}
 
-std::vector<MpvAssignment> SubtitleStyle::defaults() {
-    return {{"sub-delay", 0.0},
-            {"sub-ass-override", std::string("yes")},
-            {"sub-font-size", kMediumFont},
-            {"sub-back-color", colorText({0, 0, 0, 0})},
-            {"sub-color", colorText({255, 255, 255, 255})},
-            {"sub-border-color", colorText({255, 0, 0, 0})},
-            {"sub-align-x", std::string("center")},
-            {"sub-margin-x", kUsualMargin},
-            {"sub-pos", kUsualPosition}};
+void SubtitleStyle::readUsual(mpv_handle* mpv) {
+    mUsual.clear();
+    for (const char* property : kLook) {
+        const std::optional<MpvAssignment> now = currentValue(mpv, property);
+        if (!now) continue;
+        mUsual.push_back(*now);
+        if (now->property == "sub-font-size") mMediumFont = integerOf(*now);
+        if (now->property == "sub-margin-x") mUsualMargin = integerOf(*now);
+    }
 }
 
 }  // namespace orvtarn

@@ -27,10 +27,18 @@ public:
     // Forgets the staged records.
     void clear();
 
-    // What brings a player's subtitles back to their usual look.
-    static std::vector<MpvAssignment> defaults();
+    // Takes a fresh core's look for the usual one: releases of mpv differ.
+    void readUsual(mpv_handle* mpv);
+    // What brings subtitles back to their usual look.
+    const std::vector<MpvAssignment>& usual() const { return mUsual; }
 
 private:
+    void addHorizontal(int x, std::vector<MpvAssignment>& style) const;
+    int64_t fontSize(const Subtitle_FontInfo& font) const;
+
+    std::vector<MpvAssignment> mUsual;
+    int64_t mMediumFont = 55;
+    int64_t mUsualMargin = 25;
     std::optional<Subtitle_TimeOffset> mTimeOffset;
     std::optional<Subtitle_FontInfo> mFontInfo;
     std::optional<Subtitle_Color> mBackColor;

@@ -82,6 +82,11 @@ void Subtitles::addToMedia() {
     }
 }
 
+void Subtitles::readUsualLook() {
+    std::lock_guard<std::mutex> lock(mMutex);
+    mStyle.readUsual(mMpv.get());
+}
+
 bool Subtitles::stage(int type, const void* record) {
     std::lock_guard<std::mutex> lock(mMutex);
     return mStyle.stage(type, record) || refused("setSubtitleAttr", "no such type or value");
@@ -101,7 +106,7 @@ void Subtitles::reset() {
     std::lock_guard<std::mutex> lock(mMutex);
     mFiles.clear();
     mStyle.clear();
-    for (const MpvAssignment& assignment : SubtitleStyle::defaults()) {
+    for (const MpvAssignment& assignment : mStyle.usual()) {
         assign(mMpv.get(), assignment);
     }
 }

@@ -29,6 +29,8 @@ public:
     // A VobSub pair; the two may lie in different folders.
     android::status_t addPair(const char* sub, const char* idx);
 
+    // Of a core that nothing was set on yet.
+    void readUsualLook();
     bool stage(int type, const void* record);
     bool flush();
 

@@ -12,6 +12,7 @@ namespace orvtest {
 namespace {
 
 std::atomic<bool> gNoNewCore{false};
+std::atomic<const char*> gUnknownOption{nullptr};
 std::atomic<int> gQuestions{0};
 
 bool isRendering() {
@@ -30,6 +31,9 @@ Function* original(const char* name) {
 NoNewCore::NoNewCore() { gNoNewCore = true; }
 NoNewCore::~NoNewCore() { gNoNewCore = false; }
 
+UnknownOption::UnknownOption(const char* name) { gUnknownOption = name; }
+UnknownOption::~UnknownOption() { gUnknownOption = nullptr; }
+
 int questionsWhileRendering() { return gQuestions; }
 
 }  // namespace orvtest
@@ -39,6 +43,14 @@ int questionsWhileRendering() { return gQuestions; }
 mpv_handle* mpv_create() {
     static const auto create = orvtest::original<mpv_handle*()>("mpv_create");
     return orvtest::gNoNewCore ? nullptr : create();
+}
+
+int mpv_set_option_string(mpv_handle* mpv, const char* name, const char* value) {
+    static const auto set =
+        orvtest::original<int(mpv_handle*, const char*, const char*)>("mpv_set_option_string");
+    const char* unknown = orvtest::gUnknownOption;
+    if (unknown != nullptr && strcmp(unknown, name) == 0) return MPV_ERROR_OPTION_NOT_FOUND;
+    return set(mpv, name, value);
 }
 
 int mpv_get_property(mpv_handle* mpv, const char* name, mpv_format format, void* data) {

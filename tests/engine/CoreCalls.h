@@ -12,6 +12,16 @@ public:
     NoNewCore& operator=(const NoNewCore&) = delete;
 };
 
+// While it lives, cores that are created know no such option. The name must
+// outlive it.
+class UnknownOption {
+public:
+    explicit UnknownOption(const char* name);
+    ~UnknownOption();
+    UnknownOption(const UnknownOption&) = delete;
+    UnknownOption& operator=(const UnknownOption&) = delete;
+};
+
 // How often a rendering thread of any player has asked the core for a value so
 // far, which may stop the core for as long as it waits for that thread.
 int questionsWhileRendering();

@@ -44,6 +44,38 @@ TEST_F(CoreTest, RenderingAsksTheCoreNothing) {
     EXPECT_EQ(0, questionsWhileRendering());
 }
 
+bool playsMedia(TarnPlayer& player) {
+    return player.setDataSource(mediaPath("feature.mkv").c_str(), nullptr) == NO_ERROR &&
+           player.prepare() == NO_ERROR;
+}
+
+TEST_F(CoreTest, ThisMachinesCoreTakesEveryOption) {
+    LogCapture log;
+    sp<TarnPlayer> other = new TarnPlayer(-1);
+    EXPECT_THAT(log.lines("TarnPlayer"), testing::IsEmpty());
+    EXPECT_TRUE(playsMedia(*other));
+}
+
+TEST_F(CoreTest, AnOptionThatIsOnlyWishedForCostsALine) {
+    LogCapture log;
+    UnknownOption unknown("ytdl");
+    sp<TarnPlayer> other = new TarnPlayer(-1);
+    EXPECT_THAT(log.lines("TarnPlayer"),
+                LinesAre({warning("create: mpv refuses ytdl=no: option not found")}));
+    EXPECT_TRUE(playsMedia(*other));
+}
+
+TEST_F(CoreTest, WithoutAnOptionThatIsNeededAPlayerIsAsReleased) {
+    LogCapture log;
+    UnknownOption unknown("keep-open");
+    sp<TarnPlayer> other = new TarnPlayer(-1);
+    EXPECT_THAT(log.lines("TarnPlayer"),
+                LinesAre({error("create: mpv refuses keep-open=yes, which is needed: option not "
+                                "found")}));
+    EXPECT_FALSE(playsMedia(*other));
+    EXPECT_EQ(NO_ERROR, other->release());
+}
+
 TEST_F(CoreTest, WithoutACoreAPlayerIsAsReleased) {
     LogCapture log;
     NoNewCore failure;

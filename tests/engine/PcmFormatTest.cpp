@@ -61,9 +61,11 @@ TEST(PcmFormat, DescribesSixteenBitSound) {
     PcmFormat format;
     std::string reason;
     ASSERT_TRUE(pcmFormat(description(E_ORV_PCM_TYPE_SIGNED, 16, 2, 44100, true), format, reason));
-    EXPECT_EQ(loadfileOptions(format),
-              "demuxer=%8%rawaudio,demuxer-rawaudio-format=%5%s16be,"
-              "demuxer-rawaudio-rate=%5%44100,demuxer-rawaudio-channels=%1%2");
+    const MpvOptions expected = {{"demuxer", "rawaudio"},
+                                 {"demuxer-rawaudio-format", "s16be"},
+                                 {"demuxer-rawaudio-rate", "44100"},
+                                 {"demuxer-rawaudio-channels", "2"}};
+    EXPECT_EQ(format.options, expected);
     EXPECT_EQ(format.bytesPerSecond, 176400);
 }
 
@@ -84,7 +86,7 @@ TEST(PcmFormat, IsPlayedAsDescribed) {
             ASSERT_NE(file, nullptr);
             ASSERT_EQ(fwrite(samples.data(), 1, samples.size(), file), samples.size());
             fclose(file);
-            ASSERT_TRUE(player.load(path, loadfileOptions(format)));
+            ASSERT_TRUE(player.load(path, format.options));
             EXPECT_EQ(player.text("track-list/0/codec"), one.codec);
             EXPECT_EQ(player.text("track-list/0/demux-samplerate"), "32000");
             EXPECT_EQ(player.text("track-list/0/demux-channel-count"), std::to_string(channels));

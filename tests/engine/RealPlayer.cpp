@@ -27,9 +27,8 @@ RealPlayer::RealPlayer() {
 
 RealPlayer::~RealPlayer() { mpv_terminate_destroy(mMpv); }
 
-bool RealPlayer::load(const std::string& path, const std::string& options) {
-    const char* command[] = {"loadfile", path.c_str(), "replace", options.c_str(), nullptr};
-    if (mpv_command(mMpv, command) < 0) return false;
+bool RealPlayer::load(const std::string& path, const orvtarn::MpvOptions& options) {
+    if (orvtarn::loadMedia(mMpv, path, options) < 0) return false;
     for (;;) {
         const mpv_event* event = mpv_wait_event(mMpv, 10);
         if (event->event_id == MPV_EVENT_PLAYBACK_RESTART) return true;

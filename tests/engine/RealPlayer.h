@@ -5,6 +5,8 @@
 
 #include <string>
 
+#include "MpvLoad.h"
+
 namespace orvtest {
 
 // A player of libmpv without screen and loudspeaker, to see what it makes of
@@ -17,9 +19,9 @@ public:
     RealPlayer& operator=(const RealPlayer&) = delete;
 
     mpv_handle* handle() { return mMpv; }
-    // Opens a file, paused, with options as "loadfile" takes them. Waits at
-    // most ten seconds. False when it cannot be opened.
-    bool load(const std::string& path, const std::string& options = "");
+    // Opens a file, paused. Waits at most ten seconds. False when it cannot be
+    // opened.
+    bool load(const std::string& path, const orvtarn::MpvOptions& options = {});
     bool command(const char* name, const char* first, const char* second);
     // Empty when unavailable.
     std::string text(const std::string& property);

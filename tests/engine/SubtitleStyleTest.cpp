@@ -87,7 +87,7 @@ TEST(SubtitleStyle, SetsEachColor) {
     EXPECT_THAT(color(E_SUBTITLE_ATTR_TYPE_TEXT_COLOR),
                 ElementsAre("sub-ass-override=force", "sub-color=#8001FE0C"));
     EXPECT_THAT(color(E_SUBTITLE_ATTR_TYPE_EDGE_COLOR),
-                ElementsAre("sub-ass-override=force", "sub-border-color=#8001FE0C"));
+                ElementsAre("sub-ass-override=force", "sub-outline-color=#8001FE0C"));
 }
 
 TEST(SubtitleStyle, MovesTheText) {
@@ -117,7 +117,7 @@ TEST(SubtitleStyle, GivesStagedRecordsOutOnceAndTogether) {
     EXPECT_TRUE(style.stage(E_SUBTITLE_ATTR_TYPE_TIME_OFFSET, &later));
     EXPECT_THAT(texts(style.flush()),
                 ElementsAre("sub-delay=2.000000", "sub-ass-override=force", "sub-color=#FF010203",
-                            "sub-border-color=#FF010203"));
+                            "sub-outline-color=#FF010203"));
     EXPECT_THAT(style.flush(), IsEmpty());
 }
 
@@ -185,13 +185,39 @@ TEST(SubtitleStyle, IsTakenByThePlayer) {
     }
 }
 
-TEST(SubtitleStyle, KnowsThePlayersOwnDefaults) {
+TEST(SubtitleStyle, GoesBackToThePlayersOwnLook) {
     orvtest::RealPlayer fresh;
     orvtest::RealPlayer restyled;
-    for (const MpvAssignment& one : SubtitleStyle::defaults()) {
-        EXPECT_EQ(assign(restyled.handle(), one), 0) << one.property;
-        EXPECT_EQ(restyled.text(one.property), fresh.text(one.property)) << one.property;
+    SubtitleStyle style;
+    style.readUsual(fresh.handle());
+    ASSERT_EQ(style.usual().size(), 9u);
+    for (const char* property : {"sub-font-size", "sub-margin-x", "sub-pos"}) {
+        EXPECT_EQ(assign(restyled.handle(), {property, int64_t{77}}), 0) << property;
     }
+    EXPECT_EQ(assign(restyled.handle(), {"sub-outline-color", std::string("#80010203")}), 0);
+    for (const MpvAssignment& one : style.usual()) {
+        EXPECT_EQ(assign(restyled.handle(), one), 0) << one.property;
+        const std::optional<MpvAssignment> now =
+            currentValue(restyled.handle(), one.property.c_str());
+        ASSERT_TRUE(now.has_value()) << one.property;
+        EXPECT_EQ(texts({*now}), texts({one}));
+    }
+}
+
+TEST(SubtitleStyle, MeasuresFontsByThePlayersOwn) {
+    orvtest::RealPlayer player;
+    ASSERT_EQ(assign(player.handle(), {"sub-font-size", int64_t{110}}), 0);
+    SubtitleStyle style;
+    style.readUsual(player.handle());
+    const auto sizeOf = [&](int32_t type) {
+        Subtitle_FontInfo record;
+        record.mFontSizeType = type;
+        EXPECT_TRUE(style.stage(E_SUBTITLE_ATTR_TYPE_FONT_INFO, &record));
+        return texts(style.flush()).back();
+    };
+    EXPECT_EQ(sizeOf(ORV_SUBTITLE_FONT_SMALL), "sub-font-size=80");
+    EXPECT_EQ(sizeOf(ORV_SUBTITLE_FONT_MEDIUM), "sub-font-size=110");
+    EXPECT_EQ(sizeOf(ORV_SUBTITLE_FONT_LARGE), "sub-font-size=150");
 }
 
 }  // namespace

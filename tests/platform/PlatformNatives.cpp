@@ -10,12 +10,17 @@
 #include <gui/Surface.h>
 #include <jni.h>
 #include <nativehelper/JNIHelp.h>
+#if __has_include(<nativehelper/JNIPlatformHelp.h>)
+#include <nativehelper/JNIPlatformHelp.h>
+#endif
 #include <nativehelper/ScopedUtfChars.h>
 #include <utils/String16.h>
 
 #include <mutex>
 #include <string>
 #include <vector>
+
+#include "LogSink.h"
 
 using namespace android;
 
@@ -24,9 +29,10 @@ namespace {
 std::mutex sLogLock;
 std::string sLog;
 
-void captureLine(const __android_logger_data* data, const char* message) {
+bool takeLine(const orvtest::SinkLine& line) {
     std::lock_guard<std::mutex> lock(sLogLock);
-    sLog += std::string(data->tag) + ": " + message + "\n";
+    sLog += std::string(line.tag) + ": " + line.text + "\n";
+    return true;
 }
 
 std::vector<std::string> stringsOf(JNIEnv* env, jobjectArray array) {
@@ -64,7 +70,7 @@ NATIVE(jint, registerNatives)
         methods.push_back(
             {nameTexts[i].c_str(), signatureTexts[i].c_str(), reinterpret_cast<void*>(doNothing)});
     }
-    __android_log_set_logger(captureLine);
+    orvtest::installLogSink<takeLine>();
     const int result = AndroidRuntime::registerNativeMethods(env, path.c_str(), methods.data(),
                                                              static_cast<int>(methods.size()));
     __android_log_set_logger(__android_log_stderr_logger);

@@ -8,24 +8,24 @@
 #include <chrono>
 #include <ostream>
 
+#include "LogSink.h"
+
 namespace orvtest {
 namespace {
 
 std::mutex sCurrentMutex;
 LogCapture* sCurrent = nullptr;
 
-void sink(const __android_logger_data* data, const char* message) {
+bool takeLine(const SinkLine& line) {
     std::function<void()> action;
     {
         std::lock_guard<std::mutex> lock(sCurrentMutex);
-        if (sCurrent == nullptr) {
-            __android_log_stderr_logger(data, message);
-            return;
-        }
-        action = sCurrent->add({data->priority, data->tag == nullptr ? "" : data->tag, message,
+        if (sCurrent == nullptr) return false;
+        action = sCurrent->add({line.priority, line.tag == nullptr ? "" : line.tag, line.text,
                                 std::this_thread::get_id()});
     }
     if (action) action();  // it may log
+    return true;
 }
 
 // Both return the character behind what they matched, or null.
@@ -153,7 +153,7 @@ ExpectedLine error(const std::string& text) { return {ANDROID_LOG_ERROR, text, "
 
 LogCapture::LogCapture() {
     // Not under the lock: the log holds one of its own when it calls the sink.
-    __android_log_set_logger(sink);
+    installLogSink<takeLine>();
     __android_log_set_minimum_priority(ANDROID_LOG_VERBOSE);
     std::lock_guard<std::mutex> lock(sCurrentMutex);
     if (sCurrent != nullptr) ADD_FAILURE() << "a log capture lives already";
