@@ -144,6 +144,7 @@ bool startJavaSilently() {
     unsetenv("ORV_LOG");
     __android_log_set_minimum_priority(ANDROID_LOG_SILENT);
     return startJava({"-Djava.class.path=" ORV_BENCH_CLASS_PATH,
+                      "--enable-native-access=ALL-UNNAMED",
                       "-Djava.library.path=" ORV_BENCH_LIBRARY_PATH,
                       "-Dorv.bench.media=" ORV_BENCH_MEDIA, "-XX:+UseSerialGC"}) == JNI_OK;
 }

@@ -14,7 +14,14 @@ if(NOT CMAKE_BUILD_TYPE)
 endif()
 
 add_library(orv_warnings INTERFACE)
-target_compile_options(orv_warnings INTERFACE -Wall -Wextra -Werror)
+target_compile_options(orv_warnings INTERFACE -Wall -Wextra)
+
+# Warnings end the build of those who change the project, by
+# CMAKE_COMPILE_WARNING_AS_ERROR; others may have a compiler that finds more.
+set(ORV_JAVA_FLAGS --release 17 -encoding UTF-8 -Xlint:all)
+if(CMAKE_COMPILE_WARNING_AS_ERROR)
+  list(APPEND ORV_JAVA_FLAGS -Werror)
+endif()
 
 # Debian's Android libraries: utils, log and nativehelper. Their headers warn,
 # so they are system headers; jni.h stands in a folder of its own.

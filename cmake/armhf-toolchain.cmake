@@ -48,7 +48,7 @@ set(CMAKE_CROSSCOMPILING_EMULATOR
 # choice of heap and compilers, the emulated optimizing compiler now and then ran
 # out of memory with most of the address space free; smaller ones do not.
 set(ORV_JAVA_RUNTIME
-  ${CMAKE_CROSSCOMPILING_EMULATOR} ${ORV_SYSROOT}/usr/lib/jvm/java-17-openjdk-armhf/bin/java
+  ${CMAKE_CROSSCOMPILING_EMULATOR} ${ORV_SYSROOT}/usr/lib/jvm/default-java/bin/java
   -Xmx256m -XX:ReservedCodeCacheSize=48m -XX:TieredStopAtLevel=1
   -Djava.io.tmpdir=/dev/shm -Djdk.lang.Process.launchMechanism=FORK)
 # Emulated programs are slow to start: their tests are listed when ctest runs.

@@ -1,7 +1,7 @@
 # SPDX-License-Identifier: Apache-2.0
 # shellcheck shell=bash
 # help: doctor [--engine LIB | --classes JAR]    what this machine, an engine library or the Java classes lack
-use packages doctor
+use packages java libraries doctor
 
 case $# in
 0) check_machine ;;

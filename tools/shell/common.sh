@@ -14,10 +14,13 @@ die_usage() {
     exit 2
 }
 
-# use packages build …: reads those helpers of tools/shell.
+# use packages build …: reads those helpers of tools/shell, each once.
+USED=' '
 use() {
     local name
     for name in "$@"; do
+        case $USED in *" $name "*) continue ;; esac
+        USED+="$name "
         # shellcheck disable=SC1090
         . "$ORV_ROOT/tools/shell/$name.sh"
     done

@@ -8,7 +8,7 @@ row() { printf '%-10s %-8s %s\n' "$@"; }
 
 check_machine() {
     local bad=0 check
-    for check in packages java display sound; do
+    for check in packages java libraries display sound; do
         "check_$check" || bad=1
     done
     return $bad
@@ -31,17 +31,31 @@ check_packages() {
 }
 
 check_java() {
-    local version
-    if ! command -v javac >/dev/null; then
-        row java missing "there is no JDK; ./orv play installs openjdk-17-jdk"
+    local jdk
+    jdk=$(find_jdk)
+    if [ -z "$jdk" ]; then
+        row java missing "$(jdk_complaint); ./orv play installs default-jdk"
         return 1
     fi
-    version=$(javac -version 2>&1 | awk '{print $2}')
-    if [ "${version%%.*}" -lt 17 ] 2>/dev/null; then
-        row java old "javac is version $version; 17 or newer is needed, see update-alternatives --config javac"
+    row java ok "JDK $(java_version_of "$jdk") in $jdk"
+}
+
+check_libraries() {
+    local complaint library version found=()
+    complaint=$(mpv_complaint)
+    if [ -n "$complaint" ]; then
+        row libraries old "$complaint"
         return 1
     fi
-    row java ok "JDK $version"
+    for library in mpv libavformat libavcodec libavutil libswscale; do
+        version=$(library_version "$library")
+        [ -z "$version" ] || found+=("$library $version")
+    done
+    if [ ${#found[@]} -eq 0 ]; then
+        row libraries missing "mpv and libav are not here; ./orv play installs them"
+        return 1
+    fi
+    row libraries ok "$(printf '%s\n' "${found[@]}" | paste -sd, | sed 's/,/, /g')"
 }
 
 check_display() {

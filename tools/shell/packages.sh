@@ -2,12 +2,21 @@
 # shellcheck shell=bash
 # Installs the Debian packages that are missing. The lists are
 # tools/packages-NAME.txt: a package a line, then what it is for; # comments.
+# @NAME@ stands for what tools/releases.txt says of this machine's release.
+use release java
 
 list_packages() {
     local name
     for name in "$@"; do
-        sed -e 's/#.*//' -e '/^[[:space:]]*$/d' "$ORV_ROOT/tools/packages-$name.txt"
+        read_package_list "$ORV_ROOT/tools/packages-$name.txt"
     done
+}
+
+# read_package_list FILE
+read_package_list() {
+    sed -e 's/#.*//' -e '/^[[:space:]]*$/d' \
+        -e "s/@jdk@/$(release_value "$(this_release)" jdk)/" \
+        -e "s/@gcc@/$(release_value "$(this_release)" gcc)/" "$1"
 }
 
 # Prints the lines of the lists whose package is not installed: one question
@@ -15,6 +24,8 @@ list_packages() {
 missing_packages() {
     local lines names installed
     lines=$(list_packages "$@")
+    # Any fit JDK will do, wherever it is from.
+    [ -z "$(find_jdk)" ] || lines=$(grep -v '^default-jdk' <<<"$lines")
     mapfile -t names < <(awk '{print $1}' <<<"$lines")
     installed=$(dpkg-query -W -f '${db:Status-Status} ${Package}\n' "${names[@]}" 2>/dev/null || true)
     awk 'NR == FNR { if ($1 == "installed") have[$2] = 1; next } !($1 in have)' \
@@ -26,12 +37,12 @@ need_packages() {
     local why=$1 missing names
     shift
     [ -z "${ORV_NO_INSTALL:-}" ] || return 0
-    command -v apt-get >/dev/null || die \
-        "this system has no apt-get. Install what these name in your system's way," \
-        "then set ORV_NO_INSTALL=1:$(printf ' tools/packages-%s.txt' "$@")"
     missing=$(missing_packages "$@")
     [ -n "$missing" ] || return 0
     mapfile -t names < <(awk '{print $1}' <<<"$missing")
+    is_supported_release || die \
+        "this is $(this_system); ./orv installs packages on Debian $(supported_numbers) alone." \
+        "Install in your system's way what Debian calls ${names[*]}, then set ORV_NO_INSTALL=1."
     say "installing ${#names[@]} Debian package(s) needed to $why: $(describe_packages <<<"$missing")"
     install_packages "${names[@]}"
 }

@@ -19,8 +19,8 @@ run_player() {
 set_java_command() {
     local jars=$ORV_BUILD/java share=/usr/share/java
     # An archive is one Java's; after an update of Java another is made.
-    CLASS_ARCHIVE=$jars/player-$(stat -Lc '%Z-%s' -- "$(command -v java)").jsa
-    JAVA_COMMAND=(java -XX:TieredStopAtLevel=1 -XX:+UseSerialGC
+    CLASS_ARCHIVE=$jars/player-$(stat -Lc '%Z-%s' -- "$JAVA_HOME/bin/java").jsa
+    JAVA_COMMAND=("$JAVA_HOME/bin/java" --enable-native-access=ALL-UNNAMED -XX:TieredStopAtLevel=1 -XX:+UseSerialGC
         -Xshare:auto "-XX:SharedArchiveFile=$CLASS_ARCHIVE" -Xlog:disable -Xlog:all=error:stderr
         "-Djava.library.path=$ORV_BUILD/lib"
         "-Dorv.sample=$ORV_BUILD/media/sample.mkv" "-Dorv.make-sample=$ORV_ROOT/tools/make-sample"

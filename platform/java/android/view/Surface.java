@@ -20,11 +20,13 @@ public class Surface {
     private final Cleaner.Cleanable mCleanable;
 
     /** Makes a surface without a consumer: a player refuses to draw on it. */
+    @SuppressWarnings("this-escape")
     public Surface() {
         this(0);
     }
 
-    // Also called from native code, by this signature.
+    // Also called from native code, by this signature. The cleaner keeps no hold on the object.
+    @SuppressWarnings("this-escape")
     private Surface(long producer) {
         long surface = nativeCreate(producer);
         if (surface == 0) {

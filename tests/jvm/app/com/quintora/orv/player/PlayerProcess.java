@@ -28,6 +28,7 @@ public final class PlayerProcess implements AutoCloseable {
         err = folder.resolve("err");
         List<String> command =
                 new ArrayList<>(List.of(System.getProperty("orv.test.java").split("\\|")));
+        command.add("--enable-native-access=ALL-UNNAMED");
         command.add("-Djava.library.path=" + System.getProperty("java.library.path"));
         command.add("-Dorv.columns=80");
         command.addAll(
