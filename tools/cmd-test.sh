@@ -1,15 +1,18 @@
 # SPDX-License-Identifier: Apache-2.0
 # shellcheck shell=bash
-# help: test [--target native|armhf|all] [--filter REGEX] [--no-lint]    every test; a filter runs those whose names match, natively unless a target is given
+# help: test [--target native|armhf|all | --release NAME] [--filter REGEX] [--no-lint]    every test; a filter runs those whose names match, natively unless a target is given; --release plays and tests in a root of that Debian release
 use packages build lint
 
 target=
+release=
 filter=
 with_lint=yes
 while [ $# -gt 0 ]; do
     case $1 in
     --target) target=${2:-} && shift ;;
     --target=*) target=${1#*=} ;;
+    --release) release=${2:-} && shift ;;
+    --release=*) release=${1#*=} ;;
     --filter) filter=${2:-} && shift ;;
     --filter=*) filter=${1#*=} ;;
     --no-lint) with_lint= ;;
@@ -44,6 +47,9 @@ on_some_display() {
 test_armhf() {
     "$ORV_ROOT/tools/armhf-test" ${filter:+--filter "$filter"}
 }
+
+[ -z "$release" ] || exec "$ORV_ROOT/tools/release-test" "$release" \
+    ${filter:+--filter "$filter"} ${with_lint:---no-lint}
 
 case $target in
 native) test_native ;;

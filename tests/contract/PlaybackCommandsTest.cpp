@@ -70,7 +70,7 @@ class PlaybackFailureTest : public JniFixture, public testing::WithParamInterfac
 protected:
     // The command's expected outcome but for what it throws.
     Expected failing(const std::string& mapping) {
-        const Command& command = playbackCommand(GetParam().function);
+        const Command command = playbackCommand(GetParam().function);
         return Returns(command.good)
             .logs(command.whole(
                 {bridgeError("process_media_player_call(): " + mapping + ", throw exception\n")}))

@@ -55,6 +55,12 @@ for script in "$root"/tools/cmd-*.sh; do
     check "help of $name" 1 "$("$root/orv" help | grep -cE "^  $name( |$)")"
 done
 
+# bare COMMAND…: where neither sudo nor a JDK is on the PATH.
+mkdir "$folder/usr"
+ln -s /usr/bin/* "$folder/usr/"
+rm -f "$folder/usr/sudo" "$folder/usr/javac"
+bare() { PATH=$folder/bin:$folder/usr "$@"; }
+
 stand_in id <<<'echo 0'
 # shellcheck disable=SC2016
 stand_in dpkg-query <<<'for p in "${@:4}"; do [ "$p" = mmdebstrap ] || echo "installed $p"; done'
@@ -68,21 +74,71 @@ expect "nothing missing" 0 "" part need_packages try play
 ORV_NO_INSTALL=1 expect "no installation wanted" 0 "" part need_packages try armhf
 check "asks for nothing" no "$([ -e "$folder/asked" ] && echo yes || echo no)"
 
-# without NAME COMMAND…: where that program is not installed.
-without() {
-    local program others=$folder/without
-    rm -rf -- "$others" && mkdir "$others"
-    for program in awk dpkg-query find id paste sed apt-get; do
-        [ "$program" = "$1" ] || ln -s "$(command -v "$program")" "$others/$program"
-    done
+# on SYSTEM COMMAND…: where /etc/os-release holds those lines.
+on() {
+    printf '%s\n' "$1" >"$folder/os-release"
     shift
-    PATH=$others "$@"
+    ORV_OS_RELEASE=$folder/os-release "$@"
 }
-expect "no apt-get" 1 "name in your system's way, then set ORV_NO_INSTALL=1: tools/packages-play.txt" \
-    without apt-get part need_packages try play test
+debian12=$'ID=debian\nVERSION_CODENAME=bookworm'
+debian13=$'ID=debian\nVERSION_CODENAME=trixie'
+expect "a system of another kind" 1 "this is Fedora Linux 40; ./orv installs packages on Debian 12 and 13 alone. Install in your system's way what Debian calls mmdebstrap, then set ORV_NO_INSTALL=1." \
+    on $'ID=fedora\nPRETTY_NAME="Fedora Linux 40"' part need_packages try armhf
+expect "a relative of Debian" 1 "this is Ubuntu 24.04 LTS; ./orv installs" \
+    on $'ID=ubuntu\nVERSION_CODENAME=noble\nPRETTY_NAME="Ubuntu 24.04 LTS"' part need_packages try armhf
+expect "another system with all packages" 0 "" on ID=fedora part need_packages try play
+expect "the newest Java of Debian 12" 0 "openjdk-17-jdk" on "$debian12" part list_packages test
+expect "the newest Java of Debian 13" 0 "openjdk-25-jdk" on "$debian13" part list_packages test
+expect "an unknown release for a root" 2 "--release is one of bookworm trixie, not 'sarge'" \
+    "$root/orv" test --release sarge
+
+# jdk NAME VERSION [headless]: a JDK in a folder of its own.
+jdk() {
+    mkdir -p "$folder/jvm/$1/bin" "$folder/jvm/$1/lib"
+    echo "JAVA_VERSION=\"$2.0.1\"" >"$folder/jvm/$1/release"
+    printf '#!/bin/sh\n' >"$folder/jvm/$1/bin/javac" && chmod +x "$folder/jvm/$1/bin/javac"
+    [ -n "${3:-}" ] || touch "$folder/jvm/$1/lib/libawt_xawt.so"
+}
+# among_jdks COMMAND…: where those are all that the system has.
+among_jdks() { ORV_JVM_DIR=$folder/jvm bare "$@"; }
+unset JAVA_HOME
+expect "no JDK" 1 "there is no JDK; version 17 or newer is needed" among_jdks part use_jdk
+jdk old 11
+expect "an old JDK" 1 "the JDK in $folder/jvm/old is version 11; 17 or newer is needed" among_jdks part use_jdk
+jdk java-21 21 headless
+expect "a JDK without windows" 1 "the JDK 21 in $folder/jvm/java-21 has no support for windows" \
+    among_jdks part use_jdk
+jdk java-17 17
+jdk java-24 24
+expect "the newest JDK" 0 "$folder/jvm/java-24" among_jdks part find_jdk
+JAVA_HOME=$folder/jvm/java-17 expect "the JDK that JAVA_HOME names" 0 "$folder/jvm/java-17" \
+    among_jdks part find_jdk
+JAVA_HOME=$folder/jvm/old expect "a JAVA_HOME that is too old" 0 "$folder/jvm/java-24" \
+    among_jdks part find_jdk
+# shellcheck disable=SC2016
+stand_in dpkg-query <<<'for p in "${@:4}"; do [ "$p" = default-jdk ] || echo "installed $p"; done'
+expect "a JDK from elsewhere will do" 0 "" among_jdks on "$debian12" part need_packages try play
+check "asks for no other" no "$([ -e "$folder/asked" ] && echo yes || echo no)"
+rm -rf "$folder/jvm" && mkdir "$folder/jvm"
+expect "a JDK where there is none" 0 "default-jdk (Java compiler" among_jdks on "$debian12" \
+    part need_packages try play
+rm "$folder/asked"
+# shellcheck disable=SC2016
+stand_in dpkg-query <<<'for p in "${@:4}"; do [ "$p" = mmdebstrap ] || echo "installed $p"; done'
+
+stand_in pkg-config <<<'echo 1.109.0'
+expect "an mpv that is too old" 1 "mpv's interface is version 1.109.0 here; 2.0 (mpv 0.35) or newer is needed" \
+    part check_mpv
+for version in 2.0.0 2.5.0 10.0; do
+    stand_in pkg-config <<<"echo $version"
+    expect "mpv's interface $version" 0 "" part check_mpv
+done
+stand_in pkg-config <<<'exit 1'
+expect "no mpv yet" 0 "" part check_mpv
+
 stand_in id <<<'echo 1000'
 expect "no sudo" 1 "there is no sudo here. As root: apt-get install --no-install-recommends mmdebstrap" \
-    without sudo part need_packages try armhf
+    bare part need_packages try armhf
 stand_in sudo <<<'exit 1'
 expect "no password" 1 "sudo did not give root, so nothing was installed" part need_packages try armhf
 check "asks for nothing before" no "$([ -e "$folder/asked" ] && echo yes || echo no)"
@@ -91,9 +147,23 @@ touch "$folder/fails"
 expect "apt-get fails" 1 "could not be installed" part need_packages try armhf
 
 mkdir -p "$ORV_BUILD" && touch "$ORV_BUILD/build.ninja"
+cat >"$ORV_BUILD/CMakeCache.txt" <<END
+Java_JAVAC_EXECUTABLE:FILEPATH=$(part find_jdk)/bin/javac
+ORV_TESTS:BOOL=ON
+CMAKE_COMPILE_WARNING_AS_ERROR:BOOL=OFF
+END
 stand_in ninja <<<'echo "FAILED: one.o"; seq 1 50000; exit 1'
 expect "a broken build" 1 "the build failed; all it said is in" part build_targets off all
 check "shows its first error" 1 "$(grep -c '^FAILED: one.o' "$folder/said")"
+# A folder with tests takes warnings for errors; who only plays gets round them.
+sed -i '$s/OFF/ON/' "$ORV_BUILD/CMakeCache.txt"
+# shellcheck disable=SC2016
+stand_in cmake <<<'echo "$@" >>"${0%/bin/*}/configured"'
+# shellcheck disable=SC2016
+stand_in ninja <<<'echo "FAILED: one.o"; grep -q ERROR:BOOL=OFF "${0%/bin/*}/configured" 2>/dev/null'
+expect "a warning in a build for tests" 1 "the build failed" part build_targets on all
+expect "a warning in a build for playing" 0 "" part build_targets off all
+check "leaves the tests in" no "$(grep -q ORV_TESTS "$folder/configured" && echo yes || echo no)"
 stand_in cmake <<<'echo "CMake Error: no such library"; exit 1'
 rm "$ORV_BUILD/build.ninja"
 expect "a configuration that fails" 1 "the build could not be configured" part build_targets off all

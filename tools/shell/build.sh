@@ -47,7 +47,7 @@ is_configured() {
     [ "$1" = off ] || { is_cached ORV_TESTS:BOOL=ON && warnings_are_errors; }
 }
 
-is_cached() { grep -qxF -- "$1" "$ORV_BUILD/CMakeCache.txt"; }
+is_cached() { grep -qsxF -- "$1" "$ORV_BUILD/CMakeCache.txt"; }
 warnings_are_errors() { is_cached CMAKE_COMPILE_WARNING_AS_ERROR:BOOL=ON; }
 
 # A folder that was built with tests takes warnings for errors. Who only plays
