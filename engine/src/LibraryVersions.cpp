@@ -35,9 +35,8 @@ const int32_t* displayMatrix(const AVStream& stream) {
     // FFmpeg 6.1 moved a stream's side data to its parameters.
 #if LIBAVCODEC_VERSION_INT >= AV_VERSION_INT(60, 31, 102)
     const AVCodecParameters& parameters = *stream.codecpar;
-    const AVPacketSideData* data =
-        av_packet_side_data_get(parameters.coded_side_data, parameters.nb_coded_side_data,
-                                AV_PKT_DATA_DISPLAYMATRIX);
+    const AVPacketSideData* data = av_packet_side_data_get(
+        parameters.coded_side_data, parameters.nb_coded_side_data, AV_PKT_DATA_DISPLAYMATRIX);
     if (data != nullptr) matrix = data->data;
 #else
     matrix = av_stream_get_side_data(&stream, AV_PKT_DATA_DISPLAYMATRIX, nullptr);

@@ -22,7 +22,7 @@ using android::media::Metadata;
 
 struct TextKey {
     Metadata::Type key;
-    OrvWideText MetaDataInfo::*text;
+    OrvWideText MetaDataInfo::* text;
     const char* tag;
 };
 

@@ -61,7 +61,7 @@ void setCompanded(const ORV_AUD_PCM_INFO_T& pcm, PcmFormat& format) {
     format.options = {{"demuxer", "lavf"},
                       {"demuxer-lavf-format", isALaw ? "alaw" : "mulaw"},
                       {"demuxer-lavf-o", "sample_rate=" + std::to_string(pcm.eSampleRate) +
-                                             ",channels=" + std::to_string(pcm.eNumCh)}};
+                                             ",ch_layout=" + std::to_string(pcm.eNumCh) + "c"}};
 }
 
 void setLinear(const ORV_AUD_PCM_INFO_T& pcm, PcmFormat& format) {

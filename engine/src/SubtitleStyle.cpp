@@ -23,11 +23,11 @@ const int64_t kMaxMargin = 300;
 const int64_t kUsualPosition = 100;  // percent of the picture's height
 const int64_t kMaxPosition = 150;
 
-// All that an attribute may change.
+// All that an attribute may change. Releases before 0.38 have no border style.
+const char kBorderStyle[] = "sub-border-style";
 const char* const kLook[] = {
-    "sub-delay", "sub-ass-override",  "sub-font-size", "sub-back-color",
-    "sub-color", "sub-outline-color", "sub-align-x",   "sub-margin-x",
-    "sub-pos",
+    "sub-delay",         "sub-ass-override", "sub-font-size", "sub-back-color", "sub-color",
+    "sub-outline-color", "sub-align-x",      "sub-margin-x",  "sub-pos",        kBorderStyle,
 };
 
 int64_t integerOf(const MpvAssignment& assignment) {
@@ -93,6 +93,16 @@ int64_t SubtitleStyle::fontSize(const Subtitle_FontInfo& font) const {
     }
 }
 
+// A ground is a box behind the line. Without a border style a colour that can be
+// seen makes the box by itself; with one it would colour the shadow.
+void SubtitleStyle::addGround(const Subtitle_Color& color,
+                              std::vector<MpvAssignment>& style) const {
+    style.push_back({"sub-back-color", colorText(color)});
+    if (!mHasBorderStyle) return;
+    style.push_back(
+        {kBorderStyle, std::string(color.mA > 0 ? "background-box" : "outline-and-shadow")});
+}
+
 void SubtitleStyle::addHorizontal(int x, std::vector<MpvAssignment>& style) const {
     style.push_back({"sub-align-x", std::string(x > 0 ? "left" : x < 0 ? "right" : "center")});
     style.push_back({"sub-margin-x", x == 0 ? mUsualMargin : marginOf(x)});
@@ -128,7 +138,7 @@ std::vector<MpvAssignment> SubtitleStyle::flush() {
         style.push_back({"sub-ass-override", std::string("force")});
     }
     if (mFontInfo) style.push_back({"sub-font-size", fontSize(*mFontInfo)});
-    if (mBackColor) style.push_back({"sub-back-color", colorText(*mBackColor)});
+    if (mBackColor) addGround(*mBackColor, style);
     if (mTextColor) style.push_back({"sub-color", colorText(*mTextColor)});
     if (mEdgeColor) style.push_back({"sub-outline-color", colorText(*mEdgeColor)});
     if (mDisplayOffset) {
@@ -150,12 +160,14 @@ void SubtitleStyle::clear() {
 
 void SubtitleStyle::readUsual(mpv_handle* mpv) {
     mUsual.clear();
+    mHasBorderStyle = false;
     for (const char* property : kLook) {
         const std::optional<MpvAssignment> now = currentValue(mpv, property);
         if (!now) continue;
         mUsual.push_back(*now);
         if (now->property == "sub-font-size") mMediumFont = integerOf(*now);
         if (now->property == "sub-margin-x") mUsualMargin = integerOf(*now);
+        if (now->property == kBorderStyle) mHasBorderStyle = true;
     }
 }
 

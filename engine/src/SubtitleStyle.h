@@ -33,12 +33,14 @@ public:
     const std::vector<MpvAssignment>& usual() const { return mUsual; }
 
 private:
+    void addGround(const Subtitle_Color& color, std::vector<MpvAssignment>& style) const;
     void addHorizontal(int x, std::vector<MpvAssignment>& style) const;
     int64_t fontSize(const Subtitle_FontInfo& font) const;
 
     std::vector<MpvAssignment> mUsual;
     int64_t mMediumFont = 55;
     int64_t mUsualMargin = 25;
+    bool mHasBorderStyle = false;
     std::optional<Subtitle_TimeOffset> mTimeOffset;
     std::optional<Subtitle_FontInfo> mFontInfo;
     std::optional<Subtitle_Color> mBackColor;

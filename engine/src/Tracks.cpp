@@ -46,7 +46,7 @@ bool Tracks::subtitleCount(int& count) {
 }
 
 template <class Table>
-bool Tracks::countOf(const char* operation, Table TrackTables::*table, int& count) {
+bool Tracks::countOf(const char* operation, Table TrackTables::* table, int& count) {
     TrackTables all;
     if (!tables(operation, all)) return false;
     count = static_cast<int>((all.*table).size());
@@ -115,7 +115,7 @@ bool Tracks::currentSubtitle(int* index) {
 }
 
 template <class Table>
-bool Tracks::currentOf(const char* operation, Table TrackTables::*table, int* index) {
+bool Tracks::currentOf(const char* operation, Table TrackTables::* table, int* index) {
     TrackTables all;
     if (index == nullptr) return refused(operation, "null argument");
     if (!tables(operation, all)) return false;

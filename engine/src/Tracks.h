@@ -49,9 +49,9 @@ public:
 
 private:
     template <class Table>
-    bool countOf(const char* operation, Table TrackTables::*table, int& count);
+    bool countOf(const char* operation, Table TrackTables::* table, int& count);
     template <class Table>
-    bool currentOf(const char* operation, Table TrackTables::*table, int* index);
+    bool currentOf(const char* operation, Table TrackTables::* table, int* index);
     bool choose(const char* operation, const char* property, int64_t id);
     bool chapterInfo(int chapter, SubtitleTrackInfo& info);
 

@@ -116,7 +116,7 @@ status_t Transport::getVideoHeight(int* height) const {
     return getSize("getVideoHeight", &PlayerState::Values::height, height);
 }
 
-status_t Transport::getSize(const char* operation, int PlayerState::Values::*member,
+status_t Transport::getSize(const char* operation, int PlayerState::Values::* member,
                             int* pixels) const {
     if (pixels == nullptr) return failed(android::BAD_VALUE, operation, "null argument");
     const PlayerState::Values now = mState.read([](const PlayerState::Values& v) { return v; });

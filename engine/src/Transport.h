@@ -39,7 +39,7 @@ public:
     void setTrick(bool coreHeld, bool backward);
 
 private:
-    android::status_t getSize(const char* operation, int PlayerState::Values::*member,
+    android::status_t getSize(const char* operation, int PlayerState::Values::* member,
                               int* pixels) const;
 
     MpvHandle& mMpv;

@@ -88,7 +88,8 @@ status_t Parcel::writeString16(const String16& text) {
     const size_t begin = mPos;
     status_t status = writeInt32(static_cast<int32_t>(text.size()));
     // String16 keeps a zero unit behind its text.
-    if (status == NO_ERROR) status = write(static_cast<const char16_t*>(text), (text.size() + 1) * sizeof(char16_t));
+    if (status == NO_ERROR)
+        status = write(static_cast<const char16_t*>(text), (text.size() + 1) * sizeof(char16_t));
     if (status != NO_ERROR) mPos = begin;
     return status;
 }

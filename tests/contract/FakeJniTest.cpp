@@ -193,6 +193,7 @@ TEST_F(FakeJniTest, StringsKeepEveryUnit) {
 TEST_F(FakeJniTest, ThePlatformsThrowHelperWorksOnIt) {
     jniThrowException(env, "java/io/IOException", "first");
     EXPECT_THAT(vm.pending(), Optional(Thrown{"java/io/IOException", "first"}));
+    vm.clearPending();
     jniThrowException(env, "java/lang/IllegalStateException", nullptr);
     EXPECT_THAT(vm.pending(), Optional(Thrown{"java/lang/IllegalStateException", {}}));
     EXPECT_THAT(vm.violations(), IsEmpty());

@@ -95,11 +95,11 @@ TEST_F(JavaInputStreamReadTest, MoreThanAskedForIsCutButReported) {
 TEST_F(JavaInputStreamReadTest, BytesAreCopiedBeforeTheCutIsLoggedAndTheArrayReleased) {
     size_t copiedThen = 0;
     size_t releasedThen = 99;
-    log.whenLogged(
-        bridgeError("JavaInputStream::read(): copy i4ReadResult>len Issue handle \n"), [&] {
-            copiedThen = copied();
-            releasedThen = vm.callsOf("ReleaseByteArrayElements").size();
-        });
+    log.whenLogged(bridgeError("JavaInputStream::read(): copy i4ReadResult>len Issue handle \n"),
+                   [&] {
+                       copiedThen = copied();
+                       releasedThen = vm.callsOf("ReleaseByteArrayElements").size();
+                   });
     read(300, 200);
     EXPECT_EQ(copiedThen, 200u);
     EXPECT_EQ(releasedThen, 0u);

@@ -43,7 +43,9 @@ protected:
 };
 
 TEST_F(MediaClientListenerTest, LogsItsConstructionAndDestruction) {
-    { sp<MediaClientListener> listener = new MediaClientListener; }
+    {
+        sp<MediaClientListener> listener = new MediaClientListener;
+    }
     const std::string constructor =
         "MediaClientListener::MediaClientListener(JNIEnv, jobject thiz, jobject weak_thiz): ";
     EXPECT_THAT(

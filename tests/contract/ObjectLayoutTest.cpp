@@ -79,7 +79,7 @@ struct Field {
 // A member pointer is the member's offset in the Itanium C++ ABI. Expected is
 // the field's type by contract, or one of its width.
 template <typename Expected, typename Object, typename Member>
-Field field(const char* name, Member Object::*member, size_t armOffset) {
+Field field(const char* name, Member Object::* member, size_t armOffset) {
     static_assert(sizeof(Member) == sizeof(Expected) && alignof(Member) == alignof(Expected));
     ptrdiff_t offset = 0;
     static_assert(sizeof(offset) == sizeof(member));

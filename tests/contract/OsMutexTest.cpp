@@ -69,7 +69,9 @@ TEST(ScopedMutexTest, NestsOnOneThread) {
     os::Mutex mutex;
     {
         os::ScopedMutex outer(mutex);
-        { os::ScopedMutex inner(mutex); }
+        {
+            os::ScopedMutex inner(mutex);
+        }
         EXPECT_EQ(tryFromAnotherThread(mutex), EBUSY);
     }
     EXPECT_EQ(tryFromAnotherThread(mutex), 0);

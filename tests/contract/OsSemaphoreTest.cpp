@@ -51,7 +51,9 @@ TEST(OsSemaphoreTest, FailedInitialisationIsPrintedWithErrno) {
 
 TEST(OsSemaphoreTest, NegativeValueIsRefusedByTheSystemAndPrinted) {
     CaptureStdout();
-    { os::Semaphore semaphore(-1); }
+    {
+        os::Semaphore semaphore(-1);
+    }
     EXPECT_EQ(GetCapturedStdout(), "semaphore init error " + std::to_string(EINVAL) + "\n");
 }
 

@@ -126,9 +126,8 @@ TEST_F(PlayerContextThreadsTest, ServiceOutlivesAReleaseInsideACallThatOnlyLooks
     expectToOutliveARelease("OrvMediaClient_getParameter", [&] {
         call<void>("native_getParameter", "(ILandroid/os/Parcel;)V", 1, jobject{nullptr});
     });
-    expectToOutliveARelease("decVideoSurfaceRef", [&] {
-        android::decVideoSurfaceRef(vm.env(), vm.local(player));
-    });
+    expectToOutliveARelease("decVideoSurfaceRef",
+                            [&] { android::decVideoSurfaceRef(vm.env(), vm.local(player)); });
 }
 
 // The other thread must get its answer before the engine gives its own: nobody

@@ -26,8 +26,7 @@ void PrintTo(const ServiceOperation& operation, std::ostream* out) { *out << ope
 
 std::string operationTestName(const testing::TestParamInfo<ServiceOperation>& info) {
     std::string name = info.param.name;
-    std::replace_if(
-        name.begin(), name.end(), [](unsigned char c) { return !isalnum(c); }, '_');
+    std::replace_if(name.begin(), name.end(), [](unsigned char c) { return !isalnum(c); }, '_');
     return name;
 }
 

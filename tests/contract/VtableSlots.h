@@ -53,10 +53,11 @@ template <typename T, typename... Arguments>
 bool hasDestructorsAt(int slot, Arguments... arguments) {
     using Object = Counted<T>;
     Object::destroyed = Object::deleted = 0;
-    alignas(Object) unsigned char memory[sizeof(Object)];
-    T* object = ::new (static_cast<void*>(memory)) Object(arguments...);
+    void* memory = ::operator new(sizeof(Object));  // counted objects refuse the stack
+    T* object = ::new (memory) Object(arguments...);
     callSlot(object, slot);
     const bool complete = Object::destroyed == 1 && Object::deleted == 0;
+    ::operator delete(memory);
 
     object = new Object(arguments...);
     callSlot(object, slot + 1);

@@ -37,7 +37,7 @@ TEST(MetadataTest, RecordsCarryTheirLengthKeyAndType) {
     EXPECT_TRUE(metadata.appendBool(Metadata::kSeekAvailable, false));
     EXPECT_THAT(wordsOf(parcel), ElementsAre(0, kMarker,        //
                                              16, 14, 2, 61000,  //
-                                             16, 1, 3, 1,      //
+                                             16, 1, 3, 1,       //
                                              16, 4, 3, 0));
 }
 

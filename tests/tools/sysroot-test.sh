@@ -11,6 +11,8 @@ sysroot=$folder/sysroot
 mkdir "$folder/bin"
 PATH=$folder/bin:$PATH
 failures=0
+printf 'ID=debian\nVERSION_CODENAME=bookworm\n' >"$folder/os-release"
+export ORV_OS_RELEASE=$folder/os-release
 
 # stand_in NAME <script: puts a program in front of the real one.
 stand_in() {

@@ -26,8 +26,10 @@ lint_licence() {
     [ -z "$lacking" ] || { say "no licence identifier in: $lacking" && return 1; }
 }
 
+clang_version() { release_value "$(this_release)" clang; }
+
 lint_format() {
-    find_sources '*.cpp' '*.h' | xargs -0 clang-format --dry-run -Werror
+    find_sources '*.cpp' '*.h' | xargs -0 "clang-format-$(clang_version)" --dry-run -Werror
 }
 
 lint_scripts() {
@@ -45,7 +47,7 @@ lint_tidy() {
     mkdir -p "$database"
     sed -E 's/-Winvalid-pch -include ([^ "\\]+|\\"[^"]*\\")//' "$ORV_BUILD/compile_commands.json" \
         >"$database/compile_commands.json"
-    run-clang-tidy -quiet -p "$database" '^((?!cmake_pch).)*$' >"$log" 2>&1 && return
+    "run-clang-tidy-$(clang_version)" -quiet -p "$database" '^((?!cmake_pch).)*$' >"$log" 2>&1 && return
     grep -E '(warning|error):' "$log" | sort -u
     say "all that clang-tidy said is in $log"
     return 1

@@ -14,9 +14,11 @@ list_packages() {
 
 # read_package_list FILE
 read_package_list() {
-    sed -e 's/#.*//' -e '/^[[:space:]]*$/d' \
-        -e "s/@jdk@/$(release_value "$(this_release)" jdk)/" \
-        -e "s/@gcc@/$(release_value "$(this_release)" gcc)/" "$1"
+    local column substitutions=()
+    for column in jdk gcc clang; do
+        substitutions+=(-e "s/@$column@/$(release_value "$(this_release)" $column)/")
+    done
+    sed -e 's/#.*//' -e '/^[[:space:]]*$/d' "${substitutions[@]}" "$1"
 }
 
 # Prints the lines of the lists whose package is not installed: one question

@@ -8,7 +8,7 @@ supported_releases() { awk '!/^#/ {print $1}' "$ORV_ROOT/tools/releases.txt"; }
 # "12 and 13"
 supported_numbers() { awk '!/^#/ {print $2}' "$ORV_ROOT/tools/releases.txt" | paste -sd, | sed 's/,/ and /g'; }
 
-# release_value NAME COLUMN: number, jdk or gcc of a release; for a release that
+# release_value NAME COLUMN: the value of one column; for a release that
 # is not listed those of the newest.
 release_value() {
     awk -v name="$1" -v column="$2" '

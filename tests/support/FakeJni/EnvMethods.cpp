@@ -115,7 +115,10 @@ Value run(Entry& entry, const Method& method, const char* form, const ObjectPtr&
     std::vector<Value> args;
     const Shape shape = shapeOf(method.signature);
     for (char type : shape.parameters) args.push_back(arguments.next(entry, type));
-    entry.vm.recordJava({method.name, form, self, args, std::this_thread::get_id()});
+    // How the platform makes its exceptions is its own affair.
+    if (method.name != "<init>") {
+        entry.vm.recordJava({method.name, form, self, args, std::this_thread::get_id()});
+    }
     Value result = Value::zero(shape.result);
     if (method.implementation) {
         const Implementation body = method.implementation;

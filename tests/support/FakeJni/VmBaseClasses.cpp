@@ -48,6 +48,13 @@ Value throwableMessage(const Invocation& call) {
     return Value::of(message ? call.vm.newString(*message) : nullptr);
 }
 
+// The platform's helper throws by a constructor or, in earlier releases, without.
+Value constructThrowable(const Invocation& call) {
+    const ObjectPtr& message = call.args[0].object;
+    if (message != nullptr) call.self->text = message->text;
+    return {};
+}
+
 }  // namespace
 
 void Vm::defineBaseClasses() {
@@ -57,7 +64,9 @@ void Vm::defineBaseClasses() {
     define("java/lang/String");
     Class& throwable = define("java/lang/Throwable");
     Class& method = define("java/lang/reflect/Method");
-    for (const auto& [path, super] : kExceptionClasses) define(path, super);
+    for (const auto& [path, super] : kExceptionClasses) {
+        define(path, super).method("<init>", "(Ljava/lang/String;)V", constructThrowable);
+    }
 
     reflection.method("getName", "()Ljava/lang/String;", className);
     reflection.method("getDeclaredMethods", "()[Ljava/lang/reflect/Method;", declaredMethods);

@@ -16,14 +16,14 @@ const char kShortClassName[] = "OrvMediaPlayer";
 
 // One lookup: where the ID goes and what is logged when there is none.
 struct FieldLookup {
-    jfieldID ClientFields::*member;
+    jfieldID ClientFields::* member;
     const char* name;
     const char* signature;
     const char* failure;
 };
 
 struct MethodLookup {
-    jmethodID ClientFields::*member;
+    jmethodID ClientFields::* member;
     const char* name;
     const char* signature;
     const char* failure;

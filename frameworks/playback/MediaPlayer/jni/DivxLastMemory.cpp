@@ -16,11 +16,10 @@ const char kPositionClass[] = "com/quintora/mmp/util/DivxLastMemoryFilePosition"
 struct Word {
     const char* name;
     char type;  // of the Java field: J or I
-    uint32_t DivxLastMemoryFilePosition::*member;
+    uint32_t DivxLastMemoryFilePosition::* member;
 };
 
-#define WORD(type, name) \
-    { #name, type, &DivxLastMemoryFilePosition::name }
+#define WORD(type, name) {#name, type, &DivxLastMemoryFilePosition::name}
 const Word kWords[] = {
     WORD('J', ui8_clip_id),
     WORD('I', ui4_title_idx),

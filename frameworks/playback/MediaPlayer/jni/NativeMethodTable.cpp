@@ -20,12 +20,10 @@ constexpr const char* checked(const char* signature) {
     return signature;
 }
 
-#define ROW(javaName, signature, function)                                                        \
-    {                                                                                             \
-        javaName,                                                                                 \
-            checked<NativeMethodSignature<decltype(&(function))>::matches(signature)>(signature), \
-            reinterpret_cast<void*>(&(function))                                                  \
-    }
+#define ROW(javaName, signature, function)                                                 \
+    {javaName,                                                                             \
+     checked<NativeMethodSignature<decltype(&(function))>::matches(signature)>(signature), \
+     reinterpret_cast<void*>(&(function))}
 
 // One row a line, however long.
 // clang-format off

@@ -2,11 +2,10 @@
 #include "jni/VideoSurface.h"
 
 // The next one speaks of sp and leaves it to its readers to know it.
-#include <utils/RefBase.h>
-
 #include <android_runtime/android_view_Surface.h>
 #include <gui/Surface.h>
 #include <nativehelper/JNIHelp.h>
+#include <utils/RefBase.h>
 
 #include "jni/BridgeLog.h"
 #include "jni/ClientFields.h"

@@ -36,7 +36,8 @@ private:
 
     Items mItems = std::make_unique<std::queue<T>>();
     std::atomic<size_t> mSize{0};
-    [[maybe_unused]] char mReserved[sizeof(std::queue<T>) - sizeof(Items) - sizeof(std::atomic<size_t>)];
+    [[maybe_unused]] char
+        mReserved[sizeof(std::queue<T>) - sizeof(Items) - sizeof(std::atomic<size_t>)];
 };
 
 }  // namespace os
