@@ -30,10 +30,10 @@ const char* const kLook[] = {
     "sub-outline-color", "sub-align-x",      "sub-margin-x",  "sub-pos",        kBorderStyle,
 };
 
-int64_t integerOf(const MpvAssignment& assignment) {
-    if (const double* number = std::get_if<double>(&assignment.value)) return std::llround(*number);
+double numberOf(const MpvAssignment& assignment) {
+    if (const double* number = std::get_if<double>(&assignment.value)) return *number;
     const int64_t* integer = std::get_if<int64_t>(&assignment.value);
-    return integer != nullptr ? *integer : 0;
+    return integer != nullptr ? static_cast<double>(*integer) : 0;
 }
 
 bool isTimeOffset(const Subtitle_TimeOffset& offset) {
@@ -83,7 +83,7 @@ int64_t SubtitleStyle::fontSize(const Subtitle_FontInfo& font) const {
         case ORV_SUBTITLE_FONT_SMALL:
             return std::llround(mMediumFont * kSmallFont);
         case ORV_SUBTITLE_FONT_MEDIUM:
-            return mMediumFont;
+            return std::llround(mMediumFont);
         case ORV_SUBTITLE_FONT_LARGE:
             return std::llround(mMediumFont * kLargeFont);
         case ORV_SUBTITLE_FONT_CUSTOM:
@@ -165,8 +165,8 @@ void SubtitleStyle::readUsual(mpv_handle* mpv) {
         const std::optional<MpvAssignment> now = currentValue(mpv, property);
         if (!now) continue;
         mUsual.push_back(*now);
-        if (now->property == "sub-font-size") mMediumFont = integerOf(*now);
-        if (now->property == "sub-margin-x") mUsualMargin = integerOf(*now);
+        if (now->property == "sub-font-size") mMediumFont = numberOf(*now);
+        if (now->property == "sub-margin-x") mUsualMargin = std::llround(numberOf(*now));
         if (now->property == kBorderStyle) mHasBorderStyle = true;
     }
 }

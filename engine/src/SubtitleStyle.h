@@ -38,7 +38,7 @@ private:
     int64_t fontSize(const Subtitle_FontInfo& font) const;
 
     std::vector<MpvAssignment> mUsual;
-    int64_t mMediumFont = 55;
+    double mMediumFont = 55;
     int64_t mUsualMargin = 25;
     bool mHasBorderStyle = false;
     std::optional<Subtitle_TimeOffset> mTimeOffset;

@@ -26,10 +26,9 @@ lint_licence() {
     [ -z "$lacking" ] || { say "no licence identifier in: $lacking" && return 1; }
 }
 
-clang_version() { release_value "$(this_release)" clang; }
-
+# One version in every release: others lay the same code out differently.
 lint_format() {
-    find_sources '*.cpp' '*.h' | xargs -0 "clang-format-$(clang_version)" --dry-run -Werror
+    find_sources '*.cpp' '*.h' | xargs -0 "clang-format-$(release_value "$(this_release)" clang)" --dry-run -Werror
 }
 
 lint_scripts() {
@@ -47,7 +46,7 @@ lint_tidy() {
     mkdir -p "$database"
     sed -E 's/-Winvalid-pch -include ([^ "\\]+|\\"[^"]*\\")//' "$ORV_BUILD/compile_commands.json" \
         >"$database/compile_commands.json"
-    "run-clang-tidy-$(clang_version)" -quiet -p "$database" '^((?!cmake_pch).)*$' >"$log" 2>&1 && return
+    run-clang-tidy -quiet -p "$database" '^((?!cmake_pch).)*$' >"$log" 2>&1 && return
     grep -E '(warning|error):' "$log" | sort -u
     say "all that clang-tidy said is in $log"
     return 1
