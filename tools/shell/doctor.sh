@@ -55,7 +55,8 @@ check_libraries() {
         row libraries missing "mpv and libav are not here; ./orv play installs them"
         return 1
     fi
-    row libraries ok "$(printf '%s\n' "${found[@]}" | paste -sd, | sed 's/,/, /g')"
+    # What mpv calls its version there is its client interface's.
+    row libraries ok "$(printf '%s\n' "${found[@]/#mpv /mpv client interface }" | paste -sd, | sed 's/,/, /g')"
 }
 
 check_display() {
