@@ -7,13 +7,13 @@ import subprocess
 import unittest
 
 import environment
+import blueprint
 
 BLUEPRINT = environment.PRODUCT_SOURCE / "Android.bp"
 
 
 def strings_of(name):
-    lists = re.findall(rf"^    {name}: \[(.*?)\]", BLUEPRINT.read_text(), re.MULTILINE | re.DOTALL)
-    return re.findall(r'"([^"]*)"', lists[0])
+    return blueprint.strings_of(BLUEPRINT.read_text(), name)
 
 
 class AndroidBpTest(unittest.TestCase):
@@ -26,8 +26,8 @@ class AndroidBpTest(unittest.TestCase):
             "-Wall", "-Wextra", "-Werror", "-fno-exceptions", "-fno-rtti", "-funsigned-char",
             "-fvisibility=hidden", "-fvisibility-inlines-hidden"})
         text = BLUEPRINT.read_text()
-        self.assertRegex(text, r'(?m)^    compile_multilib: "32",$')
-        self.assertRegex(text, r'(?m)^    cpp_std: "c\+\+17",$')
+        self.assertEqual(blueprint.string_of(text, "compile_multilib"), "32")
+        self.assertEqual(blueprint.string_of(text, "cpp_std"), "c++17")
 
     def test_the_page_names_every_module_and_header(self):
         page = (environment.SOURCE / "docs/platform-tree.md").read_text()
@@ -40,7 +40,7 @@ class AndroidBpTest(unittest.TestCase):
         self.assertEqual(used, named - {"orvtarn/TarnPlayer.h"})
 
     def test_the_export_list_is_there(self):
-        script = re.search(r'version_script: "(.*)"', BLUEPRINT.read_text()).group(1)
+        script = blueprint.string_of(BLUEPRINT.read_text(), "version_script")
         self.assertTrue((environment.PRODUCT_SOURCE / script).is_file())
 
     # bpfmt prints how it would lay the file out differently, or where it is no

@@ -12,13 +12,12 @@ import subprocess
 import sys
 import zipfile
 
+import refusal
+from refusal import Refusal
+
 Member = collections.namedtuple("Member", "name type static native")
 Class = collections.namedtuple("Class", "path parent fields methods")
 Need = collections.namedtuple("Need", "kind name type static")
-
-
-class Refusal(Exception):
-    """The input is not what the tool is for; the text is one clear line."""
 
 
 def read_needs(path):
@@ -172,11 +171,11 @@ def check(path, list_path):
     return 0
 
 
+def main(arguments):
+    if len(arguments) != 2:
+        raise Refusal(__doc__)
+    return check(*arguments)
+
+
 if __name__ == "__main__":
-    try:
-        if len(sys.argv) != 3:
-            raise Refusal(__doc__)
-        sys.exit(check(*sys.argv[1:]))
-    except Refusal as refusal:
-        print(f"orv: {refusal}", file=sys.stderr)
-        sys.exit(2)
+    refusal.exit_with(main, sys.argv[1:])

@@ -11,23 +11,19 @@ from elftools.elf.enums import ENUM_RELOC_TYPE_ARM, ENUM_RELOC_TYPE_x64
 from elftools.elf.relocation import RelocationSection
 from elftools.elf.sections import SymbolTableSection
 
+import refusal
+from refusal import Refusal
+
 ARCHITECTURES = {
     "EM_X86_64": ("x86_64", ENUM_RELOC_TYPE_x64),
     "EM_ARM": ("armhf", ENUM_RELOC_TYPE_ARM),
 }
 
 
-class Refusal(Exception):
-    """The input is not what the tool is for; the text is one clear line."""
-
-
 def exit_with(main, *arguments):
     """Ends the program with what main returns, or with 2 for unfit input."""
     try:
-        sys.exit(main(*arguments))
-    except Refusal as refusal:
-        print(f"orv: {refusal}", file=sys.stderr)
-        sys.exit(2)
+        refusal.exit_with(main, *arguments)
     except (ELFError, StopIteration, ValueError, AttributeError) as error:
         print(f"orv: the library is damaged or cut off: {error}", file=sys.stderr)
         sys.exit(2)
