@@ -27,7 +27,7 @@ done
 # Media plays in real time: on a busy machine a test may miss its moment, and is
 # run once more. ctest shows both runs.
 test_native() {
-    need_packages "build and test" play test
+    need_packages "build and test" play test tree
     build_targets on all
     [ -z "$with_lint" ] || [ -n "$filter" ] || lint_everything
     on_some_display ctest --test-dir "$ORV_BUILD" --output-on-failure --no-tests=error \
