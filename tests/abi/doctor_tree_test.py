@@ -12,6 +12,7 @@ import unittest
 
 import environment
 import blueprint
+import tree_slots
 
 PACKAGED = pathlib.Path("/usr/include/android")
 PLATFORM = environment.SOURCE / "platform/include"
@@ -111,6 +112,10 @@ class DoctorTreeTest(unittest.TestCase):
 
     def test_a_whole_tree_is_sound(self):
         self.change(INTERFACE, "class Parcel;", "class Parcel;\nstruct IStreamSource;")
+        self.change(PARCEL, "#pragma once", "#pragma once\n#include <cutils/list.h>")
+        # Other copies in the tree do not count.
+        for header in ("utils/RefBase.h", "cutils/list.h"):
+            self.write(f"frameworks/native/host/include/{header}", "#error host")
         self.assert_sound()
 
     def test_a_flat_folder_of_headers_is_sound(self):
@@ -170,6 +175,11 @@ class DoctorTreeTest(unittest.TestCase):
         aidl.write_text("")
         self.assert_findings(sources,
                              sentence + "; the tree's build makes it from android/os/Mode.aidl")
+        # A source's own header is not what the build gives to others.
+        self.write("frameworks/native/libs/android/os/Mode.h", "#error not given to others")
+        self.write("out/soong/.intermediates/frameworks/native/libs/binder/gen/include/"
+                   "android/os/Mode.h", "")
+        self.assert_sound(*sources)
 
     def test_before_android_9_there_is_no_media_track(self):
         (self.tree / TRACK).unlink()
@@ -249,10 +259,14 @@ class DoctorTreeTest(unittest.TestCase):
             f"{RUNTIME}/AndroidRuntime.h than jni/NativeMethodTable.cpp gives it")
 
     def test_a_class_for_a_struct_is_named_once(self):
-        self.change(INTERFACE, "class Parcel;", "class Parcel;\nclass IStreamSource;")
-        self.assert_findings(
-            [SERVICE, PLAYER], "IStreamSource is a class in the tree and a struct in the sources; "
-            "a struct in all releases")
+        other = "class IStreamSource;\n"
+        sentence = ("IStreamSource is a class in the tree and a struct in the sources; "
+                    "a struct in all releases, as in the sources")
+        # The sources' own declaration comes first, then the tree's.
+        self.write(HELP, THROWS + DESCRIPTOR + f"namespace android {{ {other} }}\n")
+        self.assert_findings([PLAYER], sentence)
+        self.change(INTERFACE, "class Parcel;\n", rf"\g<0>{other}")
+        self.assert_findings([SERVICE, PLAYER], sentence)
 
     def test_what_has_no_words_is_shown_in_one_line(self):
         self.change(PARCEL, "class Parcel {", "class Parcel { int broken = ;")
@@ -266,11 +280,13 @@ class DoctorTreeTest(unittest.TestCase):
     # --- the base class
 
     def test_operations_that_the_base_class_lacks_are_named(self):
-        self.change(INTERFACE, r"    virtual status_t (setVolume|release)\(.*\n", "")
+        volume = ("class MediaPlayerBase has no operation setVolume; expected in virtual slot 23: "
+                  "virtual status_t setVolume(float left, float right) = 0")
+        self.change(INTERFACE, r"    virtual status_t setVolume\(.*\n", "")
+        self.assert_findings([SERVICE], volume)
+        self.change(INTERFACE, r"    virtual status_t release\(.*\n", "")
         self.assert_findings(
-            [SERVICE, PLAYER],
-            "class MediaPlayerBase has no operation setVolume; expected in virtual slot 23: "
-            "virtual status_t setVolume(float left, float right) = 0",
+            [SERVICE, PLAYER], volume,
             "class MediaPlayerBase has no operation release; expected in virtual slot 24: "
             "virtual status_t release() = 0")
 
@@ -286,9 +302,15 @@ class DoctorTreeTest(unittest.TestCase):
 
     def test_another_order_of_slots_is_named(self):
         self.change(INTERFACE, r"(.* start\(\) = 0;\n)(.* stop\(\) = 0;\n)", r"\2\1")
+        swapped = ["virtual slot 10 of class MediaPlayerBase is stop, not start",
+                   "virtual slot 11 of class MediaPlayerBase is start, not stop"]
+        self.assert_findings([SERVICE], *swapped)
+        # One more before them moves them both.
+        self.change(INTERFACE, "    virtual status_t prepare\\(", r"    virtual int more();\n\g<0>")
         self.assert_findings(
-            [SERVICE], "virtual slot 10 of class MediaPlayerBase is stop, not start",
-            "virtual slot 11 of class MediaPlayerBase is start, not stop")
+            [SERVICE], "class MediaPlayerBase has an operation more, more(), in virtual slot 8: "
+            "those behind it are a slot too far back",
+            *[text.replace("11", "12").replace("10", "11") for text in swapped])
 
     def test_one_more_pure_operation_is_named(self):
         behind = r"(    virtual status_t release\(\) = 0;\n)"
@@ -304,11 +326,19 @@ class DoctorTreeTest(unittest.TestCase):
             "slot 24: those behind it are a slot too far back")
 
     def test_a_missing_base_class_is_named(self):
-        self.change(INTERFACE, "class MediaPlayerBase ", "class PlayerBase ")
+        self.change(INTERFACE, "class MediaPlayerBase ", "class Playback ")
         status, lines = self.check(SERVICE)
         self.assertEqual((status, lines[0]), (
             1, "class MediaPlayerBase is missing (media/MediaPlayerInterface.h, module libmedia), "
             f"which {ENGINE}/TarnPlayer.h uses"))
+
+    def test_the_page_lists_the_operations_by_slot(self):
+        page = (environment.SOURCE / "docs/platform-tree.md").read_text()
+        listed = re.findall(r"^\| (\d+) \| `(.*)` \|$", page, re.MULTILINE)
+        operations = tree_slots.read_operations(PLATFORM / "media/MediaPlayerInterface.h")
+        self.assertEqual(len(operations), 19)
+        self.assertEqual(listed, [(str(operation.slot), operation.declaration[len("virtual "):])
+                                  for operation in operations])
 
     # --- unfit input
 

@@ -112,7 +112,9 @@ class Headers:
         self._searched = None
 
     def add_support(self):
-        self._add(*filter(os.path.isdir, (os.path.join(self.tree, folder) for folder in SUPPORT)))
+        for folder in (*sum(self._folders.values(), []), *SUPPORT):
+            if os.path.isdir(os.path.join(self.tree, folder)):
+                self._add(os.path.join(self.tree, folder))
 
     def _candidates(self):
         if self._searched is None:
@@ -131,7 +133,7 @@ class Headers:
         known = [os.path.join(self.tree, folder) for folder in self._folders.get(module, ())]
         for root in self.roots + known:
             if self._has(root, header):
-                self._add(root, *filter(os.path.isdir, known))
+                self._add(root)
                 return True
         root = next((root for root in self._candidates() if self._has(root, header)), None)
         if root is not None:
@@ -145,5 +147,6 @@ class Headers:
             return f"; the tree's build makes it from {source}"
         return ""
 
-    def _add(self, *roots):
-        self.roots += [root for root in dict.fromkeys(roots) if root not in self.roots]
+    def _add(self, root):
+        if root not in self.roots:
+            self.roots.append(root)
