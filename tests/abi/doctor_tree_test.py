@@ -34,14 +34,15 @@ LAYOUT = {
     RUNTIME: PLATFORM / "android_runtime",
     "frameworks/native/libs/gui/include/gui": PLATFORM / "gui",
     "libnativehelper/include_jni/jni.h": PACKAGED / "nativehelper/jni.h",
-    "system/core/libcutils/include/cutils": PACKAGED / "cutils",
-    "system/core/liblog/include/android": PACKAGED / "android",
-    "system/core/liblog/include/log": PACKAGED / "log",
-    "system/core/libsystem/include/system": PACKAGED / "system",
-    "system/core/libutils/include/utils": PACKAGED / "utils",
-    "system/libbase/include/android-base": PACKAGED / "android-base",
     ENGINE: environment.SOURCE / "engine/include/orvtarn",
 }
+# What Debian packages of the rest differs between its releases.
+MODULES = {"android": "system/core/liblog", "android-base": "system/libbase",
+           "cutils": "system/core/libcutils", "log": "system/core/liblog",
+           "utils": "system/core/libutils"}
+LAYOUT.update((f"{MODULES.get(folder.name, 'system/core')}/include/{folder.name}", folder)
+              for folder in PACKAGED.iterdir()
+              if folder.is_dir() and folder.name not in ("binder", "gui", "media", "nativehelper"))
 THROWS = "int jniThrowException(JNIEnv* env, const char* className, const char* message);\n"
 DESCRIPTOR = "int jniGetFDFromFileDescriptor(JNIEnv* env, jobject fileDescriptor);\n"
 # Fewer sources than all where the fault is in one header.

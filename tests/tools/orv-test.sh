@@ -50,6 +50,8 @@ expect "a target without a name" 2 "lacks its value" "$root/orv" test --target
 expect "another option of bench" 2 "bench does not know '--fast'" "$root/orv" bench --fast
 expect "a filter of bench without a pattern" 2 "lacks its value" "$root/orv" bench --filter
 expect "another doctor" 2 "doctor does not know '--spell'" "$root/orv" doctor --spell x
+ORV_NO_INSTALL=1 expect "a tree that is not there" 2 "none: there is no such folder" \
+    "$root/orv" doctor --tree "$folder/none"
 for script in "$root"/tools/cmd-*.sh; do
     name=$(basename -- "${script#*cmd-}" .sh)
     check "help of $name" 1 "$("$root/orv" help | grep -cE "^  $name( |$)")"
