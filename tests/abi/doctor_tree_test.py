@@ -333,6 +333,14 @@ class DoctorTreeTest(unittest.TestCase):
             1, "class MediaPlayerBase is missing (media/MediaPlayerInterface.h, module libmedia), "
             f"which {ENGINE}/TarnPlayer.h uses"))
 
+    def test_slots_that_cannot_be_seen_are_not_taken_for_right(self):
+        self.change(INTERFACE, "public:\n    // Receives",
+                    "protected:\n    explicit MediaPlayerBase(int);\n\\g<0>")
+        status, lines = self.check(SERVICE)
+        self.assertEqual((status, len(lines)), (1, 2), lines)
+        self.assertRegex(lines[0], "^the slots of class MediaPlayerBase could not be seen: "
+                         "constructor for .* must explicitly initialize the base class")
+
     def test_the_page_lists_the_operations_by_slot(self):
         page = (environment.SOURCE / "docs/platform-tree.md").read_text()
         listed = re.findall(r"^\| (\d+) \| `(.*)` \|$", page, re.MULTILINE)
@@ -354,12 +362,22 @@ class DoctorTreeTest(unittest.TestCase):
         empty.mkdir()
         self.refused(empty, "holds no header that the sources include")
 
-    def test_without_a_compiler_nothing_is_checked(self):
+    def test_without_a_compiler_that_works_nothing_is_sound(self):
         tool = environment.SOURCE / "tools/inspect/tree.py"
-        done = subprocess.run(["/usr/bin/python3", "-B", tool, self.tree, environment.SOURCE],
-                              env={"PATH": str(self.folder)}, capture_output=True, text=True)
+
+        def run():
+            return subprocess.run(["/usr/bin/python3", "-B", tool, self.tree, environment.SOURCE],
+                                  env={"PATH": str(self.folder)}, capture_output=True, text=True)
+        done = run()
         self.assertEqual((done.returncode, done.stdout, done.stderr), (
             2, "", "orv: clang++ is not installed; it comes with the package clang\n"))
+        broken = self.folder / "clang++"
+        broken.write_text("#!/bin/sh\necho clang++: error: no such target >&2\nexit 1\n")
+        broken.chmod(0o755)
+        done = run()
+        source = environment.cmake_sources()[0]
+        self.assertEqual((done.returncode, done.stdout.splitlines()[0]),
+                         (1, f"{source}: clang++: error: no such target"))
 
 
 if __name__ == "__main__":

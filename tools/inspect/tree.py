@@ -9,7 +9,7 @@ Android.bp says, without making anything. Ends with 0 when nothing is lacking,
 
 import concurrent.futures
 import os
-import shlex
+import re
 import shutil
 import subprocess
 import sys
@@ -37,6 +37,7 @@ class Check:
         self.headers = tree_headers.Headers(self.tree, self.folders)
         self.words = tree_words.Words(self.product, self.tree, self.modules, releases)
         self.findings = {}
+        self.unseen = ""  # why the slots could not be looked at
         with open(os.path.join(self.product, "Android.bp"), encoding="utf-8") as file:
             self.read_build_file(file.read())
 
@@ -93,8 +94,8 @@ class Check:
         while any([self.headers.find(header) for header in lacking]):
             lacking, found = self.lacking_of(text)
         for header in lacking:
-            includer = next(self.words.path(path) for path in found
-                            if tree_headers.includes(path, header))
+            includer = next((self.words.path(path) for path in found
+                             if tree_headers.includes(path, header)), "another header")
             self.findings.setdefault(header, f"header {header} is missing, which {includer} "
                                      f"includes{self.headers.generated_note(header)}")
 
@@ -102,7 +103,8 @@ class Check:
         """(headers that are not found, files that are): the compiler leaves a
         header that it does not find as it is included."""
         rule = self.clang("-w", "-M", "-MG", "-x", "c++", "-", text=text).stdout
-        files = shlex.split(rule.replace("\\\n", " "))[1:]
+        files = [re.sub(r"\\(.)", r"\1", file) for file in re.findall(
+            r"(?:\\.|\S)+", rule.replace("\\\n", " "))][1:]
         return ([file for file in files if not os.path.isabs(file)],
                 [file for file in files if os.path.isabs(file)])
 
@@ -112,12 +114,19 @@ class Check:
                           "-Xclang", "-fdump-vtable-layouts", text=tree_slots.probe(operations))
         if done.returncode == 0:
             return list(tree_slots.said_of_slots(operations, done.stdout))
-        return list(tree_slots.said_of_results(operations, tree_words.parse(done.stderr)))
+        diagnostics = tree_words.parse(done.stderr)
+        said = list(tree_slots.said_of_results(operations, diagnostics))
+        if not said:
+            self.unseen = diagnostics[0].text if diagnostics else done.stderr.strip()
+        return said
 
     def check_source(self, source):
         """Whether it compiles, what is to be reported of it otherwise."""
         done = self.clang("-fsyntax-only", source)
-        diagnostics = list(filter(self.words.concerns_sources, tree_words.parse(done.stderr)))
+        everything = tree_words.parse(done.stderr)
+        if done.returncode != 0 and not everything:
+            return False, [("", f"{source}: {done.stderr.strip()}")]
+        diagnostics = list(filter(self.words.concerns_sources, everything))
         if not diagnostics:
             return True, []
         said = [pair for diagnostic in diagnostics for pair in self.words.say(diagnostic)]
@@ -132,6 +141,9 @@ class Check:
         for said in [slots.result(), *(said for _, said in results)]:
             for name, sentence in said:
                 self.findings.setdefault(name, sentence)
+        if self.unseen and not self.findings:
+            self.findings[tree_words.BASE] = (
+                f"the slots of class {tree_words.BASE} could not be seen: {self.unseen}")
         return sum(compiles for compiles, _ in results)
 
 

@@ -90,8 +90,12 @@ class Words:
         return sentence, sentence
 
     def line_of(self, diagnostic):
-        with open(os.path.join(self.product, diagnostic.file), encoding="utf-8",
-                  errors="replace") as file:
+        """The source text there; the compiler also points into macros, which
+        are no files."""
+        path = os.path.join(self.product, diagnostic.file)
+        if not os.path.isfile(path):
+            return ""
+        with open(path, encoding="utf-8", errors="replace") as file:
             return file.read().splitlines()[diagnostic.line - 1]
 
     def rest_of_line(self, diagnostic):
