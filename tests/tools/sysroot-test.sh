@@ -60,6 +60,7 @@ expect "interruption" 1 "no sysroot: interrupted; the next run starts over"
 stand_in mmdebstrap <<<'mkdir -p "${@: -2:1}/etc" && ln -s /etc/real "${@: -2:1}/etc/link"'
 mkdir -p "$sysroot.unfinished/left-by-a-killed-run"
 expect "success" 0 "making the armhf sysroot"
+check "programs find their loader" usr/lib "$(readlink "$sysroot/lib")"
 check "links stay inside" real "$(readlink "$sysroot/etc/link")"
 check_absent "starts over" "$sysroot/left-by-a-killed-run"
 

@@ -17,15 +17,14 @@ run_player() {
 # A short life needs a quick start: one compiler tier, the simplest collector,
 # and the program's classes from an archive.
 set_java_command() {
-    local jars=$ORV_BUILD/java share=/usr/share/java
+    local jars=$ORV_BUILD/java
     # An archive is one Java's; after an update of Java another is made.
     CLASS_ARCHIVE=$jars/player-$(stat -Lc '%Z-%s' -- "$JAVA_HOME/bin/java").jsa
-    JAVA_COMMAND=("$JAVA_HOME/bin/java" --enable-native-access=ALL-UNNAMED -XX:TieredStopAtLevel=1 -XX:+UseSerialGC
+    JAVA_COMMAND=("$JAVA_HOME/bin/java" -XX:TieredStopAtLevel=1 -XX:+UseSerialGC
         -Xshare:auto "-XX:SharedArchiveFile=$CLASS_ARCHIVE" -Xlog:disable -Xlog:all=error:stderr
         "-Djava.library.path=$ORV_BUILD/lib"
         "-Dorv.sample=$ORV_BUILD/media/sample.mkv" "-Dorv.make-sample=$ORV_ROOT/tools/make-sample"
-        -cp "$jars/orv_player.jar:$jars/mediaplayer_orv_java.jar:$jars/orv_platform_java.jar:$share/picocli.jar:$share/gson.jar"
-        com.quintora.orv.player.Main)
+        -jar "$jars/orv_player.jar")
 }
 
 # Made by a run that loads the classes; without an archive the player starts too.
