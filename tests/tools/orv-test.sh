@@ -139,6 +139,8 @@ stand_in pkg-config <<<'exit 1'
 expect "no mpv yet" 0 "" part check_mpv
 
 stand_in id <<<'echo 1000'
+expect "another release without root rights" 1 "can only be entered as root: sudo ./orv test --release trixie" \
+    "$root/orv" test --release trixie
 expect "no sudo" 1 "there is no sudo here. As root: apt-get install --no-install-recommends mmdebstrap" \
     bare part need_packages try armhf
 stand_in sudo <<<'exit 1'
