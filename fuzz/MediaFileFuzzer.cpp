@@ -7,10 +7,10 @@
 
 #include <algorithm>
 
-#include "AlbumArt.h"
-#include "ContainerInfo.h"
-#include "MediaFile.h"
-#include "Thumbnailer.h"
+#include "inspect/AlbumArt.h"
+#include "inspect/ContainerInfo.h"
+#include "inspect/MediaFile.h"
+#include "inspect/Thumbnailer.h"
 
 extern "C" {
 #include <libavutil/log.h>

@@ -7,7 +7,7 @@
 
 #include <algorithm>
 
-#include "RecordText.h"
+#include "base/RecordText.h"
 
 namespace {
 

@@ -3,8 +3,8 @@
 
 #include <utility>
 
-#include "AlbumArt.h"
-#include "PictureCanvas.h"
+#include "inspect/AlbumArt.h"
+#include "inspect/PictureCanvas.h"
 
 namespace android {
 
@@ -76,13 +76,14 @@ bool TarnPlayer::Engine::drawThumbnail(const _Media_Thumbnail_Info_T* thumbnail)
     int position = 0;
     if (state.requireOpen(kName) != NO_ERROR) return false;
     transport.getCurrentPosition(&position);
-    const status_t status = loader.details()->draw(position, tracks.shownVideoStream(), *thumbnail);
+    const status_t status =
+        loader.secondReading()->draw(position, tracks.shownVideoStream(), *thumbnail);
     return status == NO_ERROR || orvtarn::failed(status, kName, "no picture") == NO_ERROR;
 }
 
 MediaAlbumArt* TarnPlayer::Engine::copyAlbumArt() {
     MediaAlbumArt* art = nullptr;
-    loader.details()->withFile(
+    loader.secondReading()->withFile(
         [&](orvtarn::MediaFile& file) { art = orvtarn::extractAlbumArt(file); });
     if (art == nullptr) orvtarn::refused("extractAlbumArt", "no picture");
     return art;

@@ -3,26 +3,26 @@
 
 #include <orvtarn/TarnPlayer.h>
 
-#include "AbRepeat.h"
-#include "Audio.h"
-#include "BytePosition.h"
-#include "EngineLog.h"
-#include "EventLoop.h"
 #include "Gate.h"
-#include "Loader.h"
-#include "MediaMetaData.h"
-#include "MpvHandle.h"
-#include "Notifier.h"
-#include "Parameters.h"
-#include "PlayerState.h"
-#include "Seeker.h"
-#include "Speed.h"
-#include "Stepper.h"
-#include "StreamProtocol.h"
-#include "Subtitles.h"
-#include "Tracks.h"
-#include "Transport.h"
-#include "VideoOutput.h"
+#include "base/EngineLog.h"
+#include "core/EventLoop.h"
+#include "core/MpvHandle.h"
+#include "core/Notifier.h"
+#include "core/PlayerState.h"
+#include "core/VideoOutput.h"
+#include "playback/AbRepeat.h"
+#include "playback/Audio.h"
+#include "playback/BytePosition.h"
+#include "playback/Loader.h"
+#include "playback/MediaMetaData.h"
+#include "playback/Parameters.h"
+#include "playback/Seeker.h"
+#include "playback/Speed.h"
+#include "playback/Stepper.h"
+#include "playback/Subtitles.h"
+#include "playback/Tracks.h"
+#include "playback/Transport.h"
+#include "source/StreamProtocol.h"
 
 namespace android {
 
@@ -39,6 +39,17 @@ public:
         if (pass) return operation();
         orvtarn::refused(name, "the player is released");
         return closed;
+    }
+
+    // The same for operations that answer a status, and for those that answer
+    // whether they succeeded.
+    template <class Operation>
+    status_t status(const char* name, Operation operation) {
+        return call(name, status_t{INVALID_OPERATION}, operation);
+    }
+    template <class Operation>
+    bool flag(const char* name, Operation operation) {
+        return call(name, false, operation);
     }
 
     // Ends the operations under way and takes the units apart. Once; later

@@ -36,7 +36,7 @@ void TarnPlayer::configPlayer(bool ssif) {
 }
 
 void TarnPlayer::setPcmFlag() {
-    mEngine->call(__func__, status_t{INVALID_OPERATION}, [&] { return mEngine->loader.setRaw(); });
+    mEngine->status(__func__, [&] { return mEngine->loader.setRaw(); });
 }
 
 int TarnPlayer::setABRepeat(int type) {
@@ -53,73 +53,62 @@ MediaAlbumArt* TarnPlayer::extractAlbumArt() {
 }
 
 status_t TarnPlayer::setDataSource(const char* url, const KeyedVector<String8, String8>* headers) {
-    return mEngine->call(__func__, status_t{INVALID_OPERATION},
-                         [&] { return mEngine->loader.setUrl(url, pairsOf(headers)); });
+    return mEngine->status(__func__, [&] { return mEngine->loader.setUrl(url, pairsOf(headers)); });
 }
 
 status_t TarnPlayer::setDataSource(IOrvStreamSource* source) {
-    return mEngine->call(__func__, status_t{INVALID_OPERATION},
-                         [&] { return mEngine->loader.setStream(source); });
+    return mEngine->status(__func__, [&] { return mEngine->loader.setStream(source); });
 }
 
 status_t TarnPlayer::setDataSource(int fd, int64_t offset, int64_t length) {
-    return mEngine->call(__func__, status_t{INVALID_OPERATION},
-                         [&] { return mEngine->loader.setFd(fd, offset, length); });
+    return mEngine->status(__func__, [&] { return mEngine->loader.setFd(fd, offset, length); });
 }
 
 status_t TarnPlayer::setVideoSurfaceTexture(const sp<IGraphicBufferProducer>& bufferProducer) {
-    return mEngine->call(__func__, status_t{INVALID_OPERATION}, [&] {
+    return mEngine->status(__func__, [&] {
         mEngine->video.setProducer(bufferProducer);
         return status_t{NO_ERROR};
     });
 }
 
 status_t TarnPlayer::prepare() {
-    return mEngine->call(__func__, status_t{INVALID_OPERATION},
-                         [&] { return mEngine->loader.prepare(); });
+    return mEngine->status(__func__, [&] { return mEngine->loader.prepare(); });
 }
 
 status_t TarnPlayer::prepareAsync() {
-    return mEngine->call(__func__, status_t{INVALID_OPERATION},
-                         [&] { return mEngine->loader.prepareAsync(); });
+    return mEngine->status(__func__, [&] { return mEngine->loader.prepareAsync(); });
 }
 
 status_t TarnPlayer::start() {
-    return mEngine->call(__func__, status_t{INVALID_OPERATION},
-                         [&] { return mEngine->transport.start(); });
+    return mEngine->status(__func__, [&] { return mEngine->transport.start(); });
 }
 
 status_t TarnPlayer::stop() {
-    return mEngine->call(__func__, status_t{INVALID_OPERATION},
-                         [&] { return mEngine->loader.stop(); });
+    return mEngine->status(__func__, [&] { return mEngine->loader.stop(); });
 }
 
 status_t TarnPlayer::pause() {
-    return mEngine->call(__func__, status_t{INVALID_OPERATION},
-                         [&] { return mEngine->transport.pause(); });
+    return mEngine->status(__func__, [&] { return mEngine->transport.pause(); });
 }
 
 bool TarnPlayer::isPlaying() {
-    return mEngine->call(__func__, false, [&] { return mEngine->transport.isPlaying(); });
+    return mEngine->flag(__func__, [&] { return mEngine->transport.isPlaying(); });
 }
 
 status_t TarnPlayer::seekTo(int msec, int mode) {
-    return mEngine->call(__func__, status_t{INVALID_OPERATION},
-                         [&] { return mEngine->seeker.seekTo(msec, mode); });
+    return mEngine->status(__func__, [&] { return mEngine->seeker.seekTo(msec, mode); });
 }
 
 status_t TarnPlayer::getCurrentPosition(int* msec) {
-    return mEngine->call(__func__, status_t{INVALID_OPERATION},
-                         [&] { return mEngine->transport.getCurrentPosition(msec); });
+    return mEngine->status(__func__, [&] { return mEngine->transport.getCurrentPosition(msec); });
 }
 
 status_t TarnPlayer::getDuration(int* msec) {
-    return mEngine->call(__func__, status_t{INVALID_OPERATION},
-                         [&] { return mEngine->transport.getDuration(msec); });
+    return mEngine->status(__func__, [&] { return mEngine->transport.getDuration(msec); });
 }
 
 status_t TarnPlayer::reset() {
-    const status_t status = mEngine->call(__func__, status_t{INVALID_OPERATION}, [&] {
+    const status_t status = mEngine->status(__func__, [&] {
         mEngine->loader.reset();
         return status_t{NO_ERROR};
     });
@@ -129,56 +118,47 @@ status_t TarnPlayer::reset() {
 }
 
 status_t TarnPlayer::setLooping(int loop) {
-    return mEngine->call(__func__, status_t{INVALID_OPERATION},
-                         [&] { return mEngine->transport.setLooping(loop != 0); });
+    return mEngine->status(__func__, [&] { return mEngine->transport.setLooping(loop != 0); });
 }
 
 status_t TarnPlayer::setParameter(int key, const Parcel& request) {
-    return mEngine->call(__func__, status_t{INVALID_OPERATION},
-                         [&] { return mEngine->parameters.set(key, request); });
+    return mEngine->status(__func__, [&] { return mEngine->parameters.set(key, request); });
 }
 
 status_t TarnPlayer::getParameter(int key, Parcel* reply) {
-    return mEngine->call(__func__, status_t{INVALID_OPERATION},
-                         [&] { return mEngine->parameters.get(key, reply); });
+    return mEngine->status(__func__, [&] { return mEngine->parameters.get(key, reply); });
 }
 
 status_t TarnPlayer::invoke(const Parcel& request, Parcel* reply) {
-    return mEngine->call(__func__, status_t{INVALID_OPERATION},
-                         [&] { return mEngine->parameters.invoke(request, reply); });
+    return mEngine->status(__func__, [&] { return mEngine->parameters.invoke(request, reply); });
 }
 
 status_t TarnPlayer::getMetadata(const SortedVector<int>& ids, Parcel* records) {
-    return mEngine->call(__func__, status_t{INVALID_OPERATION},
-                         [&] { return mEngine->metaData.write(ids, records); });
+    return mEngine->status(__func__, [&] { return mEngine->metaData.write(ids, records); });
 }
 
 status_t TarnPlayer::setVolume(float left, float right) {
-    return mEngine->call(__func__, status_t{INVALID_OPERATION},
-                         [&] { return mEngine->audio.setVolume(left, right); });
+    return mEngine->status(__func__, [&] { return mEngine->audio.setVolume(left, right); });
 }
 
 status_t TarnPlayer::getVideoWidth(int* w) {
-    return mEngine->call(__func__, status_t{INVALID_OPERATION},
-                         [&] { return mEngine->transport.getVideoWidth(w); });
+    return mEngine->status(__func__, [&] { return mEngine->transport.getVideoWidth(w); });
 }
 
 status_t TarnPlayer::getVideoHeight(int* h) {
-    return mEngine->call(__func__, status_t{INVALID_OPERATION},
-                         [&] { return mEngine->transport.getVideoHeight(h); });
+    return mEngine->status(__func__, [&] { return mEngine->transport.getVideoHeight(h); });
 }
 
 status_t TarnPlayer::getCurrentBytePosition(int* pos) {
-    return mEngine->call(__func__, status_t{INVALID_OPERATION},
-                         [&] { return mEngine->bytes.get(pos); });
+    return mEngine->status(__func__, [&] { return mEngine->bytes.get(pos); });
 }
 
 bool TarnPlayer::canDoSeek(int speed) {
-    return mEngine->call(__func__, false, [&] { return mEngine->speed.canSeek(speed); });
+    return mEngine->flag(__func__, [&] { return mEngine->speed.canSeek(speed); });
 }
 
 bool TarnPlayer::canDoTrick(int speed) {
-    return mEngine->call(__func__, false, [&] { return mEngine->speed.canPlay(speed); });
+    return mEngine->flag(__func__, [&] { return mEngine->speed.canPlay(speed); });
 }
 
 bool TarnPlayer::setTS(unsigned short ts) {
@@ -187,56 +167,54 @@ bool TarnPlayer::setTS(unsigned short ts) {
 }
 
 bool TarnPlayer::step(int amount) {
-    return mEngine->call(__func__, false, [&] { return mEngine->stepper.step(amount); });
+    return mEngine->flag(__func__, [&] { return mEngine->stepper.step(amount); });
 }
 
 status_t TarnPlayer::setSpeed(int speed) {
-    return mEngine->call(__func__, status_t{INVALID_OPERATION},
-                         [&] { return mEngine->speed.set(speed); });
+    return mEngine->status(__func__, [&] { return mEngine->speed.set(speed); });
 }
 
 bool TarnPlayer::getSpeed(int& speed) {
-    return mEngine->call(__func__, false, [&] {
+    return mEngine->flag(__func__, [&] {
         speed = mEngine->speed.get();
         return true;
     });
 }
 
 bool TarnPlayer::seekToPosition(unsigned long long pos) {
-    return mEngine->call(__func__, false, [&] { return mEngine->bytes.seekTo(pos); });
+    return mEngine->flag(__func__, [&] { return mEngine->bytes.seekTo(pos); });
 }
 
 bool TarnPlayer::getThumbnailInfo(_Media_Thumbnail_Info_T* thumbnail) {
-    return mEngine->call(__func__, false, [&] { return mEngine->drawThumbnail(thumbnail); });
+    return mEngine->flag(__func__, [&] { return mEngine->drawThumbnail(thumbnail); });
 }
 
 bool TarnPlayer::getMetaDataInfo(MetaDataInfo& info) {
-    return mEngine->call(__func__, false, [&] { return mEngine->metaData.get(info); });
+    return mEngine->flag(__func__, [&] { return mEngine->metaData.get(info); });
 }
 
 bool TarnPlayer::getVideoCodecInfo(VideoCodecInfo& info) {
-    return mEngine->call(__func__, false, [&] { return mEngine->tracks.currentVideoInfo(info); });
+    return mEngine->flag(__func__, [&] { return mEngine->tracks.currentVideoInfo(info); });
 }
 
 bool TarnPlayer::getVideoCodecInfo(int index, VideoCodecInfo& info) {
-    return mEngine->call(__func__, false, [&] { return mEngine->tracks.videoInfo(index, info); });
+    return mEngine->flag(__func__, [&] { return mEngine->tracks.videoInfo(index, info); });
 }
 
 bool TarnPlayer::getVideoTrackCount(int& count) {
-    return mEngine->call(__func__, false, [&] { return mEngine->tracks.videoCount(count); });
+    return mEngine->flag(__func__, [&] { return mEngine->tracks.videoCount(count); });
 }
 
 bool TarnPlayer::getAudioTrackCount(int& count) {
-    return mEngine->call(__func__, false, [&] { return mEngine->tracks.audioCount(count); });
+    return mEngine->flag(__func__, [&] { return mEngine->tracks.audioCount(count); });
 }
 
 bool TarnPlayer::getAudioTrackInfo(bool flag, int index, AudioTrackInfo& info) {
-    return mEngine->call(__func__, false,
-                         [&] { return mEngine->tracks.audioInfo(flag, index, info); });
+    return mEngine->flag(__func__, [&] { return mEngine->tracks.audioInfo(flag, index, info); });
 }
 
 bool TarnPlayer::selectAudioTrack(int index) {
-    return mEngine->call(__func__, false, [&] { return mEngine->tracks.selectAudio(index); });
+    return mEngine->flag(__func__, [&] { return mEngine->tracks.selectAudio(index); });
 }
 
 status_t TarnPlayer::getCurrentAudioIndex(int* index) {
@@ -245,12 +223,11 @@ status_t TarnPlayer::getCurrentAudioIndex(int* index) {
 }
 
 bool TarnPlayer::getSubtitleTrackCount(int& count) {
-    return mEngine->call(__func__, false, [&] { return mEngine->tracks.subtitleCount(count); });
+    return mEngine->flag(__func__, [&] { return mEngine->tracks.subtitleCount(count); });
 }
 
 bool TarnPlayer::getSubtitleTrackInfo(int index, SubtitleTrackInfo& info) {
-    return mEngine->call(__func__, false,
-                         [&] { return mEngine->tracks.subtitleInfo(index, info); });
+    return mEngine->flag(__func__, [&] { return mEngine->tracks.subtitleInfo(index, info); });
 }
 
 status_t TarnPlayer::getCurrentSubtitleIndex(int* index) {
@@ -259,53 +236,52 @@ status_t TarnPlayer::getCurrentSubtitleIndex(int* index) {
 }
 
 bool TarnPlayer::onSubtitleTrack(int index) {
-    return mEngine->call(__func__, false, [&] { return mEngine->tracks.selectSubtitle(index); });
+    return mEngine->flag(__func__, [&] { return mEngine->tracks.selectSubtitle(index); });
 }
 
 bool TarnPlayer::offSubtitleTrack() {
-    return mEngine->call(__func__, false, [&] { return mEngine->tracks.subtitlesOff(); });
+    return mEngine->flag(__func__, [&] { return mEngine->tracks.subtitlesOff(); });
 }
 
 bool TarnPlayer::selectTrack(int index) {
-    return mEngine->call(__func__, false, [&] { return mEngine->tracks.select(index); });
+    return mEngine->flag(__func__, [&] { return mEngine->tracks.select(index); });
 }
 
 bool TarnPlayer::deselectTrack(int index) {
-    return mEngine->call(__func__, false, [&] { return mEngine->tracks.deselect(index); });
+    return mEngine->flag(__func__, [&] { return mEngine->tracks.deselect(index); });
 }
 
 bool TarnPlayer::addTimedTextSource(const char* path) {
-    return mEngine->call(__func__, false, [&] {
+    return mEngine->flag(__func__, [&] {
         return mEngine->subtitles.add("addTimedTextSource", path, false) == NO_ERROR;
     });
 }
 
 bool TarnPlayer::setSubtitleDataSource(const char* url) {
-    return mEngine->call(__func__, false, [&] {
+    return mEngine->flag(__func__, [&] {
         return mEngine->subtitles.add("setSubtitleDataSource", url, true) == NO_ERROR;
     });
 }
 
 bool TarnPlayer::setSubtitleDataSourceEx(const char* sub, const char* idx) {
-    return mEngine->call(__func__, false,
+    return mEngine->flag(__func__,
                          [&] { return mEngine->subtitles.addPair(sub, idx) == NO_ERROR; });
 }
 
 bool TarnPlayer::setSubtitleAttr(int type, void* attr) {
-    return mEngine->call(__func__, false, [&] { return mEngine->subtitles.stage(type, attr); });
+    return mEngine->flag(__func__, [&] { return mEngine->subtitles.stage(type, attr); });
 }
 
 bool TarnPlayer::flushSubtitleAttr() {
-    return mEngine->call(__func__, false, [&] { return mEngine->subtitles.flush(); });
+    return mEngine->flag(__func__, [&] { return mEngine->subtitles.flush(); });
 }
 
 status_t TarnPlayer::setPlayerRole(E_Orv_Player_Role_Type role) {
-    return mEngine->call(__func__, status_t{INVALID_OPERATION},
-                         [&] { return mEngine->audio.setRole(role); });
+    return mEngine->status(__func__, [&] { return mEngine->audio.setRole(role); });
 }
 
 status_t TarnPlayer::setPCMMediaInfo(IORV_PB_CTRL_SET_MEDIA_INFO_T* info) {
-    return mEngine->call(__func__, status_t{INVALID_OPERATION}, [&] {
+    return mEngine->status(__func__, [&] {
         if (info == nullptr) return orvtarn::failed(BAD_VALUE, "setPCMMediaInfo", "null argument");
         return mEngine->loader.setRawFormat("setPCMMediaInfo", *info);
     });

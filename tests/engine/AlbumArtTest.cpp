@@ -1,8 +1,8 @@
 // SPDX-License-Identifier: Apache-2.0
 #include <gtest/gtest.h>
 
-#include "AlbumArt.h"
 #include "TestMedia.h"
+#include "inspect/AlbumArt.h"
 
 namespace orvtarn {
 namespace {

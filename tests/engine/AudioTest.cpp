@@ -8,9 +8,9 @@
 #include <chrono>
 #include <string>
 
-#include "Audio.h"
-#include "MpvHandle.h"
 #include "TestMedia.h"
+#include "core/MpvHandle.h"
+#include "playback/Audio.h"
 
 using namespace orvtarn;
 using namespace orvtest;

@@ -4,7 +4,7 @@
 
 #include <string>
 
-#include "CodecFourCC.h"
+#include "records/CodecFourCC.h"
 
 namespace orvtarn {
 namespace {

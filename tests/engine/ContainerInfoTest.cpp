@@ -1,8 +1,8 @@
 // SPDX-License-Identifier: Apache-2.0
 #include <gtest/gtest.h>
 
-#include "ContainerInfo.h"
 #include "TestMedia.h"
+#include "inspect/ContainerInfo.h"
 
 namespace orvtarn {
 namespace {

@@ -6,11 +6,11 @@
 
 #include <random>
 
-#include "AlbumArt.h"
-#include "ContainerInfo.h"
-#include "MediaFile.h"
 #include "TestMedia.h"
-#include "Thumbnailer.h"
+#include "inspect/AlbumArt.h"
+#include "inspect/ContainerInfo.h"
+#include "inspect/MediaFile.h"
+#include "inspect/Thumbnailer.h"
 
 extern "C" {
 #include <libavformat/avformat.h>

@@ -4,8 +4,8 @@
 #include <cstdio>
 #include <vector>
 
-#include "PcmFormat.h"
 #include "RealPlayer.h"
+#include "records/PcmFormat.h"
 
 namespace orvtarn {
 namespace {

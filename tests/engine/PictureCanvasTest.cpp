@@ -6,7 +6,7 @@
 #include <memory>
 #include <vector>
 
-#include "PictureCanvas.h"
+#include "inspect/PictureCanvas.h"
 
 extern "C" {
 #include <libavutil/frame.h>

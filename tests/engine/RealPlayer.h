@@ -5,7 +5,7 @@
 
 #include <string>
 
-#include "MpvLoad.h"
+#include "core/MpvLoad.h"
 
 namespace orvtest {
 

@@ -3,7 +3,7 @@
 
 #include <string>
 
-#include "RecordText.h"
+#include "base/RecordText.h"
 
 namespace orvtarn {
 namespace {

@@ -3,7 +3,7 @@
 #include <gtest/gtest.h>
 
 #include "RealPlayer.h"
-#include "SubtitleStyle.h"
+#include "records/SubtitleStyle.h"
 
 namespace orvtarn {
 namespace {

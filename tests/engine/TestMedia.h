@@ -7,7 +7,7 @@
 #include <string>
 #include <vector>
 
-#include "MediaFile.h"
+#include "inspect/MediaFile.h"
 
 namespace orvtest {
 

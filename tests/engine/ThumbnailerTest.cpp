@@ -5,9 +5,9 @@
 #include <atomic>
 #include <cmath>
 
-#include "PictureCanvas.h"
 #include "TestMedia.h"
-#include "Thumbnailer.h"
+#include "inspect/PictureCanvas.h"
+#include "inspect/Thumbnailer.h"
 
 namespace orvtarn {
 namespace {

@@ -6,10 +6,10 @@
 #include <list>
 #include <string>
 
-#include "CodecFourCC.h"
 #include "RealPlayer.h"
 #include "TestMedia.h"
-#include "TrackRecords.h"
+#include "records/CodecFourCC.h"
+#include "records/TrackRecords.h"
 
 namespace orvtarn {
 namespace {

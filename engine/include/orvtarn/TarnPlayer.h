@@ -39,7 +39,7 @@ namespace android {
 class TarnPlayer : public MediaPlayerBase {
 public:
     // -1 makes a player that is not bound to a hardware decoder. Sets the
-    // process's LC_NUMERIC to "C". A player whose playback core cannot start, as
+    // process's LC_NUMERIC to "C". A player whose mpv cannot start, as
     // without memory, is as a released one.
     explicit TarnPlayer(int decoder);
 

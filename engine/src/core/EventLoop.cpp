@@ -1,0 +1,347 @@
+// SPDX-License-Identifier: Apache-2.0
+#include "core/EventLoop.h"
+
+#include <math.h>
+#include <media/MediaPlayerInterface.h>
+#include <orvtarn/PlayerTypes.h>
+#include <string.h>
+
+#include <algorithm>
+#include <string>
+#include <utility>
+
+#include "base/EngineLog.h"
+#include "base/ThreadName.h"
+#include "core/MpvError.h"
+#include "source/ServerProbe.h"
+
+namespace orvtarn {
+namespace {
+
+enum ObservedProperty : uint64_t {
+    kTime = 1,
+    kDuration,
+    kEndReached,
+    kSeekable,
+    kBuffering,
+    kBufferedUntil,
+};
+
+struct Observed {
+    ObservedProperty id;
+    const char* name;
+    mpv_format format;
+};
+
+const Observed kObserved[] = {
+    {kTime, "time-pos", MPV_FORMAT_DOUBLE},
+    {kDuration, "duration", MPV_FORMAT_DOUBLE},
+    {kEndReached, "eof-reached", MPV_FORMAT_FLAG},
+    {kSeekable, "seekable", MPV_FORMAT_FLAG},
+    {kBuffering, "paused-for-cache", MPV_FORMAT_FLAG},
+    {kBufferedUntil, "demuxer-cache-time", MPV_FORMAT_DOUBLE},
+};
+
+double numberOf(const mpv_event_property& property) {
+    return *static_cast<const double*>(property.data);
+}
+
+bool flagOf(const mpv_event_property& property) {
+    return *static_cast<const int*>(property.data) != 0;
+}
+
+int64_t toMicroseconds(double seconds) { return llround(std::max(seconds, 0.0) * 1e6); }
+
+// Places in mpv's load at which it waits.
+constexpr char kBeforeOpening[] = "on_load";
+constexpr char kOpened[] = "on_preloaded";
+
+}  // namespace
+
+bool EventLoop::start() {
+    for (const Observed& property : kObserved) {
+        const int error =
+            mpv_observe_property(mMpv.get(), property.id, property.name, property.format);
+        if (error < 0) return refused("observe", mpv_error_string(error));
+    }
+    for (const char* hook : {kBeforeOpening, kOpened}) {
+        const int error = mpv_hook_add(mMpv.get(), 0, hook, 0);
+        if (error < 0) return refused("observe", mpv_error_string(error));
+    }
+    mpv_request_log_messages(mMpv.get(), "error");
+    mThread = std::thread(&EventLoop::run, this);
+    return true;
+}
+
+void EventLoop::stop() {
+    if (!mThread.joinable()) return;
+    mQuit = true;
+    mpv_wakeup(mMpv.get());
+    mThread.join();
+}
+
+void EventLoop::setSource(std::shared_ptr<MediaSource> source) {
+    std::lock_guard<std::mutex> lock(mSourceMutex);
+    mSource = std::move(source);
+}
+
+void EventLoop::run() {
+    nameThisThread("orv-events");
+    while (!mQuit) {
+        handle(*mpv_wait_event(mMpv.get(), -1));
+        if (mLooksForEnd.exchange(false)) onEndReached();
+        tellFrameTime();
+    }
+}
+
+// While playing, mpv's own time may be that of the frame to come; paused,
+// the state may still be that of the frame before.
+std::optional<int64_t> EventLoop::frameTime(uint64_t frame) {
+    const PlayerState::Values now = mState.read([](const PlayerState::Values& v) { return v; });
+    if (now.phase == Phase::Started) return toMicroseconds(now.position);
+    mUntimedFrame = frame;
+    mpv_wakeup(mMpv.get());
+    return {};
+}
+
+// Until a seek or the load is done, mpv's time may be the one that it left
+// or the one that was asked for.
+void EventLoop::tellFrameTime() {
+    uint64_t frame = mUntimedFrame;
+    if (frame == 0) return;
+    const PlayerState::Values now = mState.read([](const PlayerState::Values& v) { return v; });
+    if (now.seeking || (now.phase == Phase::Preparing && !now.restarted)) return;
+    const double time = mMpv.getDouble("time-pos").value_or(now.position);
+    mVideo.setFrameTime(frame, toMicroseconds(time));
+    mUntimedFrame.compare_exchange_strong(frame, 0);  // unless the next one is here
+}
+
+void EventLoop::lookForEnd() {
+    mLooksForEnd = true;
+    mpv_wakeup(mMpv.get());
+}
+
+void EventLoop::handle(const mpv_event& event) {
+    switch (event.event_id) {
+        case MPV_EVENT_START_FILE:
+            mState.update([](PlayerState::Values& v) { v.fileStarted = true; });
+            break;
+        case MPV_EVENT_END_FILE:
+            onEndFile(*static_cast<const mpv_event_end_file*>(event.data));
+            break;
+        case MPV_EVENT_HOOK:
+            onHook(*static_cast<const mpv_event_hook*>(event.data));
+            break;
+        case MPV_EVENT_FILE_LOADED:
+            onLoaded();
+            break;
+        case MPV_EVENT_SEEK:
+            mState.update([](PlayerState::Values& v) { v.seeks++; });
+            break;
+        case MPV_EVENT_PLAYBACK_RESTART:
+            onRestart();
+            break;
+        case MPV_EVENT_VIDEO_RECONFIG:
+            onVideoSize();
+            break;
+        case MPV_EVENT_PROPERTY_CHANGE:
+            onProperty(*static_cast<const mpv_event_property*>(event.data));
+            break;
+        case MPV_EVENT_LOG_MESSAGE: {
+            const auto* message = static_cast<const mpv_event_log_message*>(event.data);
+            const std::string text(message->text, strcspn(message->text, "\n"));
+            ALOGW("%s: %s", message->prefix, text.c_str());
+            break;
+        }
+        default:
+            break;
+    }
+}
+
+void EventLoop::onHook(const mpv_event_hook& hook) {
+    // Of a playlist, the first entry is the media: mpv would go on to the
+    // others, and even when the first fails.
+    if (strcmp(hook.name, kBeforeOpening) == 0) mMpv.command({"playlist-clear"});
+    if (strcmp(hook.name, kOpened) == 0 && mOpenedHandler) mOpenedHandler();
+    mpv_hook_continue(mMpv.get(), hook.id);
+}
+
+// Formats without an index find key frames by guessing, sometimes behind the
+// time that was asked for: exact seeks begin further ahead there.
+void EventLoop::onLoaded() {
+    const bool indexed = mMpv.getString("file-format").value_or("").find("mpeg") != 0;
+    mMpv.set("hr-seek-demuxer-offset", indexed ? 0.0 : 2.0);
+    // A connection that breaks loses it.
+    mFileSize = mMpv.getInt("file-size").value_or(0);
+}
+
+void EventLoop::onEndFile(const mpv_event_end_file& end) {
+    const bool isPlaylist = end.reason == MPV_END_FILE_REASON_REDIRECT;
+    if (isPlaylist && end.playlist_insert_num_entries > 0) return;
+    if (end.reason == MPV_END_FILE_REASON_ERROR) {
+        failWith(sourceFailed() ? ORV_ERROR_IO : statusOfMpvError(end.error));
+    } else if (isPlaylist || end.reason == MPV_END_FILE_REASON_EOF) {
+        failWith(sourceFailed() ? ORV_ERROR_IO : ORV_ERROR_MALFORMED);
+    }
+    mState.update([](PlayerState::Values& v) { v.fileOpen = false; });
+}
+
+void EventLoop::onRestart() {
+    onVideoSize();
+    // A track of which nothing can be decoded has no size.
+    const bool hasVideo =
+        mMpv.getInt("vid").value_or(0) > 0 && mMpv.getInt("dwidth").value_or(0) > 0;
+    const bool hasSound = mMpv.getInt("aid").value_or(0) > 0;
+    const double duration = durationOf(mMpv.getDouble("duration").value_or(0));
+    const bool seekable = mMpv.getFlag("seekable").value_or(false);
+    const bool opened = mState.update([&](PlayerState::Values& v) {
+        v.restarts++;
+        if (v.phase != Phase::Preparing) return false;
+        v.restarted = true;
+        v.hasVideo = hasVideo;
+        v.duration = std::max(duration, v.duration);
+        v.seekable = seekable;
+        return true;
+    });
+    if (!opened) return;
+    if (!hasVideo && !hasSound) return failWith(ORV_ERROR_MALFORMED);
+    applyLooping();
+    becomePreparedIfReady();
+}
+
+void EventLoop::onFrame() {
+    const bool first = mState.update([](PlayerState::Values& v) {
+        const bool news = !v.framed && v.fileOpen;
+        v.framed = v.framed || news;
+        return news;
+    });
+    if (!first) return;
+    mNotifier.post(android::MEDIA_INFO, android::MEDIA_INFO_RENDERING_START);
+    becomePreparedIfReady();
+}
+
+void EventLoop::becomePreparedIfReady() {
+    const bool prepared = mState.update([](PlayerState::Values& v) {
+        const bool ready = v.phase == Phase::Preparing && v.restarted && (v.framed || !v.hasVideo);
+        if (ready) v.phase = Phase::Prepared;
+        return ready;
+    });
+    if (prepared) mNotifier.post(android::MEDIA_PREPARED);
+}
+
+void EventLoop::onProperty(const mpv_event_property& property) {
+    if (property.format == MPV_FORMAT_NONE) return;  // not available now: keep the last
+    for (const Observed& observed : kObserved) {
+        if (strcmp(observed.name, property.name) != 0) continue;
+        switch (observed.id) {
+            case kTime:
+                return onTime(numberOf(property));
+            case kDuration: {
+                const double duration = durationOf(numberOf(property));
+                return mState.update([&](PlayerState::Values& v) { v.duration = duration; });
+            }
+            case kEndReached:
+                return flagOf(property) ? onEndReached() : void();
+            case kSeekable:
+                mState.update([&](PlayerState::Values& v) { v.seekable = flagOf(property); });
+                return applyLooping();
+            case kBuffering:
+                return onBuffering(flagOf(property));
+            case kBufferedUntil:
+                return onBuffered(numberOf(property));
+        }
+    }
+}
+
+// At the end of media that cannot seek, mpv would try without a pause.
+void EventLoop::applyLooping() {
+    const bool loops =
+        mState.read([](const PlayerState::Values& v) { return v.looping && v.seekable; });
+    mMpv.set("loop-file", loops ? "inf" : "no");
+}
+
+void EventLoop::onTime(double seconds) {
+    // A word from before a seek or step that is done would undo its position.
+    if (mState.phase() != Phase::Started) seconds = mMpv.getDouble("time-pos").value_or(seconds);
+    mState.update([&](PlayerState::Values& v) { v.position = std::max(seconds, 0.0); });
+}
+
+void EventLoop::onBuffering(bool buffering) {
+    const bool changed = mState.update(
+        [&](PlayerState::Values& v) { return std::exchange(v.buffering, buffering) != buffering; });
+    if (!changed) return;
+    mNotifier.post(android::MEDIA_INFO, buffering ? android::MEDIA_INFO_BUFFERING_START
+                                                  : android::MEDIA_INFO_BUFFERING_END);
+}
+
+void EventLoop::onBuffered(double seconds) {
+    const int percent = mState.update([&](PlayerState::Values& v) {
+        const double share = v.duration > 0 ? seconds / v.duration : 0;
+        const int now = static_cast<int>(100 * std::clamp(share, 0.0, 1.0));
+        return std::exchange(v.bufferPercent, now) == now ? -1 : now;
+    });
+    if (percent >= 0) mNotifier.post(android::MEDIA_BUFFERING_UPDATE, percent);
+}
+
+void EventLoop::onEndReached() {
+    // The word may be older than a seek away from the end.
+    if (!mMpv.getFlag("eof-reached").value_or(false)) return;
+    if (brokeOff()) {
+        mMpv.set("pause", true);
+        return failWith(ORV_ERROR_IO);
+    }
+    // A seek may pass the end on its way; it has the end looked for when done.
+    if (mState.read([](const PlayerState::Values& v) { return v.seeking; })) return;
+    if (mEndHandler()) mNotifier.post(android::MEDIA_PLAYBACK_COMPLETE);
+}
+
+void EventLoop::onVideoSize() {
+    const int width = static_cast<int>(mMpv.getInt("dwidth").value_or(0));
+    const int height = static_cast<int>(mMpv.getInt("dheight").value_or(0));
+    if (width <= 0 || height <= 0) return;
+    const bool changed = mState.update([&](PlayerState::Values& v) {
+        const bool news = v.width != width || v.height != height;
+        v.width = width;
+        v.height = height;
+        return news;
+    });
+    mVideo.setVideoSize(width, height);
+    if (changed) mNotifier.post(android::MEDIA_SET_VIDEO_SIZE, width, height);
+}
+
+void EventLoop::failWith(android::status_t status) {
+    const bool news = mState.update([&](PlayerState::Values& v) { return v.fail(status); });
+    if (!news) return;
+    ALOGE("playback: ended by an error (status %d)", status);
+    mNotifier.post(android::MEDIA_ERROR, android::MEDIA_ERROR_UNKNOWN, status);
+}
+
+std::shared_ptr<MediaSource> EventLoop::source() {
+    std::lock_guard<std::mutex> lock(mSourceMutex);
+    return mSource;
+}
+
+// Of media without a length mpv only tells how far they have been read.
+double EventLoop::durationOf(double byMpv) {
+    const std::shared_ptr<MediaSource> media = source();
+    const int64_t known = media != nullptr ? media->knownDuration() : 0;
+    const bool isGuess = byMpv <= 0 || mMpv.getInt("file-size").value_or(0) <= 0;
+    return isGuess && known > 0 ? static_cast<double>(known) / 1000 : byMpv;
+}
+
+bool EventLoop::sourceFailed() {
+    const std::shared_ptr<MediaSource> media = source();
+    return media != nullptr && media->readFailed();
+}
+
+// Whether the media came to an end before their bytes did, because nobody
+// gives those any more.
+bool EventLoop::brokeOff() {
+    const std::shared_ptr<MediaSource> media = source();
+    if (media == nullptr) return false;
+    if (media->isOfBytes()) return media->readFailed();
+    const int64_t position = mMpv.getInt("stream-pos").value_or(0);
+    return !media->isLocal() && position < mFileSize && !isServed(*media, position, mFileSize);
+}
+
+}  // namespace orvtarn

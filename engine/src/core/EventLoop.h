@@ -1,0 +1,90 @@
+// SPDX-License-Identifier: Apache-2.0
+#pragma once
+
+#include <mpv/client.h>
+#include <utils/Errors.h>
+
+#include <atomic>
+#include <functional>
+#include <memory>
+#include <mutex>
+#include <optional>
+#include <thread>
+
+#include "core/MpvHandle.h"
+#include "core/Notifier.h"
+#include "core/PlayerState.h"
+#include "core/VideoOutput.h"
+#include "source/MediaSource.h"
+
+namespace orvtarn {
+
+// The only thread that waits for mpv's events. Keeps the player's state
+// by them and tells the listener.
+class EventLoop {
+public:
+    EventLoop(MpvHandle& mpv, PlayerState& state, VideoOutput& video, Notifier& notifier)
+        : mMpv(mpv), mState(state), mVideo(video), mNotifier(notifier) {}
+    ~EventLoop() { stop(); }
+
+    bool start();
+    // Before mpv goes.
+    void stop();
+
+    // Whose read errors count for the media being played.
+    void setSource(std::shared_ptr<MediaSource> source);
+    // Called when mpv has come to an end, on the loop's thread; true when
+    // playback is completed by it.
+    void setEndHandler(std::function<bool()> handler) { mEndHandler = std::move(handler); }
+    // Called when media are opened and their tracks are about to be chosen, on the
+    // loop's thread; the load goes on when it returns.
+    void setOpenedHandler(std::function<void()> handler) { mOpenedHandler = std::move(handler); }
+    // A new picture was drawn, or had no surface to go to.
+    void onFrame();
+    // Brings mpv in line with the state's looping. Any thread.
+    void applyLooping();
+    // The media time of a frame that was just drawn, microseconds. While nothing
+    // plays, only mpv knows it: then it is asked on the loop's thread, and the
+    // video output told. Does not wait.
+    std::optional<int64_t> frameTime(uint64_t frame);
+    // Looks whether mpv is at an end, as an operation may find it there,
+    // or have kept it from being noticed. Any thread; does not wait.
+    void lookForEnd();
+
+private:
+    void run();
+    void handle(const mpv_event& event);
+    void onHook(const mpv_event_hook& hook);
+    void onLoaded();
+    void onEndFile(const mpv_event_end_file& end);
+    void onRestart();
+    void onProperty(const mpv_event_property& property);
+    void onTime(double seconds);
+    void onBuffering(bool buffering);
+    void onBuffered(double seconds);
+    void onEndReached();
+    void onVideoSize();
+    void becomePreparedIfReady();
+    void tellFrameTime();
+    void failWith(android::status_t status);
+    std::shared_ptr<MediaSource> source();
+    double durationOf(double byMpv);
+    bool brokeOff();
+    bool sourceFailed();
+
+    MpvHandle& mMpv;
+    PlayerState& mState;
+    VideoOutput& mVideo;
+    Notifier& mNotifier;
+    std::function<bool()> mEndHandler;
+    std::function<void()> mOpenedHandler;
+    int64_t mFileSize = 0;  // bytes, 0 when unknown
+    std::mutex mSourceMutex;
+    std::shared_ptr<MediaSource> mSource;
+    std::atomic<bool> mLooksForEnd{false};
+    std::atomic<uint64_t> mUntimedFrame{0};  // 0 for none
+    std::atomic<bool> mQuit{false};
+    std::thread mThread;
+};
+
+}  // namespace orvtarn

@@ -1,0 +1,208 @@
+// SPDX-License-Identifier: Apache-2.0
+#include "core/MpvHandle.h"
+
+#include <glob.h>
+#include <locale.h>
+#include <string.h>
+
+#include <mutex>
+
+#include "base/EngineLog.h"
+#include "base/LibraryVersions.h"
+
+namespace orvtarn {
+namespace {
+
+struct Option {
+    const char* name;
+    const char* value;
+};
+
+// Without these nothing plays, or not as the contract has it: frames come to
+// the engine, and mpv stays when a file ends.
+const Option kNeeded[] = {
+    {"vo", "libmpv"}, {"idle", "yes"},  {"keep-open", "yes"}, {"keep-open-pause", "no"},
+    {"config", "no"}, {"pause", "yes"}, {"sid", "no"},
+};
+
+// A library that was built without what these are about plays all the same.
+// Nothing comes from beside the media, nothing is drawn but video and subtitles.
+const Option kWished[] = {
+    {"audio-client-name", "orvtarn"},
+    {"terminal", "no"},
+    {"osc", "no"},
+    {"load-scripts", "no"},
+    {"load-auto-profiles", "no"},
+    {"load-console", "no"},
+    {"load-stats-overlay", "no"},
+    {"ytdl", "no"},
+    {"osd-level", "0"},
+    {"audio-display", "no"},
+    {"input-default-bindings", "no"},
+    {"sub-auto", "no"},
+    {"audio-file-auto", "no"},
+    {"cover-art-auto", "no"},
+    // Rendering waits for a frame's time; the callback comes in time already.
+    {"video-timing-offset", "0"},
+    {"sws-allow-zimg", "no"},
+    {"sws-scaler", "fast-bilinear"},
+    {"sws-fast", "yes"},
+    // Brings back the line on screen when a subtitle track is turned on.
+    {"demuxer-mkv-subtitle-preroll-secs-index", "60"},
+    {"network-timeout", "20"},
+    // A connection that broke is taken up again, four times in seven seconds.
+    {"stream-lavf-o", "reconnect=1,reconnect_delay_max=4"},
+};
+
+int setOption(mpv_handle* mpv, const char* name, const char* value) {
+    const int error = mpv_set_option_string(mpv, name, value);
+    const char* former = formerMpvName(name);
+    if (error != MPV_ERROR_OPTION_NOT_FOUND || former == nullptr) return error;
+    return mpv_set_option_string(mpv, former, value);
+}
+
+bool setNeeded(mpv_handle* mpv, const Option& option) {
+    const int error = setOption(mpv, option.name, option.value);
+    if (error == 0) return true;
+    ALOGE("create: mpv refuses %s=%s, which is needed: %s", option.name, option.value,
+          mpv_error_string(error));
+    return false;
+}
+
+void setWished(mpv_handle* mpv, const Option& option) {
+    const int error = setOption(mpv, option.name, option.value);
+    if (error == 0) return;
+    ALOGW("create: mpv refuses %s=%s: %s", option.name, option.value, mpv_error_string(error));
+}
+
+// "null" keeps time where no device is: without it, media without video fail
+// there. ALSA is only asked where it has cards; it complains at length.
+const char* audioOutputs() {
+    glob_t cards;
+    const bool hasCards = glob("/dev/snd/pcm*p", GLOB_NOSORT, nullptr, &cards) == 0;
+    globfree(&cards);
+    return hasCards ? "pulse,alsa,null" : "pulse,null";
+}
+
+// mpv refuses to start while numbers are written with a decimal comma,
+// and looks at the process's locale, not at the thread's. Anybody may have set
+// one since the last handle.
+mpv_handle* createWithPointInNumbers() {
+    static std::mutex mutex;
+    std::lock_guard<std::mutex> lock(mutex);
+    const char* numbers = setlocale(LC_NUMERIC, nullptr);
+    if (numbers == nullptr || strcmp(numbers, "C") != 0) setlocale(LC_NUMERIC, "C");
+    return mpv_create();
+}
+
+}  // namespace
+
+bool MpvHandle::create(bool hardwareDecoder) {
+    mHandle = createWithPointInNumbers();
+    if (mHandle == nullptr) return refused(__func__, "no playback core");
+    if (setOptions(hardwareDecoder) && initialize()) return true;
+    destroy();
+    return false;
+}
+
+bool MpvHandle::setOptions(bool hardwareDecoder) {
+    for (const Option& option : kNeeded) {
+        if (!setNeeded(mHandle, option)) return false;
+    }
+    for (const Option& option : kWished) setWished(mHandle, option);
+    setWished(mHandle, {"hwdec", hardwareDecoder ? "auto-copy-safe" : "no"});
+    setWished(mHandle, {"ao", audioOutputs()});
+    return true;
+}
+
+bool MpvHandle::initialize() {
+    const int error = mpv_initialize(mHandle);
+    return error == 0 || refused("create", mpv_error_string(error));
+}
+
+void MpvHandle::destroy() {
+    if (mHandle != nullptr) mpv_terminate_destroy(mHandle);
+    mHandle = nullptr;
+}
+
+int MpvHandle::set(const char* property, bool value) {
+    int flag = value;
+    return mpv_set_property(mHandle, property, MPV_FORMAT_FLAG, &flag);
+}
+
+int MpvHandle::set(const char* property, int64_t value) {
+    return mpv_set_property(mHandle, property, MPV_FORMAT_INT64, &value);
+}
+
+int MpvHandle::set(const char* property, double value) {
+    return mpv_set_property(mHandle, property, MPV_FORMAT_DOUBLE, &value);
+}
+
+int MpvHandle::set(const char* property, const char* value) {
+    return mpv_set_property_string(mHandle, property, value);
+}
+
+int MpvHandle::set(const char* property, const std::vector<std::string>& values) {
+    std::vector<mpv_node> nodes(values.size());
+    for (size_t i = 0; i < values.size(); i++) {
+        nodes[i].format = MPV_FORMAT_STRING;
+        nodes[i].u.string = const_cast<char*>(values[i].c_str());
+    }
+    mpv_node_list list = {static_cast<int>(nodes.size()), nodes.data(), nullptr};
+    mpv_node node;
+    node.format = MPV_FORMAT_NODE_ARRAY;
+    node.u.list = &list;
+    return mpv_set_property(mHandle, property, MPV_FORMAT_NODE, &node);
+}
+
+std::optional<bool> MpvHandle::getFlag(const char* property) const {
+    int flag = 0;
+    if (mpv_get_property(mHandle, property, MPV_FORMAT_FLAG, &flag) < 0) return {};
+    return flag != 0;
+}
+
+std::optional<int64_t> MpvHandle::getInt(const char* property) const {
+    int64_t value = 0;
+    if (mpv_get_property(mHandle, property, MPV_FORMAT_INT64, &value) < 0) return {};
+    return value;
+}
+
+std::optional<double> MpvHandle::getDouble(const char* property) const {
+    double value = 0;
+    if (mpv_get_property(mHandle, property, MPV_FORMAT_DOUBLE, &value) < 0) return {};
+    return value;
+}
+
+std::optional<std::string> MpvHandle::getString(const char* property) const {
+    char* value = mpv_get_property_string(mHandle, property);
+    if (value == nullptr) return {};
+    std::string copy(value);
+    mpv_free(value);
+    return copy;
+}
+
+bool MpvHandle::getNode(const char* property, MpvNode& node) const {
+    return mpv_get_property(mHandle, property, MPV_FORMAT_NODE, node.get()) >= 0;
+}
+
+int MpvHandle::command(std::initializer_list<const char*> arguments) {
+    std::vector<const char*> list(arguments);
+    list.push_back(nullptr);
+    return mpv_command(mHandle, list.data());
+}
+
+int MpvHandle::seek(double seconds, const char* flags) {
+    mpv_node arguments[3];
+    arguments[0].format = arguments[2].format = MPV_FORMAT_STRING;
+    arguments[0].u.string = const_cast<char*>("seek");
+    arguments[1].format = MPV_FORMAT_DOUBLE;
+    arguments[1].u.double_ = seconds;
+    arguments[2].u.string = const_cast<char*>(flags);
+    mpv_node_list list = {3, arguments, nullptr};
+    mpv_node command;
+    command.format = MPV_FORMAT_NODE_ARRAY;
+    command.u.list = &list;
+    return mpv_command_node(mHandle, &command, nullptr);
+}
+
+}  // namespace orvtarn

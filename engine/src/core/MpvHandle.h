@@ -1,0 +1,66 @@
+// SPDX-License-Identifier: Apache-2.0
+#pragma once
+
+#include <mpv/client.h>
+#include <stdint.h>
+
+#include <initializer_list>
+#include <optional>
+#include <string>
+#include <vector>
+
+namespace orvtarn {
+
+// A property of mpv as a tree of values.
+class MpvNode {
+public:
+    MpvNode() { mNode.format = MPV_FORMAT_NONE; }
+    ~MpvNode() { mpv_free_node_contents(&mNode); }
+    MpvNode(const MpvNode&) = delete;
+    MpvNode& operator=(const MpvNode&) = delete;
+
+    mpv_node* get() { return &mNode; }
+    const mpv_node& operator*() const { return mNode; }
+
+private:
+    mpv_node mNode;
+};
+
+// One mpv handle, a core of its own. Any thread may use properties and commands at any time; only
+// the event loop waits for events. Results are 0 or an mpv_error.
+class MpvHandle {
+public:
+    // Creates and initialises mpv with the options every player has.
+    // False without memory or with a library that refuses a needed one.
+    bool create(bool hardwareDecoder);
+    // Ends mpv; its streams are closed and its threads gone afterwards.
+    void destroy();
+    mpv_handle* get() const { return mHandle; }
+
+    int set(const char* property, bool value);
+    int set(const char* property, int64_t value);
+    int set(const char* property, double value);
+    int set(const char* property, const char* value);
+    int set(const char* property, const std::string& value) { return set(property, value.c_str()); }
+    // A list of texts, which may contain any character.
+    int set(const char* property, const std::vector<std::string>& values);
+
+    // Nothing when the property is not available now.
+    std::optional<bool> getFlag(const char* property) const;
+    std::optional<int64_t> getInt(const char* property) const;
+    std::optional<double> getDouble(const char* property) const;
+    std::optional<std::string> getString(const char* property) const;
+    bool getNode(const char* property, MpvNode& node) const;
+
+    int command(std::initializer_list<const char*> arguments);
+    // A seek to or by a time; flags as mpv writes them, "absolute+exact".
+    int seek(double seconds, const char* flags);
+
+private:
+    bool setOptions(bool hardwareDecoder);
+    bool initialize();
+
+    mpv_handle* mHandle = nullptr;
+};
+
+}  // namespace orvtarn

@@ -1,0 +1,109 @@
+// SPDX-License-Identifier: Apache-2.0
+#pragma once
+
+#include <stdint.h>
+#include <utils/Errors.h>
+
+#include <chrono>
+#include <condition_variable>
+#include <initializer_list>
+#include <mutex>
+
+namespace orvtarn {
+
+enum class Phase {
+    Idle,
+    Initialized,
+    Preparing,
+    Prepared,
+    Started,
+    Paused,
+    Stopped,
+    Completed,
+    Error,
+    Released,
+};
+
+const char* phaseName(Phase phase);
+
+// What the player knows of itself. Written by the operations and by the event
+// loop, read and waited for by anybody.
+class PlayerState {
+public:
+    struct Values {
+        Phase phase = Phase::Idle;
+        android::status_t error = android::NO_ERROR;  // in the error phase
+        // Counts prepare, stop, reset and release: a wait that sees another
+        // number than its own has been overtaken.
+        uint64_t session = 0;
+
+        // Of the media that is open; see forgetMedia.
+        bool fileOpen = false;     // from the load to mpv's word that it ended
+        bool fileStarted = false;  // mpv has taken the load up
+        bool restarted = false;    // playback is ready to go on from the first position
+        bool framed = false;       // its first frame was handed out
+        bool hasVideo = false;
+        bool seekable = false;
+        bool buffering = false;
+        bool seeking = false;   // one seek at a time
+        uint64_t seeks = 0;     // begun by mpv
+        uint64_t restarts = 0;  // playback gone on after a seek or the load
+        double position = 0;    // seconds
+        double duration = 0;    // seconds, 0 when unknown
+        int width = 0;          // of the picture as it is meant to be seen, pixels
+        int height = 0;
+        int bufferPercent = 0;
+
+        bool looping = false;  // outlasts the media
+
+        bool isOneOf(std::initializer_list<Phase> phases) const;
+        // Prepared and not stopped: there is media to operate on.
+        bool isOpen() const;
+        void forgetMedia();
+        // Goes to the error phase unless the media is given up anyway.
+        bool fail(android::status_t status);
+    };
+
+    template <class Reader>
+    auto read(Reader reader) const {
+        std::lock_guard<std::mutex> lock(mMutex);
+        return reader(mValues);
+    }
+
+    // Changes the values and wakes all waits; returns what the writer does.
+    template <class Writer>
+    auto update(Writer writer) {
+        std::lock_guard<std::mutex> lock(mMutex);
+        mChanged.notify_all();
+        return writer(mValues);
+    }
+
+    // Blocks until the condition holds. False when the time was over first.
+    template <class Condition>
+    bool wait(std::chrono::milliseconds limit, Condition condition) {
+        return waitUntil(std::chrono::steady_clock::now() + limit, condition);
+    }
+
+    template <class Condition>
+    bool waitUntil(std::chrono::steady_clock::time_point deadline, Condition condition) {
+        std::unique_lock<std::mutex> lock(mMutex);
+        return mChanged.wait_until(lock, deadline, [&] { return condition(mValues); });
+    }
+
+    Phase phase() const {
+        return read([](const Values& v) { return v.phase; });
+    }
+
+    // 0 when the media is prepared and not stopped; otherwise one log line and
+    // INVALID_OPERATION.
+    android::status_t requireOpen(const char* operation) const;
+    // The log line and status of an operation that the phase does not allow.
+    static android::status_t wrongPhase(const char* operation, Phase phase);
+
+private:
+    mutable std::mutex mMutex;
+    std::condition_variable mChanged;
+    Values mValues;
+};
+
+}  // namespace orvtarn

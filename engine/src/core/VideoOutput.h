@@ -1,0 +1,104 @@
+// SPDX-License-Identifier: Apache-2.0
+#pragma once
+
+#include <gui/IGraphicBufferProducer.h>
+#include <mpv/render.h>
+#include <stdint.h>
+#include <utils/StrongPointer.h>
+
+#include <atomic>
+#include <condition_variable>
+#include <functional>
+#include <mutex>
+#include <optional>
+#include <thread>
+
+namespace orvtarn {
+
+// Draws mpv's video frames into the surface's buffers, on a thread of its
+// own, the only one that renders. Never holds up playback: a surface without a
+// free buffer misses a frame, and gets the newest one when it has.
+class VideoOutput {
+public:
+    struct Counters {
+        uint64_t delivered;  // frames handed to the surface
+        uint64_t missed;     // frames that found no free buffer
+    };
+
+    // onFrame: after each picture that was drawn or had no surface to go to.
+    // frameTime: the media time of the frame of that number, which was just drawn,
+    // microseconds. Nothing when setFrameTime will tell; the frame is held until
+    // then. Both are called on the rendering thread, which must not ask mpv.
+    using FrameTime = std::function<std::optional<int64_t>(uint64_t frame)>;
+    VideoOutput(std::function<void()> onFrame, FrameTime frameTime)
+        : mOnFrame(std::move(onFrame)), mFrameTime(std::move(frameTime)) {}
+    ~VideoOutput() { destroy(); }
+
+    bool create(mpv_handle* mpv);
+    // Before mpv goes, and quicker when no media is open.
+    void destroy();
+
+    // Null for none. No frame goes to an earlier surface afterwards; the new
+    // one gets the picture at once, paused or not.
+    void setProducer(const android::sp<android::IGraphicBufferProducer>& producer);
+    // Any thread.
+    void setFrameTime(uint64_t frame, int64_t microseconds);
+    // Whether frames go to the surface at all.
+    void setVisible(bool visible);
+    void setVideoSize(int width, int height) { mVideoSize = {width, height}; }
+    // The media is closed: nothing is drawn again before the next frame.
+    void forgetPicture() { mHasPicture = false; }
+
+    Counters counters() const { return {mDelivered, mMissed}; }
+
+private:
+    struct Size {
+        int width = 0;
+        int height = 0;
+        bool operator==(Size other) const { return width == other.width && height == other.height; }
+    };
+
+    static void onUpdate(void* self);
+    void wake(bool redraw);
+    void run();
+    bool takeFrame();
+    bool render(bool newFrame);
+    Size wantedSize() const;
+    bool sizeChanged();
+    android::status_t draw();
+    android::status_t drawInto(const android::IGraphicBufferProducer::PixelBuffer& buffer);
+    void skip();
+    android::status_t queue(int slot);
+    void deliverHeld(uint64_t frame, int64_t microseconds);
+    void dropHeld();
+
+    const std::function<void()> mOnFrame;
+    const FrameTime mFrameTime;
+    mpv_render_context* mContext = nullptr;
+    std::thread mThread;
+
+    std::mutex mWakeMutex;
+    std::condition_variable mWakeUp;
+    bool mWoken = false;
+    bool mRedraw = false;
+    bool mQuit = false;
+    uint64_t mToldFrame = 0;
+    int64_t mToldTimeUs = 0;
+
+    // Held while a frame is drawn.
+    std::mutex mSurfaceMutex;
+    android::sp<android::IGraphicBufferProducer> mProducer;
+    bool mVisible = true;
+    Size mDrawnSize;
+    bool mTimeIsDue = false;  // mpv's frame has no time yet
+    int64_t mTimeUs = 0;
+    uint64_t mFrame = 0;       // whose time was asked for last
+    std::optional<int> mHeld;  // the slot of a drawn frame without a time
+
+    std::atomic<Size> mVideoSize{Size()};
+    std::atomic<bool> mHasPicture{false};
+    std::atomic<uint64_t> mDelivered{0};
+    std::atomic<uint64_t> mMissed{0};
+};
+
+}  // namespace orvtarn

@@ -1,0 +1,59 @@
+// SPDX-License-Identifier: Apache-2.0
+#pragma once
+
+#include <stdint.h>
+#include <utils/Errors.h>
+
+#include "inspect/MediaFile.h"
+
+extern "C" {
+#include <libavcodec/avcodec.h>
+}
+
+namespace orvtarn {
+
+// Seeks and decodes one video stream of a file. One thread at a time.
+class FrameFinder {
+public:
+    // The file is borrowed.
+    explicit FrameFinder(MediaFile& file);
+    ~FrameFinder();
+    FrameFinder(const FrameFinder&) = delete;
+    FrameFinder& operator=(const FrameFinder&) = delete;
+
+    // Once, before the rest. -1 takes the best video stream, embedded pictures
+    // only without another. 0 or ORV_ERROR_UNSUPPORTED.
+    android::status_t open(int streamIndex);
+
+    // The frame at a time from the media's start: the first one that starts at
+    // the time or up to 100 ms after it; where frames are further apart than that,
+    // the one on screen at the time. A frame that starts less than 1 ms before
+    // counts as at the time, since times are whole milliseconds. The nearest one
+    // where the media cannot be sought; null when nothing can be decoded. It
+    // belongs to the finder and stays as it is until the next call.
+    const AVFrame* find(int64_t positionMs);
+
+    // Degrees to turn frames clockwise for upright pictures: 0, 90, 180, 270.
+    int rotation() const;
+
+private:
+    bool chooseStream(int streamIndex);
+    bool openDecoder();
+    void search(int64_t positionUs);
+    void seek(int64_t positionUs);
+    bool decodeUpTo(int64_t positionUs, bool takeLater);
+    bool decodePicture();
+    bool readFrame();
+    bool sendPacket();
+    int64_t startTimeUs() const;
+    int64_t frameTimeUs(const AVFrame& frame) const;
+
+    MediaFile& mFile;
+    AVStream* mStream = nullptr;
+    AVCodecContext* mCodec = nullptr;
+    AVPacket* mPacket;
+    AVFrame* mRead;   // the one just decoded
+    AVFrame* mFound;  // the one to show
+};
+
+}  // namespace orvtarn

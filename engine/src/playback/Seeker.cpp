@@ -1,0 +1,164 @@
+// SPDX-License-Identifier: Apache-2.0
+#include "playback/Seeker.h"
+
+#include <media/MediaPlayerInterface.h>
+#include <media/MediaTrack.h>
+
+#include <algorithm>
+#include <chrono>
+
+#include "base/EngineLog.h"
+
+namespace orvtarn {
+namespace {
+
+using SeekMode = android::MediaTrack::ReadOptions::SeekMode;
+using android::status_t;
+using std::chrono::seconds;
+
+constexpr seconds kSeekLimit{10};
+// Positions closer than this are the same frame's.
+constexpr double kSameFrame = 0.001;
+// An exact seek ends at the next frame at the latest, usually.
+constexpr double kLate = 0.1;
+
+constexpr char kExact[] = "absolute+exact";
+constexpr char kKeyFrame[] = "absolute+keyframes";
+constexpr char kForward[] = "relative+keyframes";
+
+bool isSeekMode(int mode) {
+    return mode >= SeekMode::SEEK_PREVIOUS_SYNC && mode <= SeekMode::SEEK_CLOSEST;
+}
+
+}  // namespace
+
+status_t Seeker::seekTo(int msec, int mode) {
+    if (!isSeekMode(mode)) return failed(android::BAD_VALUE, "seekTo", "no such seek mode");
+    const double duration = mState.read([](const PlayerState::Values& v) { return v.duration; });
+    double target = std::max(msec, 0) / 1000.0;
+    if (duration > 0) target = std::min(target, duration);
+    return told(inTurn("seekTo", [&](const Turn& turn) { return seekAs(mode, target, turn); }));
+}
+
+status_t Seeker::seekToTime(const char* operation, double target) {
+    return told(inTurn(operation, [&](const Turn& turn) { return moveTo(target, kExact, turn); }));
+}
+
+status_t Seeker::refresh() {
+    const bool wanted = mState.read(
+        [](const PlayerState::Values& v) { return v.seekable && v.phase != Phase::Completed; });
+    if (!wanted) return android::NO_ERROR;
+    return inTurn("refresh", [this](const Turn& turn) { return moveTo(position(), kExact, turn); });
+}
+
+status_t Seeker::runAndAwait(const char* operation, const std::function<int()>& command) {
+    return inTurn(operation, [&](const Turn& turn) { return await(operation, turn, command); });
+}
+
+status_t Seeker::told(status_t status) {
+    if (status == android::NO_ERROR) mNotifier.post(android::MEDIA_SEEK_COMPLETE);
+    return status;
+}
+
+status_t Seeker::inTurn(const char* operation, const Task& task) {
+    const status_t open = mState.requireOpen(operation);
+    if (open != android::NO_ERROR) return open;
+    const Turn turn = {mState.read([](const PlayerState::Values& v) { return v.session; }),
+                       std::chrono::steady_clock::now() + kSeekLimit};
+    status_t status = begin(operation, turn);
+    if (status != android::NO_ERROR) return status;
+    status = task(turn);
+    mState.update([](PlayerState::Values& v) { v.seeking = false; });
+    mEvents.lookForEnd();
+    return status;
+}
+
+// Waits for its turn. NO_ERROR makes the caller the one that seeks.
+status_t Seeker::begin(const char* operation, const Turn& turn) {
+    bool seekable = true;
+    bool begun = false;
+    // The turn is taken inside the wait: of two that wake up, one waits on.
+    const bool inTime = mState.waitUntil(turn.deadline, [&](PlayerState::Values& v) {
+        if (v.session != turn.session || !v.isOpen()) return true;
+        seekable = v.seekable;
+        if (!seekable) return true;
+        begun = !v.seeking;
+        v.seeking = true;
+        // What is sought from the end is no longer complete.
+        if (begun && v.phase == Phase::Completed) v.phase = Phase::Paused;
+        return begun;
+    });
+    if (begun) return android::NO_ERROR;
+    if (!inTime) return failed(android::TIMED_OUT, operation, "another seek does not end");
+    if (!seekable) mNotifier.post(android::MEDIA_INFO, android::MEDIA_INFO_NOT_SEEKABLE);
+    return failed(android::INVALID_OPERATION, operation,
+                  seekable ? "ended by another operation" : "the media cannot seek");
+}
+
+status_t Seeker::seekAs(int mode, double target, const Turn& turn) {
+    switch (mode) {
+        case SeekMode::SEEK_NEXT_SYNC:
+            return seekToNextSync(target, turn);
+        case SeekMode::SEEK_CLOSEST_SYNC:
+            return seekToClosestSync(target, turn);
+        case SeekMode::SEEK_CLOSEST:
+            return moveTo(target, kExact, turn);
+        default:
+            return moveTo(target, kKeyFrame, turn);
+    }
+}
+
+// mpv has a seek to the key frame before a time, and one to the key frame
+// after a distance from here.
+status_t Seeker::seekToNextSync(double target, const Turn& turn) {
+    const status_t status = moveTo(target, kKeyFrame, turn);
+    const double distance = target - position();
+    if (status != android::NO_ERROR || distance < kSameFrame) return status;
+    return moveTo(distance, kForward, turn);
+}
+
+status_t Seeker::seekToClosestSync(double target, const Turn& turn) {
+    status_t status = moveTo(target, kKeyFrame, turn);
+    const double previous = position();
+    if (status != android::NO_ERROR || target - previous < kSameFrame) return status;
+    status = moveTo(target - previous, kForward, turn);
+    const double next = position();
+    if (status != android::NO_ERROR || next - target <= target - previous) return status;
+    return moveTo(previous, kKeyFrame, turn);
+}
+
+// A seek that comes right behind one of mpv's own, as when a track was
+// chosen, may lose its key frame and arrive at the next one: it is repeated.
+status_t Seeker::moveTo(double target, const char* flags, const Turn& turn) {
+    const auto seek = [&] { return mMpv.seek(target, flags); };
+    const status_t status = await("seekTo", turn, seek);
+    const bool late = flags != kForward && position() > target + kLate;
+    return status == android::NO_ERROR && late ? await("seekTo", turn, seek) : status;
+}
+
+status_t Seeker::await(const char* operation, const Turn& turn,
+                       const std::function<int()>& command) {
+    const auto before = mState.read([](const PlayerState::Values& v) { return v; });
+    const int error = command();
+    if (error < 0) return failed(android::INVALID_OPERATION, operation, mpv_error_string(error));
+    const auto overtaken = [&turn](const PlayerState::Values& v) {
+        return v.session != turn.session || !v.isOpen();
+    };
+    const bool inTime = mState.waitUntil(turn.deadline, [&](const PlayerState::Values& v) {
+        return overtaken(v) || (v.seeks > before.seeks && v.restarts > before.restarts);
+    });
+    if (!inTime) return failed(android::TIMED_OUT, operation, "the position is not reached");
+    if (mState.read(overtaken)) {
+        return failed(android::INVALID_OPERATION, operation, "ended by another operation");
+    }
+    const double now = position();
+    mState.update([now](PlayerState::Values& v) { v.position = now; });
+    return android::NO_ERROR;
+}
+
+double Seeker::position() const {
+    const double last = mState.read([](const PlayerState::Values& v) { return v.position; });
+    return std::max(mMpv.getDouble("time-pos").value_or(last), 0.0);
+}
+
+}  // namespace orvtarn

@@ -1,0 +1,137 @@
+// SPDX-License-Identifier: Apache-2.0
+#include "playback/Speed.h"
+
+#include <orvtarn/PlayerTypes.h>
+#include <stdlib.h>
+
+#include <chrono>
+
+#include "base/EngineLog.h"
+#include "base/ThreadName.h"
+
+namespace orvtarn {
+namespace {
+
+using android::status_t;
+
+constexpr int kSlowest = 250;
+constexpr int kFastestBackwardPlay = 8000;
+// Above this the decoder cannot follow without leaving frames out.
+constexpr int kFastestFullDecoding = 16000;
+constexpr std::chrono::milliseconds kJumpInterval{100};
+
+bool isSpeed(int speed) {
+    return speed >= ORV_SPEED_MIN && speed <= ORV_SPEED_MAX && abs(speed) >= kSlowest;
+}
+
+}  // namespace
+
+status_t Speed::set(int speed) {
+    if (!isSpeed(speed)) return failed(android::BAD_VALUE, "setSpeed", "no such speed");
+    std::lock_guard<std::mutex> lock(mSetMutex);
+    const status_t open = mState.requireOpen("setSpeed");
+    if (open != android::NO_ERROR) return open;
+    if (!canPlay(speed)) {
+        return failed(android::INVALID_OPERATION, "setSpeed", "the media cannot seek");
+    }
+    stopJumping();
+    return apply(speed);
+}
+
+status_t Speed::apply(int speed) {
+    const bool jumps = speed < -kFastestBackwardPlay;
+    const bool plays = speed < 0 && !jumps;
+    int error = mMpv.set("framedrop", speed > kFastestFullDecoding ? "decoder+vo" : "vo");
+    if (error >= 0) error = mMpv.set("play-dir", plays ? "backward" : "forward");
+    if (error >= 0) error = mMpv.set("speed", jumps ? 1.0 : abs(speed) / 1000.0);
+    if (error < 0) return failed(android::UNKNOWN_ERROR, "setSpeed", mpv_error_string(error));
+    mSpeed = speed;
+    mTransport.setTrick(jumps, speed < 0);
+    if (jumps) startJumping(speed);
+    return android::NO_ERROR;
+}
+
+bool Speed::canSeek(int speed) const {
+    if (speed != 0 && !isSpeed(speed)) return false;
+    return mState.read([](const PlayerState::Values& v) { return v.isOpen() && v.seekable; });
+}
+
+bool Speed::canPlay(int speed) const {
+    if (!isSpeed(speed)) return false;
+    return mState.read(
+        [speed](const PlayerState::Values& v) { return v.isOpen() && (speed > 0 || v.seekable); });
+}
+
+bool Speed::onEndReached() {
+    if (mSpeed >= 0) return false;
+    becomeNormal();
+    mMpv.seek(0, "absolute");
+    return true;
+}
+
+void Speed::becomeNormal() {
+    mSpeed = ORV_SPEED_NORMAL;
+    mMpv.set("framedrop", "vo");
+    mMpv.set("play-dir", "forward");
+    mMpv.set("speed", 1.0);
+    mTransport.setTrick(false, false);
+}
+
+void Speed::reset() {
+    std::lock_guard<std::mutex> lock(mSetMutex);
+    stopJumping();
+    becomeNormal();
+}
+
+void Speed::startJumping(int speed) {
+    std::lock_guard<std::mutex> lock(mJumpMutex);
+    mJumping = true;
+    mJumper = std::thread([this, speed] { jump(speed); });
+}
+
+void Speed::stopJumping() {
+    {
+        std::lock_guard<std::mutex> lock(mJumpMutex);
+        mJumping = false;
+        mJumpChanged.notify_all();
+    }
+    if (mJumper.joinable()) mJumper.join();
+}
+
+void Speed::jump(int speed) {
+    nameThisThread("orv-rewind");
+    auto last = std::chrono::steady_clock::now();
+    double reached = -1;  // by the latest jump
+    double target = 0;    // where the clock says playback is, between key frames
+    std::unique_lock<std::mutex> lock(mJumpMutex);
+    while (!mJumpChanged.wait_for(lock, kJumpInterval, [this] { return !mJumping; })) {
+        const auto now = std::chrono::steady_clock::now();
+        const std::chrono::duration<double> passed = now - last;
+        last = now;
+        const auto state = mState.read([](const PlayerState::Values& v) { return v; });
+        if (state.phase != Phase::Started) continue;
+        lock.unlock();
+        if (state.position != reached) target = state.position;
+        target += passed.count() * speed / 1000;
+        const bool goesOn = jumpTo(target);
+        reached = mState.read([](const PlayerState::Values& v) { return v.position; });
+        lock.lock();
+        if (!goesOn) return;
+    }
+}
+
+// False when it is over: at the start of the media, and when a jump fails, as
+// when the media are closed or give no data.
+bool Speed::jumpTo(double seconds) {
+    if (seconds > 0) {
+        const auto jump = [&] { return mMpv.seek(seconds, "absolute+keyframes"); };
+        if (mSeeker.runAndAwait("setSpeed", jump) == android::NO_ERROR) return true;
+    }
+    becomeNormal();
+    if (seconds <= 0) {
+        mSeeker.runAndAwait("setSpeed", [this] { return mMpv.seek(0, "absolute"); });
+    }
+    return false;
+}
+
+}  // namespace orvtarn

@@ -1,0 +1,106 @@
+// SPDX-License-Identifier: Apache-2.0
+#include "source/MediaSource.h"
+
+#include <errno.h>
+#include <limits.h>
+#include <stdlib.h>
+#include <sys/stat.h>
+#include <unistd.h>
+#include <utils/Errors.h>
+
+#include "source/FileName.h"
+
+namespace orvtarn {
+namespace {
+
+// A reader that its source counts.
+class CountedFdSource : public FdByteSource {
+public:
+    CountedFdSource(int fd, int64_t offset, int64_t length, ReaderCount& readers)
+        : FdByteSource(fd, offset, length), mReaders(readers) {}
+    ~CountedFdSource() override { mReaders.leave(); }
+
+private:
+    ReaderCount& mReaders;
+};
+
+int statusOfErrno(int error) {
+    if (error == EACCES) return android::PERMISSION_DENIED;
+    if (error == ENOENT || error == ENOTDIR || error == ENAMETOOLONG || error == ELOOP) {
+        return android::NAME_NOT_FOUND;
+    }
+    return -error;
+}
+
+}  // namespace
+
+int64_t MediaSource::knownDuration() {
+    const int64_t own = ownDuration();
+    return own > 0 ? own : mToldDuration.load();
+}
+
+bool ReaderCount::enter() {
+    std::lock_guard<std::mutex> lock(mMutex);
+    if (mClosed) return false;
+    mCount++;
+    return true;
+}
+
+void ReaderCount::leave() {
+    std::lock_guard<std::mutex> lock(mMutex);
+    if (--mCount == 0) mLeft.notify_all();
+}
+
+void ReaderCount::close() {
+    std::lock_guard<std::mutex> lock(mMutex);
+    mClosed = true;
+}
+
+void ReaderCount::awaitNone() {
+    std::unique_lock<std::mutex> lock(mMutex);
+    mLeft.wait(lock, [this] { return mCount == 0; });
+}
+
+int ReaderCount::count() const {
+    std::lock_guard<std::mutex> lock(mMutex);
+    return mCount;
+}
+
+FdMediaSource::~FdMediaSource() { ::close(mFd); }
+
+std::unique_ptr<ByteSource> FdMediaSource::openReader() {
+    if (!mReaders.enter()) return nullptr;
+    return std::make_unique<CountedFdSource>(mFd, mOffset, mLength, mReaders);
+}
+
+void FdMediaSource::close() {
+    mReaders.close();
+    mReaders.awaitNone();
+}
+
+bool UrlMediaSource::canOpenTwice() const {
+    struct stat status;
+    if (!isLocal()) return true;
+    return stat(mName.c_str(), &status) == 0 &&
+           (S_ISREG(status.st_mode) || S_ISBLK(status.st_mode));
+}
+
+int resolveName(const char* url, std::string& name) {
+    if (url == nullptr || *url == '\0') return android::BAD_VALUE;
+    std::string path;
+    if (!filePath(url, path)) {
+        name = url;
+        return android::NO_ERROR;
+    }
+    char resolved[PATH_MAX];
+    struct stat status;
+    if (realpath(path.c_str(), resolved) == nullptr || stat(resolved, &status) != 0) {
+        return statusOfErrno(errno);
+    }
+    if (S_ISDIR(status.st_mode)) return android::BAD_VALUE;
+    if (access(resolved, R_OK) != 0) return statusOfErrno(errno);
+    name = resolved;
+    return android::NO_ERROR;
+}
+
+}  // namespace orvtarn
