@@ -27,7 +27,8 @@ foreach(directory ${orv_library_dir} ${orv_runtime_dirs})
 endforeach()
 
 # The compiler would note at every vector that its calls changed in version 7.
-set(CMAKE_CXX_FLAGS_INIT -Wno-psabi)
+# Times are 32 bits wide on the target; Debian's own have 64 from release 13 on.
+set(CMAKE_CXX_FLAGS_INIT "-Wno-psabi -U_TIME_BITS")
 
 # Programs are the host's, everything else is the sysroot's.
 set(CMAKE_FIND_ROOT_PATH_MODE_PROGRAM NEVER)
