@@ -16,9 +16,10 @@ struct Renamed {
     const char* formerName;
 };
 
+// mpv 0.40 has the first name, 0.35 the second.
 const Renamed kRenamed[] = {
-    {"load-console", "load-osd-console"},       // mpv 0.40
-    {"sub-outline-color", "sub-border-color"},  // mpv 0.39
+    {"load-console", "load-osd-console"},
+    {"sub-outline-color", "sub-border-color"},
 };
 
 }  // namespace

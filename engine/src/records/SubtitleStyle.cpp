@@ -23,7 +23,7 @@ const int64_t kMaxMargin = 300;
 const int64_t kUsualPosition = 100;  // percent of the picture's height
 const int64_t kMaxPosition = 150;
 
-// All that an attribute may change. Releases before 0.38 have no border style.
+// All that an attribute may change. mpv 0.35 has no border style.
 const char kBorderStyle[] = "sub-border-style";
 const char* const kLook[] = {
     "sub-delay",         "sub-ass-override", "sub-font-size", "sub-back-color", "sub-color",

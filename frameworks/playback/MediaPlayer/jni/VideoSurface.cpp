@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: Apache-2.0
 #include "jni/VideoSurface.h"
 
-// The next one speaks of sp and leaves it to its readers to know it.
+// android_view_Surface.h uses sp without including its header.
 #include <android_runtime/android_view_Surface.h>
 #include <gui/Surface.h>
 #include <nativehelper/JNIHelp.h>

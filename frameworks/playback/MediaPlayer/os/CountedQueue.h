@@ -9,13 +9,13 @@
 
 namespace os {
 
-// A FIFO that tells without a lock whether it is empty; all else needs the
-// lock of its owner. It takes the place of the std::queue<T> that it keeps, so
-// that the fields after it stand where they stand after a plain one.
+// A FIFO whose emptiness can be tested without a lock; push and pop need the
+// owner's. It is as large as the std::queue<T> that it holds, so that the fields
+// after it keep the offsets that they have after a plain one.
 template <typename T>
 class CountedQueue {
 public:
-    // Any thread. What was pushed before is seen by who sees that it is there.
+    // Any thread. False also makes what the sender wrote before its push visible.
     bool empty() const { return mSize.load(std::memory_order_acquire) == 0; }
 
     void push(const T& item) {
