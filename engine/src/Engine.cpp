@@ -20,13 +20,18 @@ TarnPlayer::Engine::Engine(int decoder, orvtarn::Notifier::Deliver deliver)
       stepper(mpv, state, seeker, transport, events),
       abRepeat(mpv, state),
       audio(mpv, video),
-      tracks(mpv, state, loader, seeker),
+      videoFilters(mpv),
+      tracks(mpv, state, loader, seeker, videoFilters),
       subtitles(mpv, state, tracks),
       bytes(mpv, state, loader, seeker),
       metaData(mpv, state, loader),
       parameters(mpv, state, video, tracks, subtitles) {
     events.setEndHandler([this] { return !speed.onEndReached() && transport.complete(); });
-    events.setOpenedHandler([this] { subtitles.addToMedia(); });
+    events.setPictureHandler([this] { return videoFilters.adapt(); });
+    events.setOpenedHandler([this] {
+        videoFilters.onOpened();
+        subtitles.addToMedia();
+    });
     if (!create(decoder >= 0)) {
         release();
         return;

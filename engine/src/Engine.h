@@ -22,6 +22,7 @@
 #include "playback/Subtitles.h"
 #include "playback/Tracks.h"
 #include "playback/Transport.h"
+#include "playback/VideoFilters.h"
 #include "source/StreamProtocol.h"
 
 namespace android {
@@ -80,6 +81,7 @@ public:
     orvtarn::Stepper stepper;
     orvtarn::AbRepeat abRepeat;
     orvtarn::Audio audio;
+    orvtarn::VideoFilters videoFilters;
     orvtarn::Tracks tracks;
     orvtarn::Subtitles subtitles;
     orvtarn::BytePosition bytes;

@@ -15,7 +15,11 @@ FILES="video.mp4 video.mkv video.ts video.avi slides.mkv rotated.mp4 hd.mp4 hd70
        feature.mkv short.mp4 short.ts long.mkv light.mkv sparse.mkv distant.mkv silent.mp4 plain.mkv plain.mp4 pictures.mkv
        lines.srt latin1.srt lines.ass words.idx words.sub languages.idx languages.sub tone.mp3
        tone.flac tone-s16le.pcm tone-s16be.pcm subtitles-only.mkv garbage.bin empty.bin unseen.mkv dead.mkv first-of-two.m3u
-       first-missing.m3u nothing.m3u locale"
+       first-missing.m3u nothing.m3u locale
+       soft.mp4 turned-90.mp4 turned-180.mp4 turned-270.mp4 turned-and-not.mp4 anamorphic.mkv
+       yuv420p10.mkv yuv422p.mkv yuv422p10.mkv yuv444p.mkv yuv444p12.mkv
+       bt601.mkv bt601-full.mkv bt709.mkv bt709-full.mkv bt2020.mkv pq.mkv hlg.mkv
+       top-first.ts bottom-first.ts one-frame.mkv"
 
 quiet_ffmpeg() { ffmpeg -nostdin -v error -y "$@"; }
 
@@ -64,7 +68,7 @@ make_hd709_mp4() {
 }
 
 make_odd_mkv() {
-    quiet_ffmpeg -f lavfi -i "$(moving 161x91 1)" -c:v ffv1 -pix_fmt yuv444p "$1"
+    quiet_ffmpeg -f lavfi -i "$(moving 162x92 1),format=yuv444p,crop=161:91" -c:v ffv1 "$1"
 }
 
 # Left half transparent, right half opaque.
@@ -315,6 +319,82 @@ make_nothing_m3u() { printf '#EXTM3U\n' >"$1"; }
 make_locale() {
     mkdir "$1"
     localedef --no-archive -i de_DE -f UTF-8 "$1/de_DE.UTF-8"
+}
+
+# What follows is for the look of pictures: soft edges, as half of the colours is
+# left out in most formats and programs fill them in differently.
+soft() { echo "testsrc2=size=${1:-192x108}:rate=25:duration=2,gblur=2"; }
+
+# The argument after the file: by how much it is to be turned to be seen.
+turned() {
+    need soft.mp4
+    quiet_ffmpeg -i "$folder/soft.mp4" -c copy -metadata:s:v:0 rotate="$2" "$1"
+}
+
+make_soft_mp4() {
+    # shellcheck disable=SC2046
+    quiet_ffmpeg -f lavfi -i "$(soft)" $(h264) -crf 8 "$1"
+}
+make_turned_90_mp4() { turned "$1" 90; }
+make_turned_180_mp4() { turned "$1" 180; }
+make_turned_270_mp4() { turned "$1" 270; }
+
+# Two pictures of which the second, the usual one, is stored lying.
+make_turned_and_not_mp4() {
+    need soft.mp4 turned-90.mp4
+    quiet_ffmpeg -i "$folder/soft.mp4" -i "$folder/turned-90.mp4" -map 0 -map 1 -c copy \
+        -disposition:v:0 0 -disposition:v:1 default "$1"
+}
+
+# Pixels that are not square.
+make_anamorphic_mkv() {
+    # shellcheck disable=SC2046
+    quiet_ffmpeg -f lavfi -i "$(soft 144x108),setsar=4/3" $(h264) -crf 8 "$1"
+}
+
+# Without loss, in one format of pixels: file, format, further options.
+in_format() {
+    quiet_ffmpeg -f lavfi -i "$(soft)" -pix_fmt "$2" -c:v ffv1 "${@:3}" "$1"
+}
+make_yuv420p10_mkv() { in_format "$1" yuv420p10le; }
+make_yuv422p_mkv() { in_format "$1" yuv422p; }
+make_yuv422p10_mkv() { in_format "$1" yuv422p10le; }
+make_yuv444p_mkv() { in_format "$1" yuv444p; }
+make_yuv444p12_mkv() { in_format "$1" yuv444p12le; }
+
+# The same colours in a matrix and a range: file, matrix, range, further names.
+in_colours() {
+    quiet_ffmpeg -f lavfi -i "$(soft),scale=out_color_matrix=$2:out_range=$3" -pix_fmt yuv420p \
+        -c:v ffv1 -colorspace "$4" -color_range "$3" -color_primaries "$5" -color_trc "$6" "$1"
+}
+make_bt601_mkv() { in_colours "$1" bt601 tv smpte170m smpte170m smpte170m; }
+make_bt601_full_mkv() { in_colours "$1" bt601 pc smpte170m smpte170m smpte170m; }
+make_bt709_mkv() { in_colours "$1" bt709 tv bt709 bt709 bt709; }
+make_bt709_full_mkv() { in_colours "$1" bt709 pc bt709 bt709 bt709; }
+make_bt2020_mkv() { in_colours "$1" bt2020 tv bt2020nc bt709 bt709; }
+
+# Of a high dynamic range: file, transfer.
+in_high_range() {
+    quiet_ffmpeg -f lavfi -i "$(soft),format=gbrp,zscale=tin=bt709:pin=bt709:min=gbr:rin=pc:t=linear:p=bt709:m=gbr:npl=300,format=gbrpf32le,zscale=tin=linear:pin=bt709:min=gbr:p=bt2020:t=$2:m=bt2020nc:r=tv,format=yuv420p10le" \
+        -c:v ffv1 -colorspace bt2020nc -color_range tv -color_primaries bt2020 -color_trc "$2" "$1"
+}
+make_pq_mkv() { in_high_range "$1" smpte2084; }
+make_hlg_mkv() { in_high_range "$1" arib-std-b67; }
+
+# Fifty fields a second, two in each frame: file, order, the encoder's options.
+interlaced() {
+    quiet_ffmpeg -f lavfi -i "testsrc2=size=192x108:rate=50:duration=2,scroll=horizontal=0.02,gblur=2,tinterlace=interleave_$2" \
+        -pix_fmt yuv420p "${@:3}" "$1"
+}
+mpeg2_fields() { echo "-c:v mpeg2video -q:v 2 -g 25 -flags +ildct+ilme"; }
+# shellcheck disable=SC2046
+make_top_first_ts() { interlaced "$1" top $(mpeg2_fields) -top 1; }
+# shellcheck disable=SC2046
+make_bottom_first_ts() { interlaced "$1" bottom $(mpeg2_fields) -top 0; }
+
+make_one_frame_mkv() {
+    # shellcheck disable=SC2046
+    quiet_ffmpeg -f lavfi -i "$(soft)" -frames:v 1 $(h264) -crf 8 "$1"
 }
 
 make_garbage_bin() { seq 1 40 | sha512sum | head -c 100 | tr '0-9a-f' '\200-\217' >"$1"; }

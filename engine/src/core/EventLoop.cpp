@@ -25,6 +25,7 @@ enum ObservedProperty : uint64_t {
     kSeekable,
     kBuffering,
     kBufferedUntil,
+    kInterlaced,
 };
 
 struct Observed {
@@ -40,6 +41,7 @@ const Observed kObserved[] = {
     {kSeekable, "seekable", MPV_FORMAT_FLAG},
     {kBuffering, "paused-for-cache", MPV_FORMAT_FLAG},
     {kBufferedUntil, "demuxer-cache-time", MPV_FORMAT_DOUBLE},
+    {kInterlaced, "video-frame-info/interlaced", MPV_FORMAT_FLAG},
 };
 
 double numberOf(const mpv_event_property& property) {
@@ -143,6 +145,7 @@ void EventLoop::handle(const mpv_event& event) {
             break;
         case MPV_EVENT_VIDEO_RECONFIG:
             onVideoSize();
+            if (mState.phase() == Phase::Started) mPictureHandler();
             break;
         case MPV_EVENT_PROPERTY_CHANGE:
             onProperty(*static_cast<const mpv_event_property*>(event.data));
@@ -194,9 +197,10 @@ void EventLoop::onRestart() {
     const bool hasSound = mMpv.getInt("aid").value_or(0) > 0;
     const double duration = durationOf(mMpv.getDouble("duration").value_or(0));
     const bool seekable = mMpv.getFlag("seekable").value_or(false);
+    const bool again = drawsAnew();
     const bool opened = mState.update([&](PlayerState::Values& v) {
         v.restarts++;
-        if (v.phase != Phase::Preparing) return false;
+        if (v.phase != Phase::Preparing || again) return false;
         v.restarted = true;
         v.hasVideo = hasVideo;
         v.duration = std::max(duration, v.duration);
@@ -207,6 +211,14 @@ void EventLoop::onRestart() {
     if (!hasVideo && !hasSound) return failWith(ORV_ERROR_MALFORMED);
     applyLooping();
     becomePreparedIfReady();
+}
+
+// The first picture is not shown before its filters are right. mpv is asked for
+// it once more; where it cannot seek, the filters begin with the second one.
+bool EventLoop::drawsAnew() {
+    if (mState.phase() != Phase::Preparing || !mPictureHandler()) return false;
+    const double position = mMpv.getDouble("time-pos").value_or(0);
+    return mMpv.getFlag("seekable").value_or(false) && mMpv.seek(position, "absolute+exact") >= 0;
 }
 
 void EventLoop::onFrame() {
@@ -249,6 +261,9 @@ void EventLoop::onProperty(const mpv_event_property& property) {
                 return onBuffering(flagOf(property));
             case kBufferedUntil:
                 return onBuffered(numberOf(property));
+            case kInterlaced:
+                if (mState.phase() == Phase::Started) mPictureHandler();
+                return;
         }
     }
 }

@@ -39,6 +39,9 @@ public:
     // Called when media are opened and their tracks are about to be chosen, on the
     // loop's thread; the load goes on when it returns.
     void setOpenedHandler(std::function<void()> handler) { mOpenedHandler = std::move(handler); }
+    // Called when the first picture of the media was decoded, and when pictures of
+    // another kind come, on the loop's thread; true when mpv is to begin the picture anew.
+    void setPictureHandler(std::function<bool()> handler) { mPictureHandler = std::move(handler); }
     // A new picture was drawn, or had no surface to go to.
     void onFrame();
     // Brings mpv in line with the state's looping. Any thread.
@@ -58,6 +61,7 @@ private:
     void onLoaded();
     void onEndFile(const mpv_event_end_file& end);
     void onRestart();
+    bool drawsAnew();
     void onProperty(const mpv_event_property& property);
     void onTime(double seconds);
     void onBuffering(bool buffering);
@@ -78,6 +82,7 @@ private:
     Notifier& mNotifier;
     std::function<bool()> mEndHandler;
     std::function<void()> mOpenedHandler;
+    std::function<bool()> mPictureHandler;
     int64_t mFileSize = 0;  // bytes, 0 when unknown
     std::mutex mSourceMutex;
     std::shared_ptr<MediaSource> mSource;

@@ -44,6 +44,8 @@ const Option kWished[] = {
     {"cover-art-auto", "no"},
     // Rendering waits for a frame's time; the callback comes in time already.
     {"video-timing-offset", "0"},
+    // The software renderer does not turn pictures: filters do.
+    {"video-rotate", "no"},
     {"sws-allow-zimg", "no"},
     {"sws-scaler", "fast-bilinear"},
     {"sws-fast", "yes"},

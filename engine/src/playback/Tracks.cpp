@@ -147,7 +147,7 @@ bool Tracks::select(int number) {
     if (!tables("selectTrack", all)) return false;
     const int audio = number - static_cast<int>(all.video.size());
     const int subtitle = audio - static_cast<int>(all.audio.size());
-    if (isIndex(all.video, number)) return choose("selectTrack", "vid", all.video[number].id);
+    if (isIndex(all.video, number)) return chooseVideo(all.video[number].id);
     if (isIndex(all.audio, audio)) return choose("selectTrack", "aid", all.audio[audio].id);
     if (!isIndex(all.subtitles, subtitle)) return refused("selectTrack", "no such track");
     return showSubtitle("selectTrack", all.subtitles[subtitle].id);
@@ -177,6 +177,11 @@ bool Tracks::deselect(int number) {
 
 bool Tracks::showSubtitle(const char* operation, int64_t id) {
     return choose(operation, "sid", id) && mSeeker.refresh() == android::NO_ERROR;
+}
+
+bool Tracks::chooseVideo(int64_t id) {
+    mFilters.beforeTrack(id);
+    return choose("selectTrack", "vid", id);
 }
 
 // id 0 stands for none.

@@ -8,6 +8,7 @@
 #include "core/PlayerState.h"
 #include "playback/Loader.h"
 #include "playback/Seeker.h"
+#include "playback/VideoFilters.h"
 #include "records/TrackRecords.h"
 
 namespace orvtarn {
@@ -17,8 +18,9 @@ namespace orvtarn {
 // of them, which would take any number.
 class Tracks {
 public:
-    Tracks(MpvHandle& mpv, PlayerState& state, Loader& loader, Seeker& seeker)
-        : mMpv(mpv), mState(state), mLoader(loader), mSeeker(seeker) {}
+    Tracks(MpvHandle& mpv, PlayerState& state, Loader& loader, Seeker& seeker,
+           VideoFilters& filters)
+        : mMpv(mpv), mState(state), mLoader(loader), mSeeker(seeker), mFilters(filters) {}
 
     // All tracks as they are now, without what only the container knows.
     bool tables(const char* operation, TrackTables& tables);
@@ -52,6 +54,7 @@ private:
     bool countOf(const char* operation, Table TrackTables::* table, int& count);
     template <class Table>
     bool currentOf(const char* operation, Table TrackTables::* table, int* index);
+    bool chooseVideo(int64_t id);
     bool choose(const char* operation, const char* property, int64_t id);
     bool chapterInfo(int chapter, SubtitleTrackInfo& info);
 
@@ -59,6 +62,7 @@ private:
     PlayerState& mState;
     Loader& mLoader;
     Seeker& mSeeker;
+    VideoFilters& mFilters;
 };
 
 }  // namespace orvtarn

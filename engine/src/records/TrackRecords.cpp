@@ -113,7 +113,7 @@ template <typename Record>
 Track<Record> track(const Entry& entry, const Record& record) {
     const bool isExternal = entry.isSet("external");
     return {record, entry.integer("id"), isExternal ? -1 : toInt32(entry.integer("ff-index", -1)),
-            entry.isSet("selected")};
+            entry.isSet("selected"), toInt32(entry.integer("demux-rotation"))};
 }
 
 void addEntry(const Entry& entry, TrackTables& tables) {

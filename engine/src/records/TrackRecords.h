@@ -18,6 +18,7 @@ struct Track {
     int64_t id = 0;        // for the properties vid, aid and sid
     int streamIndex = -1;  // in the MediaFile; -1 for tracks from another file
     bool selected = false;
+    int rotation = 0;  // clockwise, degrees, by which a picture is turned to be seen
 };
 
 struct TrackTables {
