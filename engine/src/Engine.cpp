@@ -1,6 +1,7 @@
 // SPDX-License-Identifier: Apache-2.0
 #include "Engine.h"
 
+#include <optional>
 #include <utility>
 
 #include "inspect/AlbumArt.h"
@@ -11,12 +12,12 @@ namespace android {
 TarnPlayer::Engine::Engine(int decoder, orvtarn::Notifier::Deliver deliver)
     : notifier(std::move(deliver)),
       video([this] { events.onFrame(); },
-            [this](uint64_t frame) { return events.frameTime(frame); }),
+            [this](uint64_t frame, int64_t due) { return events.frameTime(frame, due); }),
       events(mpv, state, video, notifier),
       loader(mpv, state, video, events, protocol),
-      seeker(mpv, state, notifier, events),
       transport(mpv, state, events),
-      speed(mpv, state, seeker, transport),
+      seeker(mpv, state, notifier, events, transport),
+      speed(mpv, state, seeker, transport, events),
       stepper(mpv, state, seeker, transport, events),
       abRepeat(mpv, state),
       audio(mpv, video),
@@ -31,6 +32,15 @@ TarnPlayer::Engine::Engine(int decoder, orvtarn::Notifier::Deliver deliver)
     events.setOpenedHandler([this] {
         videoFilters.onOpened();
         subtitles.addToMedia();
+    });
+    stepper.setFrameFrom([this](double seconds, int amount) {
+        std::optional<orvtarn::FrameAt> found;
+        if (loader.source()->isLocal()) {
+            loader.secondReading()->withFile([&](orvtarn::MediaFile& file) {
+                found = orvtarn::frameFrom(file, tracks.shownVideoStream(), seconds, amount);
+            });
+        }
+        return found;
     });
     if (!create(decoder >= 0)) {
         release();

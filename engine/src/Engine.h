@@ -75,8 +75,8 @@ private:
 
 public:
     orvtarn::Loader loader;
-    orvtarn::Seeker seeker;
     orvtarn::Transport transport;
+    orvtarn::Seeker seeker;
     orvtarn::Speed speed;
     orvtarn::Stepper stepper;
     orvtarn::AbRepeat abRepeat;

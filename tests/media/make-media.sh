@@ -19,7 +19,8 @@ FILES="video.mp4 video.mkv video.ts video.avi slides.mkv rotated.mp4 hd.mp4 hd70
        soft.mp4 turned-90.mp4 turned-180.mp4 turned-270.mp4 turned-and-not.mp4 anamorphic.mkv
        yuv420p10.mkv yuv422p.mkv yuv422p10.mkv yuv444p.mkv yuv444p12.mkv
        bt601.mkv bt601-full.mkv bt709.mkv bt709-full.mkv bt2020.mkv pq.mkv hlg.mkv
-       top-first.ts bottom-first.ts one-frame.mkv"
+       top-first.ts bottom-first.ts one-frame.mkv
+       counted-60.mkv counted-film.mp4 counted-varying.mkv counted.ts"
 
 quiet_ffmpeg() { ffmpeg -nostdin -v error -y "$@"; }
 
@@ -396,6 +397,19 @@ make_one_frame_mkv() {
     # shellcheck disable=SC2046
     quiet_ffmpeg -f lavfi -i "$(soft)" -frames:v 1 $(h264) -crf 8 "$1"
 }
+
+# Frames that show their numbers: eight stripes are the binary digits, the lowest
+# one first, white for one. The argument after the file: the rate.
+counted() {
+    # shellcheck disable=SC2046
+    quiet_ffmpeg -f lavfi -i "nullsrc=size=128x32:rate=$2:duration=4,format=yuv420p,geq=lum='if(bitand(N\,pow(2\,floor(X/16)))\,235\,16)':cb=128:cr=128${4-}" \
+        $(fast_h264) -crf 12 -g "$3" -vsync passthrough "$1"
+}
+make_counted_60_mkv() { counted "$1" 60 60; }
+make_counted_ts() { counted "$1" 25 25; }
+make_counted_film_mp4() { counted "$1" 24000/1001 24; }
+# Of each ten frames five are left.
+make_counted_varying_mkv() { counted "$1" 60 30 ",select=lt(mod(n*n\,10)\,5)"; }
 
 make_garbage_bin() { seq 1 40 | sha512sum | head -c 100 | tr '0-9a-f' '\200-\217' >"$1"; }
 make_empty_bin() { : >"$1"; }

@@ -90,32 +90,49 @@ void EventLoop::setSource(std::shared_ptr<MediaSource> source) {
 void EventLoop::run() {
     nameThisThread("orv-events");
     while (!mQuit) {
-        handle(*mpv_wait_event(mMpv.get(), -1));
+        // A frame's time may be among the reports that wait.
+        const mpv_event& event = *mpv_wait_event(mMpv.get(), mUntimedFrame == 0 ? -1 : 0);
+        handle(event);
         if (mLooksForEnd.exchange(false)) onEndReached();
-        tellFrameTime();
+        if (event.event_id == MPV_EVENT_NONE) answerFrameTime();
     }
 }
 
-// While playing, mpv's own time may be that of the frame to come; paused,
-// the state may still be that of the frame before.
-std::optional<int64_t> EventLoop::frameTime(uint64_t frame) {
+std::optional<int64_t> EventLoop::frameTime(uint64_t frame, int64_t due) {
     const PlayerState::Values now = mState.read([](const PlayerState::Values& v) { return v; });
-    if (now.phase == Phase::Started) return toMicroseconds(now.position);
+    const std::optional<double> expected = mFrameClock.begin(due);
     mUntimedFrame = frame;
     mpv_wakeup(mMpv.get());
-    return {};
+    if (!expected || now.phase != Phase::Started || now.seeking) return {};
+    return toMicroseconds(*expected);
 }
 
 // Until a seek or the load is done, mpv's time may be the one that it left
 // or the one that was asked for.
-void EventLoop::tellFrameTime() {
-    uint64_t frame = mUntimedFrame;
+void EventLoop::answerFrameTime() {
+    const uint64_t frame = mUntimedFrame;
     if (frame == 0) return;
     const PlayerState::Values now = mState.read([](const PlayerState::Values& v) { return v; });
-    if (now.seeking || (now.phase == Phase::Preparing && !now.restarted)) return;
-    const double time = mMpv.getDouble("time-pos").value_or(now.position);
-    mVideo.setFrameTime(frame, toMicroseconds(time));
+    if (now.isArriving() || (now.phase == Phase::Preparing && !now.restarted)) return;
+    const double reported = mMpv.getDouble("time-pos").value_or(now.position);
+    if (now.phase != Phase::Started) {
+        mFrameClock.stand(reported);
+        return setFrameTime(frame, reported);
+    }
+    setFrameTime(frame, mFrameClock.resolve(reported, mpv_get_time_us(mMpv.get())));
+}
+
+void EventLoop::setFrameTime(uint64_t frame, double seconds) {
+    mVideo.setFrameTime(frame, toMicroseconds(seconds));
     mUntimedFrame.compare_exchange_strong(frame, 0);  // unless the next one is here
+}
+
+// mpv's time is no longer that of a frame before.
+void EventLoop::onSeek() {
+    mState.update([](PlayerState::Values& v) { v.seeks++; });
+    const uint64_t frame = mUntimedFrame;
+    const std::optional<double> time = mFrameClock.leave();
+    if (frame != 0 && time) setFrameTime(frame, *time);
 }
 
 void EventLoop::lookForEnd() {
@@ -138,7 +155,7 @@ void EventLoop::handle(const mpv_event& event) {
             onLoaded();
             break;
         case MPV_EVENT_SEEK:
-            mState.update([](PlayerState::Values& v) { v.seeks++; });
+            onSeek();
             break;
         case MPV_EVENT_PLAYBACK_RESTART:
             onRestart();
@@ -207,10 +224,34 @@ void EventLoop::onRestart() {
         v.seekable = seekable;
         return true;
     });
-    if (!opened) return;
+    if (!opened) return endUnattendedSeek();
     if (!hasVideo && !hasSound) return failWith(ORV_ERROR_MALFORMED);
     applyLooping();
     becomePreparedIfReady();
+}
+
+bool EventLoop::seekUnattended(const std::function<int()>& command) {
+    const bool begun = mState.update([](PlayerState::Values& v) {
+        if (v.seeking || !v.isOpen()) return false;
+        v.seeking = true;
+        v.beginSeek();
+        return true;
+    });
+    if (!begun) return false;
+    if (command() >= 0) return true;
+    mState.update([](PlayerState::Values& v) { v.seeking = false; });
+    return false;
+}
+
+void EventLoop::endUnattendedSeek() {
+    const double position = mMpv.getDouble("time-pos").value_or(0);
+    const bool ended = mState.update([&](PlayerState::Values& v) {
+        if (!v.seeking || v.attended || v.isArriving()) return false;
+        v.seeking = false;
+        v.position = position;
+        return true;
+    });
+    if (ended) mLooksForEnd = true;
 }
 
 // The first picture is not shown before its filters are right. mpv is asked for

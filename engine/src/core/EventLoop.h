@@ -11,6 +11,7 @@
 #include <optional>
 #include <thread>
 
+#include "core/FrameClock.h"
 #include "core/MpvHandle.h"
 #include "core/Notifier.h"
 #include "core/PlayerState.h"
@@ -46,10 +47,15 @@ public:
     void onFrame();
     // Brings mpv in line with the state's looping. Any thread.
     void applyLooping();
-    // The media time of a frame that was just drawn, microseconds. While nothing
-    // plays, only mpv knows it: then it is asked on the loop's thread, and the
-    // video output told. Does not wait.
-    std::optional<int64_t> frameTime(uint64_t frame);
+    // The media time of the frame of that number as far as the frames before lead to
+    // it, in microseconds. mpv is asked for it on the loop's thread, which gives
+    // the answer to the video output. Does not wait.
+    std::optional<int64_t> frameTime(uint64_t frame, int64_t due);
+    // How fast the media plays from now on, 1 for normal, negative for backward.
+    void setSpeed(double speed) { mFrameClock.setSpeed(speed); }
+    // Runs a command that makes mpv seek and does not wait: other seeks do, until it
+    // has arrived. False when another one is under way or mpv refuses it. Any thread.
+    bool seekUnattended(const std::function<int()>& command);
     // Looks whether mpv is at an end, as an operation may find it there,
     // or have kept it from being noticed. Any thread; does not wait.
     void lookForEnd();
@@ -62,6 +68,7 @@ private:
     void onEndFile(const mpv_event_end_file& end);
     void onRestart();
     bool drawsAnew();
+    void endUnattendedSeek();
     void onProperty(const mpv_event_property& property);
     void onTime(double seconds);
     void onBuffering(bool buffering);
@@ -69,7 +76,9 @@ private:
     void onEndReached();
     void onVideoSize();
     void becomePreparedIfReady();
-    void tellFrameTime();
+    void answerFrameTime();
+    void setFrameTime(uint64_t frame, double seconds);
+    void onSeek();
     void failWith(android::status_t status);
     std::shared_ptr<MediaSource> source();
     double durationOf(double byMpv);
@@ -87,6 +96,7 @@ private:
     std::mutex mSourceMutex;
     std::shared_ptr<MediaSource> mSource;
     std::atomic<bool> mLooksForEnd{false};
+    FrameClock mFrameClock;
     std::atomic<uint64_t> mUntimedFrame{0};  // 0 for none
     std::atomic<bool> mQuit{false};
     std::thread mThread;

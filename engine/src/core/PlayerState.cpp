@@ -22,9 +22,19 @@ bool PlayerState::Values::isOpen() const {
     return isOneOf({Phase::Prepared, Phase::Started, Phase::Paused, Phase::Completed});
 }
 
+void PlayerState::Values::beginSeek() {
+    seeksOf = seeks;
+    restartsOf = restarts;
+}
+
+bool PlayerState::Values::isArriving() const {
+    return seeking && (seeks == seeksOf || restarts == restartsOf);
+}
+
 void PlayerState::Values::forgetMedia() {
     const Values fresh;
     fileStarted = restarted = framed = hasVideo = seekable = buffering = false;
+    if (!attended) seeking = false;  // who attends it ends it
     position = fresh.position;
     duration = fresh.duration;
     width = height = 0;

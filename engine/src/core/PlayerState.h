@@ -46,11 +46,14 @@ public:
         bool seekable = false;
         bool buffering = false;
         bool seeking = false;   // one seek at a time
+        bool attended = false;  // by a caller who keeps mpv paused meanwhile
         uint64_t seeks = 0;     // begun by mpv
         uint64_t restarts = 0;  // playback gone on after a seek or the load
-        double position = 0;    // seconds
-        double duration = 0;    // seconds, 0 when unknown
-        int width = 0;          // of the picture as it is meant to be seen, pixels
+        uint64_t seeksOf = 0;   // the two numbers when the seek under way was begun
+        uint64_t restartsOf = 0;
+        double position = 0;  // seconds
+        double duration = 0;  // seconds, 0 when unknown
+        int width = 0;        // of the picture as it is meant to be seen, pixels
         int height = 0;
         int bufferPercent = 0;
 
@@ -59,6 +62,12 @@ public:
         bool isOneOf(std::initializer_list<Phase> phases) const;
         // Prepared and not stopped: there is media to operate on.
         bool isOpen() const;
+        // A seek or the load goes on with mpv paused.
+        bool isHeld() const { return attended || phase == Phase::Preparing; }
+        // A seek is about to be given to mpv.
+        void beginSeek();
+        // It is under way and mpv has not gone on from where it leads.
+        bool isArriving() const;
         void forgetMedia();
         // Goes to the error phase unless the media is given up anyway.
         bool fail(android::status_t status);

@@ -110,6 +110,12 @@ bool VideoOutput::takeFrame() {
     mpv_render_param parameter = {MPV_RENDER_PARAM_NEXT_FRAME_INFO, &info};
     if (mpv_render_context_get_info(mContext, parameter) < 0) return false;
     if ((info.flags & MPV_RENDER_FRAME_INFO_PRESENT) == 0) return false;
+    const bool isAnother = (info.flags & MPV_RENDER_FRAME_INFO_REDRAW) == 0 || !mHasPicture;
+    if (isAnother) {
+        releaseHeld();
+        mIsTimed = false;
+        mTimeUs = mFrameTime(++mFrame, info.target_time);
+    }
     mHasPicture = true;
     return true;
 }
@@ -120,7 +126,6 @@ bool VideoOutput::render(bool newFrame) {
     {
         std::lock_guard<std::mutex> lock(mSurfaceMutex);
         const bool shown = mProducer != nullptr && mVisible;
-        mTimeIsDue = mTimeIsDue || newFrame;
         dropHeld();
         status = shown ? draw() : android::NO_INIT;
         if (mHeld) return true;
@@ -159,20 +164,13 @@ android::status_t VideoOutput::draw() {
         return status;
     }
     mDrawnSize = size;
-    if (mTimeIsDue) {
-        const std::optional<int64_t> time = mFrameTime(++mFrame);
-        if (!time) {
-            mHeld = buffer.slot;
-            return android::NO_ERROR;
-        }
-        mTimeUs = *time;
-        mTimeIsDue = false;
-    }
-    return queue(buffer.slot);
+    if (mIsTimed) return queue(buffer.slot);
+    mHeld = buffer.slot;
+    return android::NO_ERROR;
 }
 
 android::status_t VideoOutput::queue(int slot) {
-    const android::status_t status = mProducer->queueBuffer(slot, mTimeUs);
+    const android::status_t status = mProducer->queueBuffer(slot, *mTimeUs);
     if (status == android::NO_ERROR) mDelivered++;
     return status;
 }
@@ -180,14 +178,30 @@ android::status_t VideoOutput::queue(int slot) {
 void VideoOutput::deliverHeld(uint64_t frame, int64_t microseconds) {
     {
         std::lock_guard<std::mutex> lock(mSurfaceMutex);
-        if (!mHeld || frame != mFrame) return;
-        // The media may be closed by now.
-        if (!mHasPicture) return dropHeld();
+        if (mIsTimed || frame != mFrame) return;
         mTimeUs = microseconds;
-        mTimeIsDue = false;
-        queue(*std::exchange(mHeld, std::nullopt));
+        mIsTimed = true;
+        if (!queueHeld()) return;
     }
     mOnFrame();
+}
+
+// The frame that follows is here, and the answer is not.
+void VideoOutput::releaseHeld() {
+    {
+        std::lock_guard<std::mutex> lock(mSurfaceMutex);
+        if (!mTimeUs || !queueHeld()) return;
+    }
+    mOnFrame();
+}
+
+// Whether there was one.
+bool VideoOutput::queueHeld() {
+    // The media may be closed by now.
+    if (!mHasPicture) dropHeld();
+    if (!mHeld) return false;
+    queue(*std::exchange(mHeld, std::nullopt));
+    return true;
 }
 
 // The frame is drawn anew, or nobody wants it any more.

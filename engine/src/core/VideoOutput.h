@@ -26,10 +26,12 @@ public:
     };
 
     // onFrame: after each picture that was drawn or had no surface to go to.
-    // frameTime: the media time of the frame of that number, which was just drawn,
-    // microseconds. Nothing when setFrameTime will tell; the frame is held until
-    // then. Both are called on the rendering thread, which must not ask mpv.
-    using FrameTime = std::function<std::optional<int64_t>(uint64_t frame)>;
+    // frameTime: has the media time of the frame of that number sought, which is due at that
+    // moment of mpv's clock; both in microseconds. The frame is held until
+    // setFrameTime. When the next frame is here first, it gets the returned time,
+    // and without one it is dropped. Both are called on the rendering thread, which
+    // must not ask mpv.
+    using FrameTime = std::function<std::optional<int64_t>(uint64_t frame, int64_t due)>;
     VideoOutput(std::function<void()> onFrame, FrameTime frameTime)
         : mOnFrame(std::move(onFrame)), mFrameTime(std::move(frameTime)) {}
     ~VideoOutput() { destroy(); }
@@ -71,6 +73,8 @@ private:
     android::status_t queue(int slot);
     void deliverHeld(uint64_t frame, int64_t microseconds);
     void dropHeld();
+    bool queueHeld();
+    void releaseHeld();
 
     const std::function<void()> mOnFrame;
     const FrameTime mFrameTime;
@@ -90,10 +94,10 @@ private:
     android::sp<android::IGraphicBufferProducer> mProducer;
     bool mVisible = true;
     Size mDrawnSize;
-    bool mTimeIsDue = false;  // mpv's frame has no time yet
-    int64_t mTimeUs = 0;
-    uint64_t mFrame = 0;       // whose time was asked for last
-    std::optional<int> mHeld;  // the slot of a drawn frame without a time
+    uint64_t mFrame = 0;  // mpv's newest
+    std::optional<int64_t> mTimeUs;
+    bool mIsTimed = false;     // else the time is what is expected
+    std::optional<int> mHeld;  // the slot of a drawn frame that is not timed
 
     std::atomic<Size> mVideoSize{Size()};
     std::atomic<bool> mHasPicture{false};

@@ -37,22 +37,42 @@ status_t Seeker::seekTo(int msec, int mode) {
     const double duration = mState.read([](const PlayerState::Values& v) { return v.duration; });
     double target = std::max(msec, 0) / 1000.0;
     if (duration > 0) target = std::min(target, duration);
-    return told(inTurn("seekTo", [&](const Turn& turn) { return seekAs(mode, target, turn); }));
+    return told(
+        inTurn("seekTo", Kind::Seek, [&](const Turn& turn) { return seekAs(mode, target, turn); }));
 }
 
 status_t Seeker::seekToTime(const char* operation, double target) {
-    return told(inTurn(operation, [&](const Turn& turn) { return moveTo(target, kExact, turn); }));
+    return told(showFrame(operation, target));
+}
+
+status_t Seeker::showFrame(const char* operation, double target) {
+    return inTurn(operation, Kind::Seek,
+                  [&](const Turn& turn) { return moveTo(target, kExact, turn); });
 }
 
 status_t Seeker::refresh() {
     const bool wanted = mState.read(
         [](const PlayerState::Values& v) { return v.seekable && v.phase != Phase::Completed; });
     if (!wanted) return android::NO_ERROR;
-    return inTurn("refresh", [this](const Turn& turn) { return moveTo(position(), kExact, turn); });
+    return inTurn("refresh", Kind::Seek,
+                  [this](const Turn& turn) { return moveTo(position(), kExact, turn); });
 }
 
 status_t Seeker::runAndAwait(const char* operation, const std::function<int()>& command) {
-    return inTurn(operation, [&](const Turn& turn) { return await(operation, turn, command); });
+    return inTurn(operation, Kind::Seek,
+                  [&](const Turn& turn) { return await(operation, turn, command); });
+}
+
+status_t Seeker::setDirection(const char* operation, bool backward) {
+    const auto turn = [&] { return mMpv.set("play-dir", backward ? "backward" : "forward"); };
+    return inTurn(operation, Kind::SeekInPlace,
+                  [&](const Turn& t) { return await(operation, t, turn); });
+}
+
+status_t Seeker::runAlone(const char* operation, const std::function<bool()>& move) {
+    return inTurn(operation, Kind::Move, [&](const Turn&) {
+        return move() ? android::NO_ERROR : android::INVALID_OPERATION;
+    });
 }
 
 status_t Seeker::told(status_t status) {
@@ -60,39 +80,46 @@ status_t Seeker::told(status_t status) {
     return status;
 }
 
-status_t Seeker::inTurn(const char* operation, const Task& task) {
+status_t Seeker::inTurn(const char* operation, Kind kind, const Task& task) {
     const status_t open = mState.requireOpen(operation);
     if (open != android::NO_ERROR) return open;
     const Turn turn = {mState.read([](const PlayerState::Values& v) { return v.session; }),
                        std::chrono::steady_clock::now() + kSeekLimit};
-    status_t status = begin(operation, turn);
+    status_t status = begin(operation, kind, turn);
     if (status != android::NO_ERROR) return status;
+    mTransport.setSeeking(true);
     status = task(turn);
-    mState.update([](PlayerState::Values& v) { v.seeking = false; });
+    mTransport.setSeeking(false);
+    mState.update([](PlayerState::Values& v) { v.seeking = v.attended = false; });
     mEvents.lookForEnd();
     return status;
 }
 
 // Waits for its turn. NO_ERROR makes the caller the one that seeks.
-status_t Seeker::begin(const char* operation, const Turn& turn) {
-    bool seekable = true;
+status_t Seeker::begin(const char* operation, Kind kind, const Turn& turn) {
+    bool possible = true;
     bool begun = false;
     // The turn is taken inside the wait: of two that wake up, one waits on.
     const bool inTime = mState.waitUntil(turn.deadline, [&](PlayerState::Values& v) {
         if (v.session != turn.session || !v.isOpen()) return true;
-        seekable = v.seekable;
-        if (!seekable) return true;
+        possible = v.seekable || kind == Kind::Move;
+        if (!possible) return true;
         begun = !v.seeking;
-        v.seeking = true;
+        if (!begun) return false;
+        v.seeking = v.attended = true;
         // What is sought from the end is no longer complete.
-        if (begun && v.phase == Phase::Completed) v.phase = Phase::Paused;
-        return begun;
+        if (kind == Kind::Seek && v.phase == Phase::Completed) v.phase = Phase::Paused;
+        return true;
     });
     if (begun) return android::NO_ERROR;
-    if (!inTime) return failed(android::TIMED_OUT, operation, "another seek does not end");
-    if (!seekable) mNotifier.post(android::MEDIA_INFO, android::MEDIA_INFO_NOT_SEEKABLE);
+    if (!inTime) {
+        // One that nobody attends to and that does not arrive is given up.
+        mState.update([](PlayerState::Values& v) { v.seeking = v.attended; });
+        return failed(android::TIMED_OUT, operation, "another seek does not end");
+    }
+    if (!possible) mNotifier.post(android::MEDIA_INFO, android::MEDIA_INFO_NOT_SEEKABLE);
     return failed(android::INVALID_OPERATION, operation,
-                  seekable ? "ended by another operation" : "the media cannot seek");
+                  possible ? "ended by another operation" : "the media cannot seek");
 }
 
 status_t Seeker::seekAs(int mode, double target, const Turn& turn) {
@@ -138,14 +165,14 @@ status_t Seeker::moveTo(double target, const char* flags, const Turn& turn) {
 
 status_t Seeker::await(const char* operation, const Turn& turn,
                        const std::function<int()>& command) {
-    const auto before = mState.read([](const PlayerState::Values& v) { return v; });
+    mState.update([](PlayerState::Values& v) { v.beginSeek(); });
     const int error = command();
     if (error < 0) return failed(android::INVALID_OPERATION, operation, mpv_error_string(error));
     const auto overtaken = [&turn](const PlayerState::Values& v) {
         return v.session != turn.session || !v.isOpen();
     };
     const bool inTime = mState.waitUntil(turn.deadline, [&](const PlayerState::Values& v) {
-        return overtaken(v) || (v.seeks > before.seeks && v.restarts > before.restarts);
+        return overtaken(v) || !v.isArriving();
     });
     if (!inTime) return failed(android::TIMED_OUT, operation, "the position is not reached");
     if (mState.read(overtaken)) {

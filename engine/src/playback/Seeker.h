@@ -11,6 +11,7 @@
 #include "core/MpvHandle.h"
 #include "core/Notifier.h"
 #include "core/PlayerState.h"
+#include "playback/Transport.h"
 
 namespace orvtarn {
 
@@ -19,19 +20,27 @@ namespace orvtarn {
 // once with one event.
 class Seeker {
 public:
-    Seeker(MpvHandle& mpv, PlayerState& state, Notifier& notifier, EventLoop& events)
-        : mMpv(mpv), mState(state), mNotifier(notifier), mEvents(events) {}
+    Seeker(MpvHandle& mpv, PlayerState& state, Notifier& notifier, EventLoop& events,
+           Transport& transport)
+        : mMpv(mpv), mState(state), mNotifier(notifier), mEvents(events), mTransport(transport) {}
 
     // mode: a MediaTrack::ReadOptions::SeekMode. Times outside of the media are
     // taken as its start or end.
     android::status_t seekTo(int msec, int mode);
     // To the frame at that time, telling the listener.
     android::status_t seekToTime(const char* operation, double seconds);
+    // The same without a word to the listener.
+    android::status_t showFrame(const char* operation, double seconds);
     // Shows the current frame anew, with subtitles as they are chosen now.
     // Media that cannot seek or are at their end are left alone.
     android::status_t refresh();
     // Runs a command that makes mpv seek, and waits for its arrival.
     android::status_t runAndAwait(const char* operation, const std::function<int()>& command);
+    // Has mpv play in that direction from now on; it seeks for that. Media at
+    // their end stay there.
+    android::status_t setDirection(const char* operation, bool backward);
+    // Runs what moves the position without a seek, while nobody seeks.
+    android::status_t runAlone(const char* operation, const std::function<bool()>& move);
 
 private:
     // What one operation has: the session that it began in, and its time.
@@ -40,10 +49,12 @@ private:
         std::chrono::steady_clock::time_point deadline;
     };
     using Task = std::function<android::status_t(const Turn&)>;
+    // What an operation asks of the media, and does to them.
+    enum class Kind { Seek, SeekInPlace, Move };
 
     // Runs a task as the only one that seeks.
-    android::status_t inTurn(const char* operation, const Task& task);
-    android::status_t begin(const char* operation, const Turn& turn);
+    android::status_t inTurn(const char* operation, Kind kind, const Task& task);
+    android::status_t begin(const char* operation, Kind kind, const Turn& turn);
     android::status_t told(android::status_t status);
     void leaveEnd();
     android::status_t seekAs(int mode, double seconds, const Turn& turn);
@@ -58,6 +69,7 @@ private:
     PlayerState& mState;
     Notifier& mNotifier;
     EventLoop& mEvents;
+    Transport& mTransport;
 };
 
 }  // namespace orvtarn

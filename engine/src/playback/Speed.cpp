@@ -24,6 +24,11 @@ bool isSpeed(int speed) {
     return speed >= ORV_SPEED_MIN && speed <= ORV_SPEED_MAX && abs(speed) >= kSlowest;
 }
 
+// mpv stands still, and this unit seeks.
+bool jumps(int speed) { return speed < -kFastestBackwardPlay; }
+
+bool playsBackward(int speed) { return speed < 0 && !jumps(speed); }
+
 }  // namespace
 
 status_t Speed::set(int speed) {
@@ -39,16 +44,28 @@ status_t Speed::set(int speed) {
 }
 
 status_t Speed::apply(int speed) {
-    const bool jumps = speed < -kFastestBackwardPlay;
-    const bool plays = speed < 0 && !jumps;
-    int error = mMpv.set("framedrop", speed > kFastestFullDecoding ? "decoder+vo" : "vo");
-    if (error >= 0) error = mMpv.set("play-dir", plays ? "backward" : "forward");
-    if (error >= 0) error = mMpv.set("speed", jumps ? 1.0 : abs(speed) / 1000.0);
+    const int error = setTempo(speed);
     if (error < 0) return failed(android::UNKNOWN_ERROR, "setSpeed", mpv_error_string(error));
+    const bool turns = playsBackward(speed) != playsBackward(mSpeed);
+    if (turns) {
+        const status_t status = mSeeker.setDirection("setSpeed", playsBackward(speed));
+        if (status != android::NO_ERROR) {
+            setTempo(mSpeed);
+            return status;
+        }
+    }
     mSpeed = speed;
-    mTransport.setTrick(jumps, speed < 0);
-    if (jumps) startJumping(speed);
+    mTransport.setTrick(jumps(speed), speed < 0);
+    if (jumps(speed)) startJumping(speed);
     return android::NO_ERROR;
+}
+
+// How fast mpv plays, whatever the direction. 0 or an mpv_error.
+int Speed::setTempo(int speed) {
+    const double tempo = jumps(speed) ? 1.0 : abs(speed) / 1000.0;
+    mEvents.setSpeed(speed < 0 ? -tempo : tempo);
+    const int error = mMpv.set("framedrop", speed > kFastestFullDecoding ? "decoder+vo" : "vo");
+    return error < 0 ? error : mMpv.set("speed", tempo);
 }
 
 bool Speed::canSeek(int speed) const {
@@ -64,16 +81,17 @@ bool Speed::canPlay(int speed) const {
 
 bool Speed::onEndReached() {
     if (mSpeed >= 0) return false;
-    becomeNormal();
-    mMpv.seek(0, "absolute");
+    mEvents.seekUnattended([this] {
+        becomeNormal();
+        return mMpv.seek(0, "absolute");
+    });
     return true;
 }
 
 void Speed::becomeNormal() {
     mSpeed = ORV_SPEED_NORMAL;
-    mMpv.set("framedrop", "vo");
+    setTempo(ORV_SPEED_NORMAL);
     mMpv.set("play-dir", "forward");
-    mMpv.set("speed", 1.0);
     mTransport.setTrick(false, false);
 }
 

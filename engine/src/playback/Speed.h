@@ -21,8 +21,9 @@ namespace orvtarn {
 // backward go on forward at the normal speed.
 class Speed {
 public:
-    Speed(MpvHandle& mpv, PlayerState& state, Seeker& seeker, Transport& transport)
-        : mMpv(mpv), mState(state), mSeeker(seeker), mTransport(transport) {}
+    Speed(MpvHandle& mpv, PlayerState& state, Seeker& seeker, Transport& transport,
+          EventLoop& events)
+        : mMpv(mpv), mState(state), mSeeker(seeker), mTransport(transport), mEvents(events) {}
     ~Speed() { stopJumping(); }
 
     // BAD_VALUE outside of 250..32000 forward or backward, INVALID_OPERATION
@@ -42,6 +43,7 @@ public:
 
 private:
     android::status_t apply(int speed);
+    int setTempo(int speed);
     void becomeNormal();
     void startJumping(int speed);
     void stopJumping();
@@ -52,6 +54,7 @@ private:
     PlayerState& mState;
     Seeker& mSeeker;
     Transport& mTransport;
+    EventLoop& mEvents;
     std::atomic<int> mSpeed{1000};
 
     std::mutex mSetMutex;  // one change at a time

@@ -24,7 +24,7 @@ status_t Transport::start() {
         case Phase::Started:
             return android::NO_ERROR;
         case Phase::Completed:
-            if (!mBackward) mMpv.seek(0, "absolute");
+            if (!mBackward) mEvents.seekUnattended([this] { return mMpv.seek(0, "absolute"); });
             break;
         case Phase::Prepared:
         case Phase::Paused:
@@ -32,7 +32,7 @@ status_t Transport::start() {
         default:
             return PlayerState::wrongPhase("start", before);
     }
-    mMpv.set("pause", mCoreHeld);
+    applyPause();
     // mpv may have been at its end while it was paused.
     if (before != Phase::Completed) mEvents.lookForEnd();
     return android::NO_ERROR;
@@ -69,7 +69,22 @@ void Transport::setTrick(bool coreHeld, bool backward) {
     std::lock_guard<std::mutex> lock(mMutex);
     mCoreHeld = coreHeld;
     mBackward = backward;
-    mMpv.set("pause", coreHeld || mState.phase() != Phase::Started);
+    applyPause();
+}
+
+bool Transport::isBackward() {
+    std::lock_guard<std::mutex> lock(mMutex);
+    return mBackward;
+}
+
+void Transport::setSeeking(bool seeking) {
+    std::lock_guard<std::mutex> lock(mMutex);
+    mSeeking = seeking;
+    applyPause();
+}
+
+void Transport::applyPause() {
+    mMpv.set("pause", mCoreHeld || mSeeking || mState.phase() != Phase::Started);
 }
 
 void Transport::becomePaused() {

@@ -37,8 +37,13 @@ public:
     // While another unit moves the position itself, mpv is kept paused.
     // Backward play after the end begins at the end.
     void setTrick(bool coreHeld, bool backward);
+    bool isBackward();
+    // While a seek is under way, mpv is kept paused: it stands at the first frame
+    // of the new position until that is known.
+    void setSeeking(bool seeking);
 
 private:
+    void applyPause();
     android::status_t getSize(const char* operation, int PlayerState::Values::* member,
                               int* pixels) const;
 
@@ -49,6 +54,7 @@ private:
     std::mutex mMutex;
     bool mCoreHeld = false;
     bool mBackward = false;
+    bool mSeeking = false;
 };
 
 }  // namespace orvtarn

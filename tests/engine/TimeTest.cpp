@@ -1,0 +1,229 @@
+// SPDX-License-Identifier: Apache-2.0
+// The times of frames and of positions are the file's own.
+#include <media/MediaTrack.h>
+#include <orvtarn/PlayerTypes.h>
+
+#include "CountedFrames.h"
+#include "PlayerTest.h"
+
+using namespace android;
+using namespace orvtest;
+
+namespace {
+
+// Media whose frames show their numbers.
+struct Counted {
+    const char* file;
+    double framesPerSecond;  // by which the numbers count
+    int last;                // frame
+};
+
+const Counted kSixty = {"counted-60.mkv", 60, 239};
+const Counted kFilm = {"counted-film.mp4", 24000 / 1001.0, 95};
+const Counted kVarying = {"counted-varying.mkv", 60, 239};
+const Counted kTransport = {"counted.ts", 25, 99};
+
+class TimeTest : public PlayerTest {
+protected:
+    TimeTest() { player->setVideoSurfaceTexture(frames); }
+    ~TimeTest() override { player->release(); }
+
+    static double millisecondsOf(const Counted& media, int number) {
+        return number * 1000 / media.framesPerSecond;
+    }
+
+    // Whether the frames came with their own times, to a millisecond. The last one
+    // before a jump of mpv's own may come with the time of where that leads.
+    static void expectOwnTimes(const Counted& media, const std::vector<CountedFrame>& frames,
+                               int jumps = 0) {
+        int wrong = 0;
+        for (const CountedFrame& frame : frames) {
+            const double expected = millisecondsOf(media, frame.number);
+            const double got = static_cast<double>(frame.timestampUs) / 1000;
+            if (std::abs(got - expected) <= 1) continue;
+            if (++wrong > jumps && wrong <= 5)
+                ADD_FAILURE() << "frame " << frame.number << " at " << got << " ms";
+        }
+        EXPECT_LE(wrong, jumps) << "of " << frames.size();
+    }
+
+    // Whether the player stands at a frame, and shows it.
+    void expectAt(const Counted& media, int number) {
+        EXPECT_TRUE(eventually([&] { return frames->last().number == number; }, 5))
+            << "frame " << frames->last().number << " in place of " << number;
+        EXPECT_NEAR(millisecondsOf(media, number), position(), 1);
+        const CountedFrame last = frames->last();
+        EXPECT_NEAR(millisecondsOf(media, last.number),
+                    static_cast<double>(last.timestampUs) / 1000, 1);
+    }
+
+    status_t seekTo(int msec) {
+        return player->seekTo(msec, MediaTrack::ReadOptions::SEEK_CLOSEST);
+    }
+
+    sp<CountingSink> frames = new CountingSink;
+};
+
+class FrameTimeTest : public TimeTest,
+                      public testing::WithParamInterface<std::tuple<Counted, int>> {};
+
+TEST_P(FrameTimeTest, IsTheFilesOwn) {
+    const auto& [media, speed] = GetParam();
+    open(media.file);
+    ASSERT_EQ(NO_ERROR, player->setSpeed(speed));
+    playToEnd();
+    EXPECT_TRUE(eventually([&] { return frames->last().number == media.last; }, 3));
+    const std::vector<CountedFrame> seen = frames->take();
+    EXPECT_GT(seen.size(), 20u);
+    expectOwnTimes(media, seen);
+}
+
+std::string nameOf(const testing::TestParamInfo<std::tuple<Counted, int>>& info) {
+    std::string name = std::get<0>(info.param).file;
+    for (char& letter : name) {
+        if (!isalnum(letter)) letter = '_';
+    }
+    return name + "_" + std::to_string(std::get<1>(info.param));
+}
+
+INSTANTIATE_TEST_SUITE_P(Speeds, FrameTimeTest,
+                         testing::Combine(testing::Values(kSixty, kFilm, kVarying, kTransport),
+                                          testing::Values(500, 1000, 1500, 4000)),
+                         nameOf);
+
+TEST_F(TimeTest, FramesOfALoopHaveTheirOwnTimes) {
+    open(kSixty.file);
+    ASSERT_EQ(NO_ERROR, player->setLooping(true));
+    ASSERT_EQ(NO_ERROR, player->setSpeed(2000));
+    ASSERT_EQ(NO_ERROR, player->start());
+    for (int round = 0; round < 2; round++) {
+        ASSERT_TRUE(eventually([&] { return frames->last().number > 200; }));
+        ASSERT_TRUE(eventually([&] { return frames->last().number < 100; }));
+    }
+    ASSERT_EQ(NO_ERROR, player->pause());
+    expectOwnTimes(kSixty, frames->take(), 2);
+}
+
+TEST_F(TimeTest, FramesOfARepeatedSectionHaveTheirOwnTimes) {
+    open(kSixty.file);
+    ASSERT_EQ(NO_ERROR, seekTo(1000));
+    ASSERT_NE(0, player->setABRepeat(E_ORV_AB_REPEAT_SET_A));
+    ASSERT_EQ(NO_ERROR, seekTo(2000));
+    ASSERT_NE(0, player->setABRepeat(E_ORV_AB_REPEAT_SET_B));
+    ASSERT_EQ(NO_ERROR, seekTo(1000));
+    ASSERT_EQ(NO_ERROR, player->start());
+    for (int round = 0; round < 2; round++) {
+        ASSERT_TRUE(eventually([&] { return frames->last().number > 110; }));
+        ASSERT_TRUE(eventually([&] { return frames->last().number < 80; }));
+    }
+    ASSERT_EQ(NO_ERROR, player->pause());
+    expectOwnTimes(kSixty, frames->take(), 2);
+}
+
+TEST_F(TimeTest, FramesPlayedBackwardHaveTheirOwnTimes) {
+    open(kSixty.file);
+    ASSERT_EQ(NO_ERROR, seekTo(3500));
+    ASSERT_EQ(NO_ERROR, player->setSpeed(-1000));
+    ASSERT_EQ(NO_ERROR, player->start());
+    ASSERT_TRUE(eventually([&] { return frames->last().number < 60; }));
+    ASSERT_EQ(NO_ERROR, player->pause());
+    expectOwnTimes(kSixty, frames->take());
+}
+
+TEST_F(TimeTest, FramesAfterPausesAndSeeksHaveTheirOwnTimes) {
+    open(kSixty.file);
+    for (const int msec : {500, 3000, 1200, 2000}) {
+        ASSERT_EQ(NO_ERROR, seekTo(msec));
+        ASSERT_EQ(NO_ERROR, player->start());
+        ASSERT_TRUE(eventually([&] { return position() > msec + 300; }));
+        ASSERT_EQ(NO_ERROR, player->seekTo(msec, 0));
+        ASSERT_TRUE(eventually([&] { return position() > msec; }));
+        ASSERT_EQ(NO_ERROR, player->pause());
+    }
+    expectOwnTimes(kSixty, frames->take());
+}
+
+TEST_F(TimeTest, StepsCountFramesOfAVaryingRate) {
+    open(kVarying.file);
+    // Of ten frames the first, second, third, ninth and tenth are there.
+    ASSERT_TRUE(player->step(5));
+    expectAt(kVarying, 10);
+    ASSERT_TRUE(player->step(27));
+    expectAt(kVarying, 62);
+    ASSERT_TRUE(player->step(-28));
+    expectAt(kVarying, 9);
+}
+
+TEST_F(TimeTest, AStepAfterBackwardPlayIsDone) {
+    open(kSixty.file);
+    ASSERT_EQ(NO_ERROR, seekTo(3000));
+    ASSERT_EQ(NO_ERROR, player->start());
+    ASSERT_EQ(NO_ERROR, player->setSpeed(-1000));
+    ASSERT_TRUE(eventually([&] { return position() < 2700; }));
+    ASSERT_EQ(NO_ERROR, player->setSpeed(1000));
+    ASSERT_TRUE(player->step(1));
+    expectAt(kSixty, frames->last().number);
+    EXPECT_LT(position(), 2900);
+    EXPECT_GT(position(), 1000);
+}
+
+TEST_F(TimeTest, PlaybackBeginsAgainAtItsFirstFrame) {
+    open(kFilm.file);
+    ASSERT_EQ(NO_ERROR, player->setSpeed(4000));
+    playToEnd();
+    frames->take();
+    ASSERT_EQ(NO_ERROR, player->start());
+    ASSERT_TRUE(player->step(1));
+    expectAt(kFilm, frames->last().number);
+    EXPECT_LT(position(), 2000);
+}
+
+class PositionTest : public TimeTest, public testing::WithParamInterface<Counted> {};
+
+TEST_P(PositionTest, OfAnExactSeekIsItsFrames) {
+    const Counted& media = GetParam();
+    open(media.file);
+    for (const int number : {75, 15, 90, 1, 0}) {
+        const int msec = static_cast<int>(std::lround(millisecondsOf(media, number)));
+        ASSERT_EQ(NO_ERROR, seekTo(msec));
+        expectAt(media, number);
+    }
+}
+
+TEST_P(PositionTest, OfASteppedFrameIsItsOwn) {
+    const Counted& media = GetParam();
+    open(media.file);
+    int number = 0;
+    for (const int amount : {1, 3, 40, -2, -30, 60, -71}) {
+        ASSERT_TRUE(player->step(amount)) << amount;
+        number += amount;
+        expectAt(media, number);
+    }
+    EXPECT_FALSE(player->step(1000));
+    expectAt(media, media.last);
+    EXPECT_FALSE(player->step(-1000));
+    expectAt(media, 0);
+}
+
+TEST_P(PositionTest, StaysWhenTheDirectionTurns) {
+    const Counted& media = GetParam();
+    open(media.file);
+    const int number = 60;
+    ASSERT_EQ(NO_ERROR, seekTo(static_cast<int>(std::lround(millisecondsOf(media, number)))));
+    ASSERT_EQ(NO_ERROR, player->setSpeed(-1000));
+    ASSERT_TRUE(player->step(1)) << "frames are counted forward";
+    expectAt(media, number + 1);
+    ASSERT_EQ(NO_ERROR, player->setSpeed(1000));
+    expectAt(media, number + 1);
+    ASSERT_TRUE(player->step(-1));
+    expectAt(media, number);
+}
+
+INSTANTIATE_TEST_SUITE_P(Media, PositionTest, testing::Values(kSixty, kFilm, kTransport),
+                         [](const auto& info) {
+                             std::string name = info.param.file;
+                             for (char& letter : name) letter = isalnum(letter) ? letter : '_';
+                             return name;
+                         });
+
+}  // namespace
