@@ -39,7 +39,7 @@ bool sendAll(int connection, const char* data, size_t length) {
 
 }  // namespace
 
-HttpServer::HttpServer(const std::string& path) {
+HttpServer::HttpServer(const std::string& path, const HttpFaults& faults) : mFaults(faults) {
     std::ifstream file(path, std::ios::binary);
     mContent.assign(std::istreambuf_iterator<char>(file), {});
     mListener = socket(AF_INET, SOCK_STREAM, 0);
@@ -89,35 +89,108 @@ void HttpServer::serve() {
     }
 }
 
+void HttpServer::setFaults(const HttpFaults& faults) {
+    std::lock_guard<std::mutex> lock(mMutex);
+    mFaults = faults;
+}
+
+void HttpServer::addText(const std::string& name, const std::string& text) {
+    std::lock_guard<std::mutex> lock(mMutex);
+    mTexts[name] = text;
+}
+
+void HttpServer::setStatus(int status) {
+    std::lock_guard<std::mutex> lock(mMutex);
+    mFaults.status = status;
+}
+
+void HttpServer::breakAt(int64_t position) {
+    std::lock_guard<std::mutex> lock(mMutex);
+    mFaults.breakAt = position;
+}
+
+void HttpServer::setSilent(bool silent) {
+    std::lock_guard<std::mutex> lock(mMutex);
+    mFaults.stallAt = silent ? -1 : INT64_MAX;
+}
+
+// The text of the name that the request is for, or the file.
+std::string HttpServer::contentOf(const std::string& request) const {
+    std::lock_guard<std::mutex> lock(mMutex);
+    const size_t begin = request.find('/') + 1;
+    const auto text = mTexts.find(request.substr(begin, request.find(' ', begin) - begin));
+    return text != mTexts.end() ? text->second : mContent;
+}
+
 void HttpServer::answer(int connection) {
     const std::string request = readRequest(connection);
+    HttpFaults faults;
     {
         std::lock_guard<std::mutex> lock(mMutex);
         mRequests.push_back(request);
+        faults = mFaults;
+        if (mRequests.size() > static_cast<size_t>(faults.expireAfter)) faults.status = 403;
     }
-    if (mSilent) return;
-    const size_t range = request.find("Range: bytes=");
-    const int64_t first = range == std::string::npos ? 0 : atoll(request.c_str() + range + 13);
-    if (mStatus == 200 && first < mBreakAt) {
-        sendRange(connection, first);
-    } else if (mStatus != 200) {
-        const std::string head =
-            "HTTP/1.1 " + std::to_string(mStatus) + " No\r\nContent-Length: 0\r\n\r\n";
-        sendAll(connection, head.data(), head.size());
-    }
-    shutdown(connection, SHUT_RDWR);
+    if (faults.stallAt < 0) return;
+    if (!faults.shuts) answer(connection, request, faults);
+    // A connection that has fallen silent stays open.
+    if (faults.stallAt == INT64_MAX) shutdown(connection, SHUT_RDWR);
 }
 
-void HttpServer::sendRange(int connection, int64_t first) {
-    const auto size = static_cast<int64_t>(mContent.size());
-    first = std::min(first, size);
-    const std::string head =
-        "HTTP/1.1 206 Partial Content\r\nAccept-Ranges: bytes\r\nContent-Range: bytes " +
-        std::to_string(first) + "-" + std::to_string(size - 1) + "/" + std::to_string(size) +
-        "\r\nContent-Length: " + std::to_string(size - first) + "\r\n\r\n";
+void HttpServer::answer(int connection, const std::string& request, const HttpFaults& faults) {
+    const bool lacksHeader = request.find(faults.wantsHeader) == std::string::npos;
+    const bool lacksCookie =
+        faults.wantsCookie && request.find("Cookie: ticket=1") == std::string::npos;
+    const bool first = request.find("/again") == std::string::npos;
+    std::string head;
+    if (faults.status != 200 || lacksHeader || (lacksCookie && !first)) {
+        head = std::to_string(faults.status != 200 ? faults.status : 403) + " No";
+    } else if (faults.onlyTexts && contentOf(request) == mContent) {
+        head = "404 No";
+    } else if (!faults.redirect.empty()) {
+        head = "302 Found\r\nLocation: " + faults.redirect;
+    } else if (lacksCookie) {
+        head = "302 Found\r\nSet-Cookie: ticket=1; path=/\r\nLocation: " + url("again");
+    } else {
+        return sendFile(connection, request, faults);
+    }
+    head = "HTTP/1.1 " + head + "\r\nContent-Length: 0\r\n\r\n";
+    sendAll(connection, head.data(), head.size());
+}
+
+void HttpServer::sendFile(int connection, const std::string& request, const HttpFaults& faults) {
+    const std::string content = contentOf(request);
+    const size_t range = request.find("Range: bytes=");
+    const bool hasRange = faults.ranges && range != std::string::npos;
+    const auto asked = hasRange ? atoll(request.c_str() + range + 13) : 0;
+    const int64_t size = static_cast<int64_t>(content.size()) + faults.extraLength;
+    if (asked >= faults.breakAt) return;
+    std::string head = "HTTP/1.1 200 OK\r\n";
+    if (hasRange) {
+        head = "HTTP/1.1 206 Partial Content\r\nContent-Range: bytes " + std::to_string(asked) +
+               "-" + std::to_string(size - 1) + "/" + std::to_string(size) + "\r\n";
+    }
+    if (faults.ranges) head += "Accept-Ranges: bytes\r\n";
+    if (faults.tellsLength) head += "Content-Length: " + std::to_string(size - asked) + "\r\n";
+    head += "Connection: close\r\n\r\n";
     if (!sendAll(connection, head.data(), head.size())) return;
-    const int64_t end = std::min<int64_t>(size, mBreakAt);
-    sendAll(connection, mContent.data() + first, static_cast<size_t>(end - first));
+    sendBody(connection, content, static_cast<size_t>(asked), faults);
+}
+
+void HttpServer::sendBody(int connection, const std::string& body, size_t first,
+                          const HttpFaults& faults) {
+    constexpr int kDripsPerSecond = 20;
+    const auto end = static_cast<size_t>(
+        std::min({static_cast<int64_t>(body.size()), faults.breakAt, faults.stallAt}));
+    const size_t drip = faults.bytesPerSecond > 0
+                            ? static_cast<size_t>(faults.bytesPerSecond / kDripsPerSecond)
+                            : body.size();
+    while (first < end && !mQuit) {
+        const size_t count = std::min(drip, end - first);
+        if (!sendAll(connection, body.data() + first, count)) return;
+        first += count;
+        if (faults.bytesPerSecond > 0) usleep(1000000 / kDripsPerSecond);
+    }
 }
 
 }  // namespace orvtest

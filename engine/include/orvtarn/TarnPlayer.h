@@ -49,7 +49,8 @@ public:
 
     // A path or URL; headers may be null. Of a playlist the first entry is the
     // media. Checks what can be checked without opening: NAME_NOT_FOUND,
-    // PERMISSION_DENIED, BAD_VALUE (a directory or an empty name).
+    // PERMISSION_DENIED, BAD_VALUE (a directory or an empty name),
+    // ORV_ERROR_SCHEME.
     // INVALID_OPERATION when a source is set already.
     status_t setDataSource(const char* url, const KeyedVector<String8, String8>* headers);
     // The source is not deleted by the player. It must live until the next
@@ -66,8 +67,8 @@ public:
     // Any time; null for none. No frame goes to the earlier surface afterwards,
     // and the new one gets the picture of now, paused or not.
     status_t setVideoSurfaceTexture(const sp<IGraphicBufferProducer>& bufferProducer) override;
-    // Blocks until the media is ready, or ends with the cause: ORV_ERROR_IO,
-    // ORV_ERROR_MALFORMED, ORV_ERROR_UNSUPPORTED or TIMED_OUT (30 seconds).
+    // Blocks until the media is ready, or ends with the cause: one of the
+    // statuses of orvtarn/PlayerTypes.h or TIMED_OUT (30 seconds).
     // Ready means that the first frame is on the surface.
     status_t prepare() override;
     status_t prepareAsync() override;
@@ -179,9 +180,10 @@ public:
     bool deselectTrack(int index);
     // Files in SubRip, ASS and other formats, as further tracks behind the
     // media's own. The first leaves its tracks off, the others turn their first
-    // one on. Blocks until the file is opened; false for what is no such file.
-    // Before prepare only the name is checked: the file is opened with the media,
-    // which go without one that is none. Files stay until reset: each prepare
+    // one on. Blocks until the file is opened, for one of a server for ten seconds
+    // at most; false for what is no such file. Before prepare only the name is
+    // checked: the file is opened with the media, which go without one that is
+    // none and do not wait for a server. Files stay until reset: each prepare
     // opens all of them, in their order, and the last that was turned on is on.
     bool addTimedTextSource(const char* path);
     bool setSubtitleDataSource(const char* url);

@@ -13,7 +13,7 @@
 #include "base/EngineLog.h"
 #include "base/ThreadName.h"
 #include "core/MpvError.h"
-#include "source/ServerProbe.h"
+#include "source/UrlScheme.h"
 
 namespace orvtarn {
 namespace {
@@ -54,6 +54,9 @@ bool flagOf(const mpv_event_property& property) {
 
 int64_t toMicroseconds(double seconds) { return llround(std::max(seconds, 0.0) * 1e6); }
 
+// Tracks of one file may end at different times. Seconds.
+constexpr double kEndSlack = 1.5;
+
 // Places in mpv's load at which it waits.
 constexpr char kBeforeOpening[] = "on_load";
 constexpr char kOpened[] = "on_preloaded";
@@ -70,7 +73,7 @@ bool EventLoop::start() {
         const int error = mpv_hook_add(mMpv.get(), 0, hook, 0);
         if (error < 0) return refused("observe", mpv_error_string(error));
     }
-    mpv_request_log_messages(mMpv.get(), "error");
+    mpv_request_log_messages(mMpv.get(), "warn");
     mThread = std::thread(&EventLoop::run, this);
     return true;
 }
@@ -80,6 +83,7 @@ void EventLoop::stop() {
     mQuit = true;
     mpv_wakeup(mMpv.get());
     mThread.join();
+    mCause.stop();
 }
 
 void EventLoop::setSource(std::shared_ptr<MediaSource> source) {
@@ -89,12 +93,17 @@ void EventLoop::setSource(std::shared_ptr<MediaSource> source) {
 
 void EventLoop::run() {
     nameThisThread("orv-events");
+    bool isEmpty = true;  // no event waits
     while (!mQuit) {
-        // A frame's time may be among the reports that wait.
-        const mpv_event& event = *mpv_wait_event(mMpv.get(), mUntimedFrame == 0 ? -1 : 0);
+        const mpv_event& event = *mpv_wait_event(mMpv.get(), isEmpty ? -1 : 0);
         handle(event);
-        if (mLooksForEnd.exchange(false)) onEndReached();
-        if (event.event_id == MPV_EVENT_NONE) answerFrameTime();
+        if (mLooksForEnd.exchange(false)) mEndReached = true;
+        // A frame's time may be among the reports that wait, and mpv hands out its
+        // log after everything else.
+        isEmpty = event.event_id == MPV_EVENT_NONE;
+        if (!isEmpty) continue;
+        if (mEndReached || mLoadFailed) settleEnd();
+        answerFrameTime();
     }
 }
 
@@ -143,6 +152,8 @@ void EventLoop::lookForEnd() {
 void EventLoop::handle(const mpv_event& event) {
     switch (event.event_id) {
         case MPV_EVENT_START_FILE:
+            if (mLoadFailed) settleEnd();
+            mTrouble.forget();
             mState.update([](PlayerState::Values& v) { v.fileStarted = true; });
             break;
         case MPV_EVENT_END_FILE:
@@ -167,23 +178,45 @@ void EventLoop::handle(const mpv_event& event) {
         case MPV_EVENT_PROPERTY_CHANGE:
             onProperty(*static_cast<const mpv_event_property*>(event.data));
             break;
-        case MPV_EVENT_LOG_MESSAGE: {
-            const auto* message = static_cast<const mpv_event_log_message*>(event.data);
-            const std::string text(message->text, strcspn(message->text, "\n"));
-            ALOGW("%s: %s", message->prefix, text.c_str());
+        case MPV_EVENT_LOG_MESSAGE:
+            onLogMessage(*static_cast<const mpv_event_log_message*>(event.data));
             break;
-        }
         default:
             break;
     }
 }
 
 void EventLoop::onHook(const mpv_event_hook& hook) {
-    // Of a playlist, the first entry is the media: mpv would go on to the
-    // others, and even when the first fails.
-    if (strcmp(hook.name, kBeforeOpening) == 0) mMpv.command({"playlist-clear"});
+    if (strcmp(hook.name, kBeforeOpening) == 0) onBeforeOpening();
+    if (strcmp(hook.name, kOpened) == 0) {
+        mHasTracks = mMpv.getInt("track-list/count").value_or(0) > 0;
+    }
     if (strcmp(hook.name, kOpened) == 0 && mOpenedHandler) mOpenedHandler();
     mpv_hook_continue(mMpv.get(), hook.id);
+}
+
+void EventLoop::onBeforeOpening() {
+    // Of a playlist, the first entry is the media: mpv would go on to the
+    // others, and even when the first fails.
+    mMpv.command({"playlist-clear"});
+    mHasTracks = false;
+    mOpening = mMpv.getString("stream-open-filename").value_or("");
+    const std::shared_ptr<MediaSource> media = source();
+    if (media == nullptr) return;
+    const android::status_t status = checkReference(*media, mOpening);
+    if (status == android::NO_ERROR) return;
+    failWith(status);
+    mMpv.command({"stop"});
+}
+
+void EventLoop::onLogMessage(const mpv_event_log_message& message) {
+    const std::string text(message.text, strcspn(message.text, "\n"));
+    mTrouble.note(text);
+    if (message.log_level <= MPV_LOG_LEVEL_ERROR) {
+        ALOGW("%s: %s", message.prefix, text.c_str());
+    } else {
+        ALOGI("%s: %s", message.prefix, text.c_str());
+    }
 }
 
 // Formats without an index find key frames by guessing, sometimes behind the
@@ -198,12 +231,40 @@ void EventLoop::onLoaded() {
 void EventLoop::onEndFile(const mpv_event_end_file& end) {
     const bool isPlaylist = end.reason == MPV_END_FILE_REASON_REDIRECT;
     if (isPlaylist && end.playlist_insert_num_entries > 0) return;
-    if (end.reason == MPV_END_FILE_REASON_ERROR) {
-        failWith(sourceFailed() ? ORV_ERROR_IO : statusOfMpvError(end.error));
-    } else if (isPlaylist || end.reason == MPV_END_FILE_REASON_EOF) {
-        failWith(sourceFailed() ? ORV_ERROR_IO : ORV_ERROR_MALFORMED);
+    const bool isError = end.reason == MPV_END_FILE_REASON_ERROR;
+    const bool isEnd = isPlaylist || end.reason == MPV_END_FILE_REASON_EOF;
+    if (isError || isEnd) mLoadFailed = isError ? statusOfMpvError(end.error) : ORV_ERROR_MALFORMED;
+    mFailedSession = mState.update([](PlayerState::Values& v) {
+        v.fileOpen = false;
+        return v.session;
+    });
+}
+
+// All that mpv has logged about an end is known.
+void EventLoop::settleEnd() {
+    if (mLoadFailed) onLoadFailed(*mLoadFailed);
+    if (mEndReached && !mLoadFailed) onEndReached();
+    mLoadFailed.reset();
+    mEndReached = false;
+}
+
+void EventLoop::onLoadFailed(android::status_t status) {
+    if (sourceFailed()) return failIn(mFailedSession, ORV_ERROR_IO);
+    // What they were opened with was known; what is inside was not.
+    if (status == ORV_ERROR_UNSUPPORTED && !mHasTracks) status = ORV_ERROR_MALFORMED;
+    if (!FailureCause::isVague(status)) return failIn(mFailedSession, status);
+    if (mTrouble.status() != android::NO_ERROR && mTrouble.status() != ORV_ERROR_CONNECTION_LOST) {
+        return failIn(mFailedSession, mTrouble.status());
     }
-    mState.update([](PlayerState::Values& v) { v.fileOpen = false; });
+    findCause(status);
+}
+
+void EventLoop::findCause(android::status_t status) {
+    const std::shared_ptr<MediaSource> media = source();
+    const uint64_t session = mFailedSession;
+    if (media == nullptr) return failIn(session, status);
+    mCause.find(media, mOpening, status,
+                [this, session](android::status_t cause) { failIn(session, cause); });
 }
 
 void EventLoop::onRestart() {
@@ -211,7 +272,8 @@ void EventLoop::onRestart() {
     // A track of which nothing can be decoded has no size.
     const bool hasVideo =
         mMpv.getInt("vid").value_or(0) > 0 && mMpv.getInt("dwidth").value_or(0) > 0;
-    const bool hasSound = mMpv.getInt("aid").value_or(0) > 0;
+    const bool hasSound =
+        mMpv.getInt("aid").value_or(0) > 0 && mMpv.getInt("audio-params/samplerate").has_value();
     const double duration = durationOf(mMpv.getDouble("duration").value_or(0));
     const bool seekable = mMpv.getFlag("seekable").value_or(false);
     const bool again = drawsAnew();
@@ -225,7 +287,11 @@ void EventLoop::onRestart() {
         return true;
     });
     if (!opened) return endUnattendedSeek();
-    if (!hasVideo && !hasSound) return failWith(ORV_ERROR_MALFORMED);
+    if (!hasVideo && !hasSound) {
+        mFailedSession = mState.read([](const PlayerState::Values& v) { return v.session; });
+        mLoadFailed = ORV_ERROR_MALFORMED;
+        return;
+    }
     applyLooping();
     becomePreparedIfReady();
 }
@@ -294,7 +360,8 @@ void EventLoop::onProperty(const mpv_event_property& property) {
                 return mState.update([&](PlayerState::Values& v) { v.duration = duration; });
             }
             case kEndReached:
-                return flagOf(property) ? onEndReached() : void();
+                mEndReached = flagOf(property);
+                return;
             case kSeekable:
                 mState.update([&](PlayerState::Values& v) { v.seekable = flagOf(property); });
                 return applyLooping();
@@ -344,7 +411,7 @@ void EventLoop::onEndReached() {
     if (!mMpv.getFlag("eof-reached").value_or(false)) return;
     if (brokeOff()) {
         mMpv.set("pause", true);
-        return failWith(ORV_ERROR_IO);
+        return failWith(causeOfBreak());
     }
     // A seek may pass the end on its way; it has the end looked for when done.
     if (mState.read([](const PlayerState::Values& v) { return v.seeking; })) return;
@@ -366,7 +433,13 @@ void EventLoop::onVideoSize() {
 }
 
 void EventLoop::failWith(android::status_t status) {
-    const bool news = mState.update([&](PlayerState::Values& v) { return v.fail(status); });
+    failIn(mState.read([](const PlayerState::Values& v) { return v.session; }), status);
+}
+
+// Any thread. A load that was overtaken meanwhile fails nothing.
+void EventLoop::failIn(uint64_t session, android::status_t status) {
+    const bool news = mState.update(
+        [&](PlayerState::Values& v) { return v.session == session && v.fail(status); });
     if (!news) return;
     ALOGE("playback: ended by an error (status %d)", status);
     mNotifier.post(android::MEDIA_ERROR, android::MEDIA_ERROR_UNKNOWN, status);
@@ -390,14 +463,33 @@ bool EventLoop::sourceFailed() {
     return media != nullptr && media->readFailed();
 }
 
-// Whether the media came to an end before their bytes did, because nobody
-// gives those any more.
+// Whether the media came to an end because nobody gives their bytes any more.
 bool EventLoop::brokeOff() {
     const std::shared_ptr<MediaSource> media = source();
     if (media == nullptr) return false;
     if (media->isOfBytes()) return media->readFailed();
-    const int64_t position = mMpv.getInt("stream-pos").value_or(0);
-    return !media->isLocal() && position < mFileSize && !isServed(*media, position, mFileSize);
+    if (schemeOf(mOpening).empty() || !endsEarly()) return false;
+    if (mTrouble.status() != android::NO_ERROR) return true;
+    // Of a connection that cannot be taken up again, nothing is logged. Those
+    // that can be may end before their last byte: an index may follow the media.
+    const bool seekable = mState.read([](const PlayerState::Values& v) { return v.seekable; });
+    const int64_t position = mMpv.getInt("stream-pos").value_or(mFileSize);
+    return !seekable && (mFileSize <= 0 || position < mFileSize);
+}
+
+android::status_t EventLoop::causeOfBreak() {
+    if (sourceFailed()) return ORV_ERROR_IO;
+    return mTrouble.status() != android::NO_ERROR ? mTrouble.status() : ORV_ERROR_CONNECTION_LOST;
+}
+
+// The shown time is clearly before the end that the media name.
+bool EventLoop::endsEarly() {
+    if (mMpv.getString("play-dir").value_or("") == "backward") return false;
+    const PlayerState::Values now = mState.read([](const PlayerState::Values& v) { return v; });
+    const double position = mMpv.getDouble("time-pos").value_or(now.position);
+    // A stream without a length ends when its connection does.
+    if (now.duration <= 0) return mFileSize > 0;
+    return position < now.duration - kEndSlack;
 }
 
 }  // namespace orvtarn

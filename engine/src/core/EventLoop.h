@@ -9,13 +9,16 @@
 #include <memory>
 #include <mutex>
 #include <optional>
+#include <string>
 #include <thread>
 
 #include "core/FrameClock.h"
 #include "core/MpvHandle.h"
 #include "core/Notifier.h"
 #include "core/PlayerState.h"
+#include "core/ReadTrouble.h"
 #include "core/VideoOutput.h"
+#include "source/FailureCause.h"
 #include "source/MediaSource.h"
 
 namespace orvtarn {
@@ -65,7 +68,12 @@ private:
     void handle(const mpv_event& event);
     void onHook(const mpv_event_hook& hook);
     void onLoaded();
+    void onBeforeOpening();
+    void onLogMessage(const mpv_event_log_message& message);
     void onEndFile(const mpv_event_end_file& end);
+    void settleEnd();
+    void onLoadFailed(android::status_t status);
+    void findCause(android::status_t status);
     void onRestart();
     bool drawsAnew();
     void endUnattendedSeek();
@@ -80,9 +88,12 @@ private:
     void setFrameTime(uint64_t frame, double seconds);
     void onSeek();
     void failWith(android::status_t status);
+    void failIn(uint64_t session, android::status_t status);
     std::shared_ptr<MediaSource> source();
     double durationOf(double byMpv);
     bool brokeOff();
+    bool endsEarly();
+    android::status_t causeOfBreak();
     bool sourceFailed();
 
     MpvHandle& mMpv;
@@ -93,6 +104,14 @@ private:
     std::function<void()> mOpenedHandler;
     std::function<bool()> mPictureHandler;
     int64_t mFileSize = 0;  // bytes, 0 when unknown
+    bool mHasTracks = false;
+    std::string mOpening;  // the name that mpv opens
+    ReadTrouble mTrouble;
+    FailureCause mCause;
+    // An end that waits for the log lines about its cause.
+    bool mEndReached = false;
+    std::optional<android::status_t> mLoadFailed;
+    uint64_t mFailedSession = 0;
     std::mutex mSourceMutex;
     std::shared_ptr<MediaSource> mSource;
     std::atomic<bool> mLooksForEnd{false};

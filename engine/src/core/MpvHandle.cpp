@@ -6,9 +6,12 @@
 #include <string.h>
 
 #include <mutex>
+#include <string>
 
 #include "base/EngineLog.h"
 #include "base/LibraryVersions.h"
+#include "source/TlsSettings.h"
+#include "source/UrlScheme.h"
 
 namespace orvtarn {
 namespace {
@@ -52,8 +55,8 @@ const Option kWished[] = {
     // Brings back the line on screen when a subtitle track is turned on.
     {"demuxer-mkv-subtitle-preroll-secs-index", "60"},
     {"network-timeout", "20"},
-    // A connection that broke is taken up again, four times in seven seconds.
-    {"stream-lavf-o", "reconnect=1,reconnect_delay_max=4"},
+    {"ordered-chapters", "no"},
+    {"load-unsafe-playlists", "no"},
 };
 
 int setOption(mpv_handle* mpv, const char* name, const char* value) {
@@ -75,6 +78,16 @@ void setWished(mpv_handle* mpv, const Option& option) {
     const int error = setOption(mpv, option.name, option.value);
     if (error == 0) return;
     ALOGW("create: mpv refuses %s=%s: %s", option.name, option.value, mpv_error_string(error));
+}
+
+// A connection that broke is taken up again, four times in seven seconds.
+void setNetwork(mpv_handle* mpv) {
+    const std::string protocols = protocolWhitelist(false);
+    const std::string streams =
+        "reconnect=1,reconnect_delay_max=4,protocol_whitelist=[" + protocols + "]";
+    setWished(mpv, {"stream-lavf-o", streams.c_str()});
+    setWished(mpv, {"tls-verify", verifiesCertificates() ? "yes" : "no"});
+    setWished(mpv, {"tls-ca-file", certificateFile().c_str()});
 }
 
 // "null" keeps time where no device is: without it, media without video fail
@@ -114,6 +127,7 @@ bool MpvHandle::setOptions(bool hardwareDecoder) {
     for (const Option& option : kWished) setWished(mHandle, option);
     setWished(mHandle, {"hwdec", hardwareDecoder ? "auto-copy-safe" : "no"});
     setWished(mHandle, {"ao", audioOutputs()});
+    setNetwork(mHandle);
     return true;
 }
 

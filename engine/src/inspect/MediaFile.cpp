@@ -7,6 +7,8 @@
 #include <new>
 
 #include "source/FileName.h"
+#include "source/TlsSettings.h"
+#include "source/UrlScheme.h"
 
 extern "C" {
 #include <libavformat/avformat.h>
@@ -118,13 +120,41 @@ status_t MediaFile::openInput(const char* url) {
     if (mContext == nullptr) return NO_MEMORY;
     mContext->pb = mSourceContext;
     mContext->interrupt_callback = {isInterruptedCallback, this};
+    mContext->opaque = this;
+    mOpenNested = mContext->io_open;
+    mContext->io_open = openNested;
     AVDictionary* options = nullptr;
-    if (!mHeaders.empty()) av_dict_set(&options, "headers", mHeaders.c_str(), 0);
+    std::string path;
+    const bool isFile = mSource == nullptr && filePath(url, path);
+    av_dict_set(&options, "protocol_whitelist", protocolWhitelist(isFile), 0);
+    addNetworkOptions(&options);
     int error = avformat_open_input(&mContext, url, nullptr, &options);
     av_dict_free(&options);
     if (error >= 0) error = avformat_find_stream_info(mContext, nullptr);
     if (isInterrupted()) return ORV_ERROR_IO;
     return error < 0 ? statusOf(error) : OK;
+}
+
+// Those that libavformat has no names for are left in it.
+void MediaFile::addNetworkOptions(AVDictionary** options) const {
+    const std::string certificates = certificateFile();
+    av_dict_set(options, "tls_verify", verifiesCertificates() ? "1" : "0", 0);
+    if (!certificates.empty()) av_dict_set(options, "ca_file", certificates.c_str(), 0);
+    // Unless the headers have one; as playback has it.
+    av_dict_set(options, "user_agent", "orvtarn", 0);
+    if (!mHeaders.empty()) av_dict_set(options, "headers", mHeaders.c_str(), 0);
+}
+
+// A manifest's segments are opened as the manifest is.
+int MediaFile::openNested(AVFormatContext* context, AVIOContext** io, const char* url, int flags,
+                          AVDictionary** options) {
+    const auto* file = static_cast<const MediaFile*>(context->opaque);
+    AVDictionary* own = nullptr;
+    if (options != nullptr) av_dict_copy(&own, *options, 0);
+    file->addNetworkOptions(&own);
+    const int error = file->mOpenNested(context, io, url, flags, &own);
+    av_dict_free(&own);
+    return error;
 }
 
 const AVStream* MediaFile::stream(int index) const {

@@ -14,6 +14,7 @@
 #include "source/ByteSource.h"
 #include "source/RequestHeaders.h"
 
+struct AVDictionary;
 struct AVFormatContext;
 struct AVIOContext;
 struct AVStream;
@@ -66,6 +67,9 @@ private:
     explicit MediaFile(const MediaOpenOptions& options);
     android::status_t attachSource(std::unique_ptr<ByteSource> source);
     android::status_t openInput(const char* url);
+    void addNetworkOptions(AVDictionary** options) const;
+    static int openNested(AVFormatContext* context, AVIOContext** io, const char* url, int flags,
+                          AVDictionary** options);
 
     const std::atomic<bool>* mCancel;
     std::chrono::milliseconds mTimeLimit;
@@ -74,6 +78,7 @@ private:
     std::unique_ptr<ByteSource> mSource;
     AVIOContext* mSourceContext = nullptr;
     AVFormatContext* mContext = nullptr;
+    decltype(&MediaFile::openNested) mOpenNested = nullptr;  // libavformat's own
 };
 
 }  // namespace orvtarn

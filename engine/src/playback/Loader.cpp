@@ -17,6 +17,7 @@
 #include "core/MpvError.h"
 #include "core/MpvLoad.h"
 #include "source/StreamMediaSource.h"
+#include "source/UrlScheme.h"
 
 namespace orvtarn {
 namespace {
@@ -182,6 +183,7 @@ android::status_t Loader::load() {
     const std::shared_ptr<MediaSource> media = source();
     media->setReadFailed(false);
     setHeaders();
+    setReach(*media);
     secondReading()->tryAgain();
     if (mBeforeLoad) mBeforeLoad();
     MpvOptions options;
@@ -213,6 +215,14 @@ void Loader::setHeaders() {
     }
     mMpv.set("user-agent", userAgent);
     mMpv.set("http-header-fields", fields);
+}
+
+// What the media may open beyond themselves.
+void Loader::setReach(const MediaSource& media) {
+    const bool isFile = media.isLocal() && !media.isOfBytes();
+    mMpv.set("access-references", media.mayReference());
+    mMpv.set("demuxer-lavf-o",
+             "protocol_whitelist=[" + std::string(protocolWhitelist(isFile)) + "]");
 }
 
 android::status_t Loader::awaitPrepared(uint64_t session) {

@@ -69,6 +69,7 @@ private:
     android::status_t beginPrepare(const char* operation, uint64_t& session);
     android::status_t load();
     void setHeaders();
+    void setReach(const MediaSource& media);
     android::status_t awaitPrepared(uint64_t session);
     android::status_t giveUp(uint64_t session);
     void overtake(Phase phase);

@@ -1,12 +1,11 @@
 // SPDX-License-Identifier: Apache-2.0
 #include "source/FileName.h"
 
-#include <ctype.h>
-#include <string.h>
 #include <strings.h>
 
-#include <algorithm>
 #include <cstddef>
+
+#include "source/UrlScheme.h"
 
 namespace orvtarn {
 namespace {
@@ -31,19 +30,12 @@ std::string percentDecoded(const std::string& text) {
     return decoded;
 }
 
-bool hasScheme(const std::string& url) {
-    const size_t end = url.find("://");
-    const auto isSchemeCharacter = [](unsigned char c) { return isalnum(c) || strchr("+-.", c); };
-    return end != std::string::npos && end > 0 &&
-           std::all_of(url.begin(), url.begin() + static_cast<ptrdiff_t>(end), isSchemeCharacter);
-}
-
 }  // namespace
 
 bool filePath(const std::string& name, std::string& path) {
     constexpr size_t kScheme = sizeof("file:") - 1;
     path = name;
-    if (strncasecmp(name.c_str(), "file:/", kScheme + 1) != 0) return !hasScheme(name);
+    if (strncasecmp(name.c_str(), "file:/", kScheme + 1) != 0) return schemeOf(name).empty();
     path = percentDecoded(name.substr(kScheme));
     if (path.compare(0, 2, "//") != 0) return true;
     // The only host whose files these can be.

@@ -3,12 +3,15 @@
 
 #include <errno.h>
 #include <limits.h>
+#include <orvtarn/PlayerTypes.h>
 #include <stdlib.h>
 #include <sys/stat.h>
 #include <unistd.h>
 #include <utils/Errors.h>
 
 #include "source/FileName.h"
+#include "source/Playlist.h"
+#include "source/UrlScheme.h"
 
 namespace orvtarn {
 namespace {
@@ -85,11 +88,14 @@ bool UrlMediaSource::canOpenTwice() const {
            (S_ISREG(status.st_mode) || S_ISBLK(status.st_mode));
 }
 
+bool UrlMediaSource::mayReference() const { return !isLocal() || isPlaylist(mName); }
+
 int resolveName(const char* url, std::string& name) {
     if (url == nullptr || *url == '\0') return android::BAD_VALUE;
     std::string path;
     if (!filePath(url, path)) {
         name = url;
+        if (!isOpenedScheme(schemeOf(name))) return ORV_ERROR_SCHEME;
         return android::NO_ERROR;
     }
     char resolved[PATH_MAX];

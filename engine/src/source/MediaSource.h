@@ -33,6 +33,9 @@ public:
     // Whether the name may be opened once more beside playback. What a second
     // reader of a pipe gets, playback lacks.
     virtual bool canOpenTwice() const { return true; }
+    // Whether the media may name others that are opened with them: a playlist's
+    // entries, a manifest's segments. Beside other files nothing is opened.
+    virtual bool mayReference() const { return false; }
     // A reader with a position of its own; null when the source is closed,
     // cannot be read twice, or is not of bytes.
     virtual std::unique_ptr<ByteSource> openReader() { return nullptr; }
@@ -91,6 +94,7 @@ public:
     RequestHeaders headers() const override { return mHeaders; }
     bool isLocal() const override { return mName[0] == '/'; }
     bool canOpenTwice() const override;
+    bool mayReference() const override;
 
 private:
     const std::string mName;

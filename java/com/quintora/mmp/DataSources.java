@@ -23,7 +23,8 @@ abstract sealed class DataSources extends PlayerCore permits Playback {
      *
      * @param pathOrUrl a file's path, or a URL such as {@code http://host/film.mp4}
      * @throws IllegalArgumentException when it is null
-     * @throws MediaException when it is a file that is not there, or a directory
+     * @throws MediaException when it is a file that is not there, a directory, or a URL of a
+     *     scheme that is not opened
      * @throws SecurityException when the file must not be read
      * @throws IllegalStateException in another state
      */

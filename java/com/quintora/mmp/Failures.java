@@ -1,10 +1,11 @@
 // SPDX-License-Identifier: Apache-2.0
 package com.quintora.mmp;
 
-import java.io.IOException;
 import java.nio.file.Files;
 import java.nio.file.InvalidPathException;
 import java.nio.file.Path;
+import java.util.List;
+import java.util.Optional;
 import java.util.regex.Matcher;
 import java.util.regex.Pattern;
 
@@ -14,6 +15,14 @@ final class Failures {
     private static final Pattern STATUS = Pattern.compile("status=0x([0-9A-F]{1,8})$");
 
     private static final String FILE_URL = "file://";
+
+    // In the order of the engine's numbers.
+    private static final List<String> FORMATS = List.of(
+            "a file of a known format", "an MP4 file", "a Matroska file", "an AVI file",
+            "an MPEG transport stream", "an MPEG program stream", "an FLV file", "an ASF file",
+            "an Ogg file", "a WAV file", "a FLAC file", "an MP3 file", "an AAC file",
+            "an AIFF file");
+    private static final int MAX_FORMAT = 99;
 
     private Failures() {}
 
@@ -61,12 +70,25 @@ final class Failures {
             case MediaException.STATUS_NOT_FOUND -> "no such file";
             case MediaException.STATUS_BAD_VALUE -> badValue(source);
             case MediaException.STATUS_IO -> unreadable(source);
-            case MediaException.STATUS_MALFORMED -> malformed(source);
+            case MediaException.STATUS_MALFORMED -> "unknown format";
             case MediaException.STATUS_UNSUPPORTED -> "has no track that can be played";
+            case MediaException.STATUS_EMPTY -> "is empty";
             case MediaException.STATUS_TIMED_OUT -> "was not ready in time";
             case MediaException.STATUS_UNKNOWN -> "the engine failed";
-            default -> "the engine failed with status " + status;
+            default -> ServerFailures.sentence(source, status)
+                    .or(() -> nothingInside(status))
+                    .orElse("the engine failed with status " + status);
         };
+    }
+
+    private static Optional<String> nothingInside(int status) {
+        int format = MediaException.STATUS_NOTHING_INSIDE - status;
+        if (format < 0 || format > MAX_FORMAT) {
+            return Optional.empty();
+        }
+        String name = format < FORMATS.size() ? FORMATS.get(format) : FORMATS.get(0);
+        return Optional.of("is " + name
+                + " in which nothing can be played: it is empty, cut short or damaged");
     }
 
     private static String badValue(String source) {
@@ -81,24 +103,9 @@ final class Failures {
 
     private static String unreadable(String source) {
         Path path = localPath(source);
-        if (path == null && isUrl(source)) {
-            return "the server refused the connection, does not answer or has no such media";
-        }
         return path != null && isUrl(source) && Files.notExists(path)
                 ? "no such file"
                 : "cannot be opened or read";
-    }
-
-    private static String malformed(String source) {
-        Path path = localPath(source);
-        try {
-            if (path != null && Files.isRegularFile(path) && Files.size(path) == 0) {
-                return "the file is empty";
-            }
-        } catch (IOException e) {
-            return "cannot be read";
-        }
-        return "is no media format that is known";
     }
 
     static boolean isUrl(String source) {
