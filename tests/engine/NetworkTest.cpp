@@ -435,4 +435,30 @@ TEST_F(NetworkTest, PlaylistsAndManifestsOfServersPlay) {
     }
 }
 
+TEST_F(NetworkTest, SubtitlesThatHangHoldNothingUp) {
+    HttpFaults silent;
+    silent.stallAt = -1;
+    HttpServer hanging(mediaPath("lines.srt"), silent);
+    HttpServer served(mediaPath("lines.srt"));
+    ASSERT_EQ(NO_ERROR, player->setDataSource(mediaPath("silent.mp4").c_str(), nullptr));
+    ASSERT_TRUE(player->setSubtitleDataSource(served.url("good.srt").c_str()));
+    ASSERT_TRUE(player->setSubtitleDataSource(hanging.url("one.srt").c_str()));
+    ASSERT_TRUE(player->setSubtitleDataSource(hanging.url("two.srt").c_str()));
+    ASSERT_EQ(NO_ERROR, player->prepare());
+    EXPECT_TRUE(eventually([&] { return !hanging.requests().empty(); }));
+    EXPECT_EQ(NO_ERROR, endOf());
+    int count = 0;
+    EXPECT_TRUE(player->getSubtitleTrackCount(count));
+    EXPECT_EQ(1, count) << "that which came";
+}
+
+TEST_F(NetworkTest, SubtitlesThatHangAreGivenUp) {
+    HttpFaults silent;
+    silent.stallAt = -1;
+    HttpServer hanging(mediaPath("lines.srt"), silent);
+    open("plain.mp4");
+    EXPECT_FALSE(player->setSubtitleDataSource(hanging.url("one.srt").c_str()));
+    EXPECT_EQ(1u, hanging.requests().size()) << "once";
+}
+
 }  // namespace

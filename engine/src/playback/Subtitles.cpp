@@ -9,9 +9,6 @@ namespace {
 
 using android::status_t;
 
-// The demuxer for VobSub finds the pictures beside the index, unless told.
-constexpr char kDemuxerOptions[] = "demuxer-lavf-o";
-
 }  // namespace
 
 status_t Subtitles::add(const char* operation, const char* url, bool turnOn) {
@@ -31,7 +28,7 @@ status_t Subtitles::addPair(const char* sub, const char* idx) {
     return addFile(kName, {index, pictures, true});
 }
 
-status_t Subtitles::addFile(const char* operation, const File& file) {
+status_t Subtitles::addFile(const char* operation, const SubtitleFile& file) {
     const bool open = mState.read([](const PlayerState::Values& v) { return v.isOpen(); });
     if (open) return addNow(operation, file);
     const Phase phase = mState.phase();
@@ -42,8 +39,8 @@ status_t Subtitles::addFile(const char* operation, const File& file) {
     return android::NO_ERROR;
 }
 
-status_t Subtitles::addNow(const char* operation, const File& file) {
-    const int error = open(file);
+status_t Subtitles::addNow(const char* operation, const SubtitleFile& file) {
+    const int error = mLoader.open(file);
     if (error < 0) return failed(android::BAD_VALUE, operation, mpv_error_string(error));
     remember(file);
     if (!file.turnOn) return android::NO_ERROR;
@@ -51,35 +48,18 @@ status_t Subtitles::addNow(const char* operation, const File& file) {
     return shown ? android::NO_ERROR : android::INVALID_OPERATION;
 }
 
-// mpv turns on the first of several languages.
-int Subtitles::open(const File& file) {
-    std::lock_guard<std::mutex> lock(mOpenMutex);
-    if (!file.pictures.empty()) {
-        // A quoted value: the length in bytes, then the text as it is.
-        mMpv.set(kDemuxerOptions,
-                 "sub_name=%" + std::to_string(file.pictures.size()) + "%" + file.pictures);
-    }
-    const int error = mMpv.command({"sub-add", file.name.c_str(), file.turnOn ? "select" : "auto"});
-    // The options are those of whatever is opened next.
-    if (!file.pictures.empty()) mMpv.set(kDemuxerOptions, "");
-    return error;
-}
-
-void Subtitles::remember(const File& file) {
+void Subtitles::remember(const SubtitleFile& file) {
     std::lock_guard<std::mutex> lock(mMutex);
     mFiles.push_back(file);
 }
 
 void Subtitles::addToMedia() {
-    std::vector<File> files;
+    std::vector<SubtitleFile> files;
     {
         std::lock_guard<std::mutex> lock(mMutex);
         files = mFiles;
     }
-    for (const File& file : files) {
-        const int error = open(file);
-        if (error < 0) refused("prepare", ("no subtitles from " + file.name).c_str());
-    }
+    mLoader.openAll(files);
 }
 
 void Subtitles::readUsualLook() {
@@ -103,6 +83,7 @@ bool Subtitles::flush() {
 }
 
 void Subtitles::reset() {
+    mLoader.cancel();
     std::lock_guard<std::mutex> lock(mMutex);
     mFiles.clear();
     mStyle.clear();

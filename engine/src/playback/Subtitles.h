@@ -9,6 +9,7 @@
 
 #include "core/MpvHandle.h"
 #include "core/PlayerState.h"
+#include "playback/SubtitleLoader.h"
 #include "playback/Tracks.h"
 #include "records/SubtitleStyle.h"
 
@@ -20,11 +21,12 @@ namespace orvtarn {
 class Subtitles {
 public:
     Subtitles(MpvHandle& mpv, PlayerState& state, Tracks& tracks)
-        : mMpv(mpv), mState(state), mTracks(tracks) {}
+        : mMpv(mpv), mState(state), mTracks(tracks), mLoader(mpv) {}
 
     // Adds a file's subtitles, the first of them turned on or all left for later
     // selection. A name is refused as resolveName says it; INVALID_OPERATION
-    // without media, BAD_VALUE for what are no subtitles.
+    // without media, BAD_VALUE for what are no subtitles. Blocks until they are
+    // read, for those from a server for ten seconds at most.
     android::status_t add(const char* operation, const char* url, bool turnOn);
     // A VobSub pair; the two may lie in different folders.
     android::status_t addPair(const char* sub, const char* idx);
@@ -35,28 +37,22 @@ public:
     bool flush();
 
     // The files, for the media that mpv is opening: before it chooses tracks.
+    // Does not wait for those from servers.
     void addToMedia();
     // Forgets the files and the look.
     void reset();
 
 private:
-    struct File {
-        std::string name;
-        std::string pictures;  // of a VobSub index; empty for those beside it
-        bool turnOn;
-    };
-
-    android::status_t addFile(const char* operation, const File& file);
-    android::status_t addNow(const char* operation, const File& file);
-    int open(const File& file);
-    void remember(const File& file);
+    android::status_t addFile(const char* operation, const SubtitleFile& file);
+    android::status_t addNow(const char* operation, const SubtitleFile& file);
+    void remember(const SubtitleFile& file);
 
     MpvHandle& mMpv;
     PlayerState& mState;
     Tracks& mTracks;
-    std::mutex mOpenMutex;  // one file at a time
-    std::mutex mMutex;      // never held while a file is opened
-    std::vector<File> mFiles;
+    SubtitleLoader mLoader;
+    std::mutex mMutex;  // never held while a file is opened
+    std::vector<SubtitleFile> mFiles;
     SubtitleStyle mStyle;
 };
 

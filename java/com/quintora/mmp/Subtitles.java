@@ -31,7 +31,7 @@ public final class Subtitles {
 
     /**
      * Adds the subtitles of a file or URL, such as SRT or ASS, as a track and shows it. Blocks
-     * while they are read, for a URL as long as its server takes.
+     * while they are read, for a URL ten seconds at most.
      *
      * @param pathOrUrl where they are
      * @throws IllegalArgumentException when it is null
