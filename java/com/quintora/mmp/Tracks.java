@@ -131,8 +131,7 @@ public final class Tracks {
      * @return its number among the sound tracks; empty for none or before the media is prepared
      */
     public OptionalInt currentAudio() {
-        int index = player.ask("currentAudio()", player::native_getCurrentAudioIndex);
-        return current(index, audio().size());
+        return current(player.ask("currentAudio()", player::native_getCurrentAudioIndex));
     }
 
     /**
@@ -141,8 +140,7 @@ public final class Tracks {
      * @return its number among the subtitle tracks; empty for none or before the media is prepared
      */
     public OptionalInt currentSubtitle() {
-        int index = player.ask("currentSubtitle()", player::native_getCurrentSubtitleIndex);
-        return current(index, subtitles().size());
+        return current(player.ask("currentSubtitle()", player::native_getCurrentSubtitleIndex));
     }
 
     /**
@@ -191,8 +189,11 @@ public final class Tracks {
         metadata = read;
     }
 
-    // The native half answers 0 both for the first track and for none.
-    private static OptionalInt current(int index, int count) {
-        return index >= 0 && index < count ? OptionalInt.of(index) : OptionalInt.empty();
+    // The native half answers 0 both for the first track and where there is no media.
+    private OptionalInt current(int index) {
+        boolean hasMedia = StateMachine.WITH_MEDIA.contains(player.states.state());
+        return index > 0 || index == 0 && hasMedia
+                ? OptionalInt.of(index)
+                : OptionalInt.empty();
     }
 }

@@ -16,6 +16,7 @@ import java.nio.file.Files;
 import java.nio.file.Path;
 import java.util.List;
 import java.util.Map;
+import java.util.OptionalInt;
 import java.util.concurrent.CopyOnWriteArrayList;
 import java.util.concurrent.ExecutorService;
 import java.util.concurrent.Executors;
@@ -94,9 +95,23 @@ class HttpSourceTest extends PlayerFixture {
     void whatTheServerDoesNotHaveIsRefused() throws Exception {
         player.setDataSource(url("/nothing.mp4"));
         MediaException e = assertThrows(MediaException.class, player::prepare);
-        assertTrue(e.getMessage().startsWith(url("/nothing.mp4") + ": "), e.getMessage());
+        assertEquals(
+                url("/nothing.mp4") + ": the server has no such media (HTTP status 404)",
+                e.getMessage());
+        assertEquals(MediaException.STATUS_HTTP - 404, e.status());
         player.reset();
         open(url("/film.mp4"));
+    }
+
+    @Test
+    void theCurrentTracksAreKnownWithoutAnotherRequest() throws Exception {
+        open(url("/film.mp4"));
+        int before = requests.size();
+        assertEquals(OptionalInt.of(0), player.tracks().currentAudio());
+        assertEquals(OptionalInt.empty(), player.tracks().currentSubtitle());
+        assertEquals(before, requests.size());
+        player.reset();
+        assertEquals(OptionalInt.empty(), player.tracks().currentAudio());
     }
 
     private String url(String path) {
