@@ -11,6 +11,7 @@ run_player() {
     use_utf8
     describe_terminal
     choose_log "$@"
+    choose_trust "$@"
     exec "${JAVA_COMMAND[@]}" "$@"
 }
 
@@ -56,6 +57,14 @@ choose_log() {
         [ "$argument" != --log ] || ORV_LOG=${ORV_LOG:-verbose}
     done
     export ORV_LOG=${ORV_LOG:-silent}
+}
+
+# Certificates of servers are checked unless the user says otherwise.
+choose_trust() {
+    local argument
+    for argument in "$@"; do
+        [ "$argument" != --insecure ] || export ORV_TLS_VERIFY=no
+    done
 }
 
 # Java reads the names of files in the locale's encoding.

@@ -14,4 +14,10 @@ final class CommonOptions {
     // Read by the starting script, which sets the native libraries' log before they are loaded.
     @Option(names = "--log", description = "Show the native libraries' log.")
     private boolean log;
+
+    // Read by the starting script, too: the engine looks at the environment.
+    @Option(
+            names = "--insecure",
+            description = "Accept servers whose certificate is not trusted.")
+    private boolean insecure;
 }
