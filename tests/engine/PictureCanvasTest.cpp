@@ -71,7 +71,7 @@ struct Drawn {
 
 uint32_t pixelOf(int32_t mode, Rgba color) {
     Drawn drawn(mode, 4, 4);
-    EXPECT_EQ(drawPicture(*solid(16, 16, color), 0, drawn.request), 0);
+    EXPECT_EQ(drawPicture(*solid(16, 16, color), drawn.request), 0);
     return drawn.pixel(2, 2);
 }
 
@@ -138,8 +138,8 @@ TEST(PictureCanvas, DrawsYuvInItsByteOrder) {
     Drawn uyvy(ORV_COLOR_MODE_UYVY422, 4, 4);
     Drawn yuyv(ORV_COLOR_MODE_YUYV422, 4, 4);
     const Frame red = solid(16, 16, {255, 0, 0, 255});
-    ASSERT_EQ(drawPicture(*red, 0, uyvy.request), 0);
-    ASSERT_EQ(drawPicture(*red, 0, yuyv.request), 0);
+    ASSERT_EQ(drawPicture(*red, uyvy.request), 0);
+    ASSERT_EQ(drawPicture(*red, yuyv.request), 0);
     const int expected[] = {90, 81, 240, 81};
     for (int i = 0; i < 4; i++) {
         EXPECT_PRED2(near, uyvy.buffer[i], expected[i]) << i;
@@ -159,7 +159,7 @@ TEST(PictureCanvas, WritesNothingBesideThePixels) {
     for (int32_t mode : kModes) {
         for (int width : {1, 2, 15, 16, 17, 32, 33, 64}) {
             Drawn drawn(mode, width, 3);
-            ASSERT_EQ(drawPicture(*frame, 0, drawn.request), 0) << mode << ", " << width;
+            ASSERT_EQ(drawPicture(*frame, drawn.request), 0) << mode << ", " << width;
             const size_t used = static_cast<size_t>(width) * bytesPerPixel(mode);
             for (size_t i = 0; i < drawn.buffer.size(); i++) {
                 if (i >= drawn.stride * 3 || i % drawn.stride >= used) {
@@ -176,38 +176,14 @@ TEST(PictureCanvas, DrawsEverySizeFromThinToLarge) {
     for (int32_t mode : kModes) {
         for (const auto& size : sizes) {
             Drawn drawn(mode, size[0], size[1]);
-            ASSERT_EQ(drawPicture(*frame, 0, drawn.request), 0) << mode << ", " << size[0];
+            ASSERT_EQ(drawPicture(*frame, drawn.request), 0) << mode << ", " << size[0];
             EXPECT_EQ(drawn.buffer[drawn.stride * size[1]], kUntouched);
         }
     }
     Drawn drawn(ORV_COLOR_MODE_ARGB8888, 255, 1);
-    ASSERT_EQ(drawPicture(*frame, 0, drawn.request), 0);
+    ASSERT_EQ(drawPicture(*frame, drawn.request), 0);
     const int expected[] = {30, 200, 10, 255};
     for (int i = 0; i < 255 * 4; i++) EXPECT_NEAR(drawn.buffer[i], expected[i % 4], 2) << i;
-}
-
-// The corners of a picture are red, green (right), blue (bottom), white.
-TEST(PictureCanvas, TurnsPicturesClockwise) {
-    const Rgba red = {255, 0, 0, 255}, green = {0, 255, 0, 255}, blue = {0, 0, 255, 255},
-               white = {255, 255, 255, 255};
-    Frame frame = rgbaFrame(32, 16);
-    for (int y = 0; y < 16; y++) {
-        for (int x = 0; x < 32; x++) {
-            setPixel(*frame, x, y, y < 8 ? (x < 16 ? red : green) : (x < 16 ? blue : white));
-        }
-    }
-    const uint32_t r = 0xFFFF0000, g = 0xFF00FF00, b = 0xFF0000FF, w = 0xFFFFFFFF;
-    const uint32_t expected[4][4] = {{r, g, b, w}, {b, r, w, g}, {w, b, g, r}, {g, w, r, b}};
-    for (int quarter = 0; quarter < 4; quarter++) {
-        const int width = quarter % 2 == 0 ? 32 : 16;
-        Drawn drawn(ORV_COLOR_MODE_ARGB8888, width, 48 - width);
-        ASSERT_EQ(drawPicture(*frame, quarter * 90, drawn.request), 0);
-        const int right = width - 1, bottom = 47 - width;
-        EXPECT_EQ(drawn.pixel(0, 0), expected[quarter][0]) << quarter;
-        EXPECT_EQ(drawn.pixel(right, 0), expected[quarter][1]) << quarter;
-        EXPECT_EQ(drawn.pixel(0, bottom), expected[quarter][2]) << quarter;
-        EXPECT_EQ(drawn.pixel(right, bottom), expected[quarter][3]) << quarter;
-    }
 }
 
 bool isRefused(int32_t mode, int32_t width, int32_t height, uint32_t size, bool hasBuffer = true) {

@@ -28,7 +28,8 @@ struct VideoCodecInfo {
 };
 
 // Subtitle tracks have the indices from 0. Indices from
-// ORV_CHAPTER_INDEX_BASE on address the media's chapter marks, which are
+// ORV_CHAPTER_INDEX_BASE up to ORV_DESCRIPTION_INDEX_BASE (see
+// orvtarn/MediaDescription.h) address the media's chapter marks, which are
 // timed texts too: mCodec is ORV_CHAPTER_CODEC, mTrackId the start in
 // milliseconds, mText the title, mFlags the end in milliseconds (-1: unknown).
 enum : int32_t {

@@ -79,19 +79,22 @@ int toModifiedUtf8(uint16_t unit, char* bytes) {
 
 }  // namespace
 
-void setText(OrvText& text, std::string_view utf8) {
+size_t setText(OrvText& text, std::string_view utf8) {
     clearText(text);
+    const size_t size = utf8.size();
     int used = 0;
     while (!utf8.empty()) {
+        const size_t taken = size - utf8.size();
         uint16_t units[2];
         const int count = toUtf16(takeCharacter(utf8), units);
         char bytes[6];
         int length = 0;
         for (int i = 0; i < count; i++) length += toModifiedUtf8(units[i], bytes + length);
-        if (used + length >= ORV_TEXT_BYTES) return;
+        if (used + length >= ORV_TEXT_BYTES) return taken;
         std::copy_n(bytes, length, text + used);
         used += length;
     }
+    return size;
 }
 
 void setWideText(OrvWideText& text, std::string_view utf8) {

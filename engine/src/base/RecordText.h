@@ -2,6 +2,7 @@
 #pragma once
 
 #include <orvtarn/RecordText.h>
+#include <stddef.h>
 
 #include <string_view>
 
@@ -13,8 +14,9 @@ namespace orvtarn {
 
 // Modified UTF-8, always terminated, so at most 127 bytes: U+0000 takes two
 // bytes, characters beyond U+FFFF six (a surrogate pair of three bytes each).
-// The bytes behind the text are zero.
-void setText(OrvText& text, std::string_view utf8);
+// The bytes behind the text are zero. Answers how many bytes of the input it
+// took.
+size_t setText(OrvText& text, std::string_view utf8);
 
 // UTF-16. A text of 128 units or more fills the array without a terminator;
 // the units behind a shorter one are zero. A U+0000 becomes U+FFFD, since a

@@ -1,18 +1,13 @@
 // SPDX-License-Identifier: Apache-2.0
 #include "inspect/FrameFinder.h"
 
-#include <math.h>
 #include <orvtarn/PlayerTypes.h>
 
 #include <algorithm>
-#include <iterator>
-
-#include "base/LibraryVersions.h"
 
 extern "C" {
 #include <libavcodec/avcodec.h>
 #include <libavformat/avformat.h>
-#include <libavutil/display.h>
 }
 
 namespace orvtarn {
@@ -24,7 +19,7 @@ namespace {
 
 const int64_t kToleranceUs = 1000;
 const int64_t kNextFrameUs = 100 * 1000;
-const int64_t kSeekBackUs[] = {0, 1000 * 1000, 4000 * 1000, 16000 * 1000};
+const int64_t kFirstSeekBackUs = 1000 * 1000;
 
 bool isEmbeddedPicture(const AVStream& stream) {
     return (stream.disposition & AV_DISPOSITION_ATTACHED_PIC) != 0;
@@ -42,17 +37,24 @@ AVStream* firstVideo(const AVFormatContext& media) {
 }  // namespace
 
 FrameFinder::FrameFinder(MediaFile& file)
-    : mFile(file), mPacket(av_packet_alloc()), mRead(av_frame_alloc()), mFound(av_frame_alloc()) {}
+    : mFile(file),
+      mPacket(av_packet_alloc()),
+      mRead(av_frame_alloc()),
+      mFound(av_frame_alloc()),
+      mBefore(av_frame_alloc()) {}
 
 FrameFinder::~FrameFinder() {
     avcodec_free_context(&mCodec);
     av_packet_free(&mPacket);
     av_frame_free(&mRead);
     av_frame_free(&mFound);
+    av_frame_free(&mBefore);
 }
 
 status_t FrameFinder::open(int streamIndex) {
-    if (mPacket == nullptr || mRead == nullptr || mFound == nullptr) return android::NO_MEMORY;
+    if (mPacket == nullptr || mRead == nullptr || mFound == nullptr || mBefore == nullptr) {
+        return android::NO_MEMORY;
+    }
     if (!chooseStream(streamIndex) || !openDecoder()) return ORV_ERROR_UNSUPPORTED;
     return OK;
 }
@@ -82,13 +84,18 @@ bool FrameFinder::openDecoder() {
     return avcodec_open2(mCodec, decoder, nullptr) >= 0;
 }
 
-int FrameFinder::rotation() const {
-    const int32_t* matrix = displayMatrix(*mStream);
-    if (matrix == nullptr) return 0;
-    const double counterclockwise = av_display_rotation_get(matrix);
-    if (isnan(counterclockwise)) return 0;
-    const int quarters = static_cast<int>(lround(-counterclockwise / 90));
-    return (quarters % 4 + 4) % 4 * 90;
+bool FrameFinder::isLike(const AVFrame& frame) const {
+    return frame.width == mFound->width && frame.height == mFound->height &&
+           frame.format == mFound->format;
+}
+
+const AVFrame* FrameFinder::before() const {
+    return mBefore->width > 0 && isLike(*mBefore) ? mBefore : nullptr;
+}
+
+const AVFrame* FrameFinder::after() {
+    if (isEmbeddedPicture(*mStream)) return nullptr;
+    return (mRead->width > 0 || readFrame()) && isLike(*mRead) ? mRead : nullptr;
 }
 
 int64_t FrameFinder::startTimeUs() const {
@@ -96,11 +103,10 @@ int64_t FrameFinder::startTimeUs() const {
     return start == AV_NOPTS_VALUE ? 0 : start;
 }
 
-// From the media's start. Frames without a time count as at the start.
-int64_t FrameFinder::frameTimeUs(const AVFrame& frame) const {
-    if (frame.best_effort_timestamp == AV_NOPTS_VALUE) return 0;
-    return av_rescale_q(frame.best_effort_timestamp, mStream->time_base, AV_TIME_BASE_Q) -
-           startTimeUs();
+// From the media's start. What has no time counts as at the start.
+int64_t FrameFinder::timeUs(int64_t timestamp) const {
+    if (timestamp == AV_NOPTS_VALUE) return 0;
+    return av_rescale_q(timestamp, mStream->time_base, AV_TIME_BASE_Q) - startTimeUs();
 }
 
 const AVFrame* FrameFinder::find(int64_t positionMs) {
@@ -116,19 +122,20 @@ const AVFrame* FrameFinder::find(int64_t positionMs) {
     return mFound->width > 0 ? mFound : nullptr;
 }
 
-// Some formats seek to places from where decoding begins only later, so this
-// goes further back until a frame at or before the time comes out.
+// Formats without an index are sought by guesses, which may lead past the last
+// key frame before the time: this goes further and further back until a frame at
+// or before the time comes out.
 void FrameFinder::search(int64_t positionUs) {
-    for (int64_t back : kSeekBackUs) {
+    mWantedUs = positionUs;
+    for (int64_t back = 0;; back = std::max(4 * back, kFirstSeekBackUs)) {
         const int64_t from = std::max<int64_t>(positionUs - back, 0);
         // Reading goes on from where it stands in media that cannot be sought.
-        seek(from);
-        const bool isLast = from == 0 || back == *std::rbegin(kSeekBackUs);
+        const bool isLast = !seek(from) || from == 0;
         if (decodeUpTo(positionUs, isLast) || isLast || mFile.isInterrupted()) return;
     }
 }
 
-void FrameFinder::seek(int64_t positionUs) {
+bool FrameFinder::seek(int64_t positionUs) {
     AVFormatContext* media = mFile.context();
     // Broadcast formats are searched by decoding times, which misses the first
     // key frame.
@@ -138,17 +145,24 @@ void FrameFinder::seek(int64_t positionUs) {
     const int error = isToFirstByte
                           ? av_seek_frame(media, -1, 0, AVSEEK_FLAG_BYTE)
                           : av_seek_frame(media, mStream->index, time, AVSEEK_FLAG_BACKWARD);
-    if (error >= 0) avcodec_flush_buffers(mCodec);
+    if (error < 0) return false;
+    avcodec_flush_buffers(mCodec);
+    // What depends on frames before the place would come out damaged.
+    mAwaitsKey = positionUs > 0;
+    return true;
 }
 
 // takeLater: also takes a first frame that is past the time.
 bool FrameFinder::decodeUpTo(int64_t positionUs, bool takeLater) {
     bool hasEarlier = false;
+    av_frame_unref(mBefore);
     while (readFrame()) {
-        const int64_t late = frameTimeUs(*mRead) - positionUs;
+        const int64_t late = timeUs(mRead->best_effort_timestamp) - positionUs;
         const bool isReached = late > -kToleranceUs;
         if (!hasEarlier && late >= kToleranceUs && !takeLater) return false;
         if (hasEarlier && late > kNextFrameUs) return true;
+        av_frame_unref(mBefore);
+        if (hasEarlier) av_frame_move_ref(mBefore, mFound);
         av_frame_unref(mFound);
         av_frame_move_ref(mFound, mRead);
         if (isReached) return true;
@@ -175,9 +189,13 @@ bool FrameFinder::readFrame() {
 bool FrameFinder::sendPacket() {
     while (!mFile.isInterrupted() && av_read_frame(mFile.context(), mPacket) >= 0) {
         const bool isOurs = mPacket->stream_index == mStream->index;
-        if (isOurs) avcodec_send_packet(mCodec, mPacket);
+        const bool isPast = isOurs && timeUs(mPacket->pts) > mWantedUs;
+        mAwaitsKey = mAwaitsKey && !(isOurs && (mPacket->flags & AV_PKT_FLAG_KEY) != 0);
+        const bool isWanted = isOurs && !mAwaitsKey;
+        if (isWanted) avcodec_send_packet(mCodec, mPacket);
         av_packet_unref(mPacket);
-        if (isOurs) return true;
+        if (isWanted) return true;
+        if (mAwaitsKey && isPast) return false;
     }
     return !mFile.isInterrupted() && avcodec_send_packet(mCodec, nullptr) >= 0;
 }

@@ -33,27 +33,37 @@ public:
     // belongs to the finder and stays as it is until the next call.
     const AVFrame* find(int64_t positionMs);
 
-    // Degrees to turn frames clockwise for upright pictures: 0, 90, 180, 270.
-    int rotation() const;
+    // The frames next to the one that was found, of the same size and format; null
+    // where there is none or decoding began or ended there. after() may decode and
+    // is for one call after find(). They belong to the finder, too.
+    const AVFrame* before() const;
+    const AVFrame* after();
+
+    // The one that was opened.
+    const AVStream& stream() const { return *mStream; }
 
 private:
     bool chooseStream(int streamIndex);
     bool openDecoder();
     void search(int64_t positionUs);
-    void seek(int64_t positionUs);
+    bool seek(int64_t positionUs);
+    bool isLike(const AVFrame& frame) const;
     bool decodeUpTo(int64_t positionUs, bool takeLater);
     bool decodePicture();
     bool readFrame();
     bool sendPacket();
     int64_t startTimeUs() const;
-    int64_t frameTimeUs(const AVFrame& frame) const;
+    int64_t timeUs(int64_t timestamp) const;
 
     MediaFile& mFile;
     AVStream* mStream = nullptr;
     AVCodecContext* mCodec = nullptr;
     AVPacket* mPacket;
-    AVFrame* mRead;   // the one just decoded
-    AVFrame* mFound;  // the one to show
+    AVFrame* mRead;           // the one just decoded
+    AVFrame* mFound;          // the one to show
+    AVFrame* mBefore;         // the one that was decoded before that
+    int64_t mWantedUs = 0;    // the time that is searched for
+    bool mAwaitsKey = false;  // packets before a key frame are not decoded
 };
 
 }  // namespace orvtarn

@@ -6,6 +6,9 @@
 
 #include <memory>
 
+#include "inspect/FilterGraph.h"
+#include "inspect/StreamPicture.h"
+
 extern "C" {
 #include <libavutil/frame.h>
 #include <libavutil/imgutils.h>
@@ -52,11 +55,6 @@ const Canvas* canvasOf(int32_t colorMode) {
     return nullptr;
 }
 
-struct FreeFrame {
-    void operator()(AVFrame* frame) const { av_frame_free(&frame); }
-};
-typedef std::unique_ptr<AVFrame, FreeFrame> Frame;
-
 struct FreeScaler {
     void operator()(SwsContext* scaler) const { sws_freeContext(scaler); }
 };
@@ -78,20 +76,20 @@ const AVPixFmtDescriptor& describe(const AVFrame& frame) {
 
 bool hasAlpha(const AVFrame& frame) { return (describe(frame).flags & AV_PIX_FMT_FLAG_ALPHA) != 0; }
 
-// Untagged video is taken as players take it: large pictures are HD.
-int matrixOf(const AVFrame& frame) {
-    if (frame.colorspace != AVCOL_SPC_UNSPECIFIED) return frame.colorspace;
-    return frame.width >= 1280 || frame.height > 576 ? SWS_CS_ITU709 : SWS_CS_ITU601;
-}
-
 bool isFullRange(const AVFrame& frame) {
     return frame.color_range == AVCOL_RANGE_JPEG || strncmp(describe(frame).name, "yuvj", 4) == 0;
+}
+
+// Between RGB formats libswscale takes a way through YUV, and back by the same.
+const int* coefficientsOf(const AVFrame& frame) {
+    const AVColorSpace matrix = matrixOf(frame);
+    return sws_getCoefficients(matrix == AVCOL_SPC_RGB ? SWS_CS_ITU601 : matrix);
 }
 
 // Gray is full range; YUV is BT.601 in limited range.
 void setColors(SwsContext* scaler, const AVFrame& from, const AVFrame& to) {
     const int one = 1 << 16;
-    sws_setColorspaceDetails(scaler, sws_getCoefficients(matrixOf(from)), isFullRange(from),
+    sws_setColorspaceDetails(scaler, coefficientsOf(from), isFullRange(from),
                              sws_getCoefficients(SWS_CS_ITU601), to.format == AV_PIX_FMT_GRAY16, 0,
                              one, one);
 }
@@ -112,33 +110,6 @@ Frame convert(const AVFrame& from, AVPixelFormat format, int width, int height) 
 
 uint32_t* pixelAt(const AVFrame& frame, int x, int y) {
     return reinterpret_cast<uint32_t*>(frame.data[0] + ptrdiff_t{y} * frame.linesize[0]) + x;
-}
-
-// Clockwise, of a picture with 32 bits per pixel.
-Frame turn(const AVFrame& from, int rotation) {
-    const bool isUpright = rotation == 180;
-    Frame to = newFrame(static_cast<AVPixelFormat>(from.format),
-                        isUpright ? from.width : from.height, isUpright ? from.height : from.width);
-    if (to == nullptr) return nullptr;
-    for (int y = 0; y < to->height; y++) {
-        for (int x = 0; x < to->width; x++) {
-            const int right = from.width - 1;
-            const int bottom = from.height - 1;
-            *pixelAt(*to, x, y) = rotation == 90    ? *pixelAt(from, y, bottom - x)
-                                  : rotation == 180 ? *pixelAt(from, right - x, bottom - y)
-                                                    : *pixelAt(from, right - y, x);
-        }
-    }
-    return to;
-}
-
-// The frame upright, at the thumbnail's size, in a format with 32 bits.
-Frame upright(const AVFrame& frame, int rotation, const _Media_Thumbnail_Info_T& thumbnail) {
-    const bool isLying = rotation != 180;
-    const Frame scaled =
-        convert(frame, AV_PIX_FMT_BGRA, isLying ? thumbnail.i4Height : thumbnail.i4Width,
-                isLying ? thumbnail.i4Width : thumbnail.i4Height);
-    return scaled == nullptr ? nullptr : turn(*scaled, rotation);
 }
 
 uint16_t withAlpha(uint16_t pixel, int32_t colorMode, uint8_t alpha) {
@@ -205,15 +176,9 @@ status_t checkThumbnail(const _Media_Thumbnail_Info_T& thumbnail) {
     return stride * thumbnail.i4Height > thumbnail.u4BufferSize ? BAD_VALUE : OK;
 }
 
-status_t drawPicture(const AVFrame& frame, int rotation, const _Media_Thumbnail_Info_T& thumbnail) {
+status_t drawPicture(const AVFrame& frame, const _Media_Thumbnail_Info_T& thumbnail) {
     const Canvas& canvas = *canvasOf(thumbnail.i4CanvasColormode);
-    Frame turned;
-    if (rotation != 0) {
-        turned = upright(frame, rotation, thumbnail);
-        if (turned == nullptr) return ORV_ERROR_UNSUPPORTED;
-    }
-    const Frame drawn =
-        picture(turned == nullptr ? frame : *turned, canvas, thumbnail.i4Width, thumbnail.i4Height);
+    const Frame drawn = picture(frame, canvas, thumbnail.i4Width, thumbnail.i4Height);
     if (drawn == nullptr) return ORV_ERROR_UNSUPPORTED;
     av_image_copy_plane(thumbnail.pBuffer,
                         static_cast<int>(thumbnailStride(canvas.colorMode, thumbnail.i4Width)),

@@ -20,11 +20,9 @@ size_t thumbnailStride(int32_t colorMode, int32_t width);
 // 16384, and a buffer with less than height rows.
 android::status_t checkThumbnail(const _Media_Thumbnail_Info_T& thumbnail);
 
-// Stretches a decoded frame to the thumbnail's size, turned upright by rotation
-// (clockwise, 0, 90, 180 or 270 degrees), in its colour mode. Bytes between
+// Stretches a frame to the thumbnail's size, in its colour mode. Bytes between
 // the rows stay as they are. A checked thumbnail; NO_MEMORY or
 // ORV_ERROR_UNSUPPORTED for a frame that cannot be converted.
-android::status_t drawPicture(const AVFrame& frame, int rotation,
-                              const _Media_Thumbnail_Info_T& thumbnail);
+android::status_t drawPicture(const AVFrame& frame, const _Media_Thumbnail_Info_T& thumbnail);
 
 }  // namespace orvtarn

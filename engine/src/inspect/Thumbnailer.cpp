@@ -4,8 +4,13 @@
 #include <orvtarn/PlayerTypes.h>
 
 #include <new>
+#include <string>
+#include <vector>
 
+#include "base/LibraryVersions.h"
+#include "base/PictureFilters.h"
 #include "inspect/PictureCanvas.h"
+#include "inspect/StreamPicture.h"
 
 namespace orvtarn {
 
@@ -32,7 +37,22 @@ status_t Thumbnailer::draw(int64_t positionMs, const _Media_Thumbnail_Info_T& th
     const AVFrame* frame = mFinder.find(positionMs);
     if (mFile->isInterrupted()) return ORV_ERROR_IO;
     if (frame == nullptr) return ORV_ERROR_MALFORMED;
-    return drawPicture(*frame, mFinder.rotation(), thumbnail);
+    const std::string filters = pictureFilters(traitsOf(mFinder.stream(), *frame));
+    if (filters.empty()) return drawPicture(*frame, thumbnail);
+    const Frame shown = filtered(filters, *frame);
+    return shown == nullptr ? ORV_ERROR_UNSUPPORTED : drawPicture(*shown, thumbnail);
+}
+
+// Deinterlacing also looks at the frames beside the one to draw.
+Frame Thumbnailer::filtered(const std::string& filters, const AVFrame& frame) {
+    std::vector<const AVFrame*> frames;
+    const AVFrame* before = mFinder.before();
+    const AVFrame* after = isInterlaced(frame) ? mFinder.after() : nullptr;
+    if (before != nullptr && isInterlaced(frame)) frames.push_back(before);
+    const size_t wanted = frames.size();
+    frames.push_back(&frame);
+    if (after != nullptr) frames.push_back(after);
+    return filterFrames(filters, frames, wanted);
 }
 
 }  // namespace orvtarn

@@ -6,7 +6,9 @@
 #include <utils/Errors.h>
 
 #include <memory>
+#include <string>
 
+#include "inspect/FilterGraph.h"
 #include "inspect/FrameFinder.h"
 #include "inspect/MediaFile.h"
 
@@ -23,14 +25,17 @@ public:
                                     std::unique_ptr<Thumbnailer>& thumbnailer);
 
     // Draws the frame at a time from the media's start, which is the one that
-    // FrameFinder finds; before the first frame that one, past the last that one. Blocks while it
-    // reads and decodes. 0, BAD_VALUE as checkThumbnail says it, ORV_ERROR_IO when interrupted, or
-    // ORV_ERROR_MALFORMED when no frame can be decoded; the buffer is only written to when the
-    // result is 0.
+    // FrameFinder finds; before the first frame that one, past the last that one.
+    // Upright, progressive and in standard dynamic range, see pictureFilters. Blocks
+    // while it reads and decodes. 0, BAD_VALUE as checkThumbnail says it,
+    // ORV_ERROR_IO when interrupted, ORV_ERROR_MALFORMED when no frame can be
+    // decoded, or ORV_ERROR_UNSUPPORTED when one cannot be drawn; the buffer is only
+    // written to when the result is 0.
     android::status_t draw(int64_t positionMs, const _Media_Thumbnail_Info_T& thumbnail);
 
 private:
     explicit Thumbnailer(std::unique_ptr<MediaFile> file);
+    Frame filtered(const std::string& filters, const AVFrame& frame);
 
     std::unique_ptr<MediaFile> mFile;
     FrameFinder mFinder;

@@ -6,6 +6,7 @@
 
 #include "base/EngineLog.h"
 #include "inspect/ContainerInfo.h"
+#include "inspect/MediaDescription.h"
 
 namespace orvtarn {
 namespace {
@@ -88,6 +89,9 @@ bool Tracks::audioInfo(bool withTexts, int index, AudioTrackInfo& info) {
 }
 
 bool Tracks::subtitleInfo(int index, SubtitleTrackInfo& info) {
+    if (index >= ORV_DESCRIPTION_INDEX_BASE) {
+        return descriptionPiece(index - ORV_DESCRIPTION_INDEX_BASE, info);
+    }
     if (index >= ORV_CHAPTER_INDEX_BASE) return chapterInfo(index - ORV_CHAPTER_INDEX_BASE, info);
     TrackTables all;
     if (!tables("getSubtitleTrackInfo", all)) return false;
@@ -103,6 +107,16 @@ bool Tracks::chapterInfo(int chapter, SubtitleTrackInfo& info) {
     bool found = false;
     mLoader.secondReading()->withFile(
         [&](MediaFile& file) { found = chapterRecord(file, chapter, info); });
+    return found;
+}
+
+// Pieces are read until there is no more, too.
+bool Tracks::descriptionPiece(int piece, SubtitleTrackInfo& info) {
+    TrackTables all;
+    if (!tables("getSubtitleTrackInfo", all)) return false;
+    bool found = false;
+    mLoader.secondReading()->withFile(
+        [&](MediaFile& file) { found = descriptionRecord(describeMedia(file, all), piece, info); });
     return found;
 }
 

@@ -32,7 +32,8 @@ public:
     // The place of the video track that is shown in the MediaFile; -1 for none.
     int shownVideoStream();
     bool audioInfo(bool withTexts, int index, AudioTrackInfo& info);
-    // Chapters, too; see ORV_CHAPTER_INDEX_BASE.
+    // Chapters and the description, too; see ORV_CHAPTER_INDEX_BASE and
+    // ORV_DESCRIPTION_INDEX_BASE.
     bool subtitleInfo(int index, SubtitleTrackInfo& info);
 
     // -1 for none. False before the media is prepared.
@@ -57,6 +58,7 @@ private:
     bool chooseVideo(int64_t id);
     bool choose(const char* operation, const char* property, int64_t id);
     bool chapterInfo(int chapter, SubtitleTrackInfo& info);
+    bool descriptionPiece(int piece, SubtitleTrackInfo& info);
 
     MpvHandle& mMpv;
     PlayerState& mState;

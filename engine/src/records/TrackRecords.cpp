@@ -5,11 +5,11 @@
 
 #include <algorithm>
 #include <cmath>
-#include <cstdlib>
 #include <string>
 
 #include "base/LibavValues.h"
 #include "base/RecordText.h"
+#include "inspect/StreamDescription.h"
 #include "records/CodecFourCC.h"
 
 extern "C" {
@@ -131,16 +131,26 @@ const AVStream* streamOf(const MediaFile& file, int index, AVMediaType type) {
     return stream != nullptr && stream->codecpar->codec_type == type ? stream : nullptr;
 }
 
-// Matroska keeps the bit rate in a statistics tag.
-int32_t bitRateOf(const AVStream& stream) {
-    if (stream.codecpar->bit_rate > 0) return toInt32(stream.codecpar->bit_rate);
-    return toInt32(std::max(0LL, strtoll(tagOf(stream.metadata, "BPS"), nullptr, 10)));
+void addVideoDetails(const AVStream& stream, VideoCodecInfo& record) {
+    const AVCodecParameters& codec = *stream.codecpar;
+    if (codec.width > 0 && codec.height > 0) {
+        record.mWidth = codec.width;
+        record.mHeight = codec.height;
+    }
+    const AVRational rate = stream.avg_frame_rate;
+    if (rate.num > 0 && rate.den > 0) {
+        record.mFrameRate = toInt32(av_rescale(rate.num, 1000, rate.den));
+    }
+    if (record.mBitRate == 0) record.mBitRate = toInt32(bitRateOf(stream));
 }
 
-// 0 for codecs that have no samples of a fixed width.
-int32_t sampleBits(const AVCodecParameters& codec) {
-    if (codec.bits_per_raw_sample > 0) return codec.bits_per_raw_sample;
-    return av_get_exact_bits_per_sample(codec.codec_id);
+// The rate as decoded: high-efficiency AAC declares half of it.
+void addAudioDetails(const AVStream& stream, AudioTrackInfo& record) {
+    const AVCodecParameters& codec = *stream.codecpar;
+    if (codec.sample_rate > 0) record.mSampleRate = codec.sample_rate;
+    if (codec.ch_layout.nb_channels > 0) record.mChannels = codec.ch_layout.nb_channels;
+    if (record.mBitRate == 0) record.mBitRate = toInt32(bitRateOf(stream));
+    record.mBitsPerSample = sampleBits(codec);
 }
 
 void setChannelLayout(OrvWideText& text, const AVChannelLayout& layout) {
@@ -160,18 +170,15 @@ TrackTables trackTables(const mpv_node& trackList) {
     return tables;
 }
 
+// mpv reports what containers declare; the codec's own word is in the stream.
 void addContainerDetails(const MediaFile& file, TrackTables& tables) {
     for (auto& track : tables.video) {
         const AVStream* stream = streamOf(file, track.streamIndex, AVMEDIA_TYPE_VIDEO);
-        if (stream != nullptr && track.record.mBitRate == 0) {
-            track.record.mBitRate = bitRateOf(*stream);
-        }
+        if (stream != nullptr) addVideoDetails(*stream, track.record);
     }
     for (auto& track : tables.audio) {
         const AVStream* stream = streamOf(file, track.streamIndex, AVMEDIA_TYPE_AUDIO);
-        if (stream == nullptr) continue;
-        if (track.record.mBitRate == 0) track.record.mBitRate = bitRateOf(*stream);
-        track.record.mBitsPerSample = sampleBits(*stream->codecpar);
+        if (stream != nullptr) addAudioDetails(*stream, track.record);
     }
 }
 
