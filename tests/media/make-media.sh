@@ -8,7 +8,7 @@
 # tests may ask for the same file at the same time.
 set -eu
 
-FILES="video.mp4 video.mkv video.ts video.avi slides.mkv rotated.mp4 hd.mp4 hd709.mp4 odd.mkv
+FILES="video.mp4 lying.mp4 video.mkv video.ts video.avi slides.mkv rotated.mp4 hd.mp4 hd709.mp4 odd.mkv
        alpha.mov still.png silent.mkv tracks.mkv tracks.mp4 tagged.mp3 tagged.ogg broken-tags.mp4
        front.jpg back.png covered.mp3 covered.flac covered.m4a covered.mkv noise.bin
        cut.mp4 cut.mkv
@@ -20,7 +20,11 @@ FILES="video.mp4 video.mkv video.ts video.avi slides.mkv rotated.mp4 hd.mp4 hd70
        yuv420p10.mkv yuv422p.mkv yuv422p10.mkv yuv444p.mkv yuv444p12.mkv
        bt601.mkv bt601-full.mkv bt709.mkv bt709-full.mkv bt2020.mkv pq.mkv hlg.mkv
        top-first.ts bottom-first.ts one-frame.mkv
-       counted-60.mkv counted-film.mp4 counted-varying.mkv counted.ts"
+       counted-60.mkv counted-film.mp4 counted-varying.mkv counted.ts
+       stream.ts stream.m2ts stream.mpg stream.vob distant.ts distant.m2ts distant.mpg distant.vob
+       lying90.mp4 lying180.mp4 lying270.mp4 mirrored.mp4 flipped.mp4 lying90mirrored.mp4
+       wide-pixels.mkv deep-422.mkv full-444.mkv hdr-pq.mkv hdr-hlg.mkv hdr10.mp4 fields-top.mkv
+       fields-bottom.mpg h263.3gp he-aac.m4a fonts.mkv spoken.mkv"
 
 quiet_ffmpeg() { ffmpeg -nostdin -v error -y "$@"; }
 
@@ -172,6 +176,124 @@ make_covered_mkv() {
     need front.jpg silent.mkv
     quiet_ffmpeg -i "$folder/silent.mkv" -attach "$folder/front.jpg" -c copy \
         -metadata:s:t mimetype=image/jpeg "$1"
+}
+
+# Broadcast formats, which have no index: ten pictures a second, all different,
+# with sound. The arguments: seconds, pictures from key frame to key frame, codec
+# options, the file.
+broadcast() {
+    local seconds=$1 group=$2 file=${!#}
+    quiet_ffmpeg -f lavfi -i "testsrc2=size=160x90:rate=10:duration=$seconds" \
+        -f lavfi -i "sine=440:duration=$seconds" "${@:3:$#-3}" -g "$group" -c:a mp2 -b:a 64k "$file"
+}
+
+broadcast_h264() { broadcast "$1" "$2" -c:v libx264 -preset veryfast -crf 20 -sc_threshold 0 "$3"; }
+# MPEG-2 has no rate below 23.976.
+broadcast_mpeg2() { broadcast "$1" "$2" -r 25 -c:v mpeg2video -q:v 3 -bf 2 -sc_threshold 1000000000 "$3"; }
+
+make_stream_ts() { broadcast_h264 9 20 "$1"; }
+make_stream_m2ts() { broadcast_h264 9 20 "$1"; }
+make_stream_mpg() { broadcast_mpeg2 9 50 "$1"; }
+make_stream_vob() { broadcast_mpeg2 9 50 "$1"; }
+# A key frame at the start and after 20 seconds.
+make_distant_ts() { broadcast_h264 24 200 "$1"; }
+make_distant_m2ts() { broadcast_h264 24 200 "$1"; }
+make_distant_mpg() { broadcast_mpeg2 24 500 "$1"; }
+make_distant_vob() { broadcast_mpeg2 24 500 "$1"; }
+
+# A second of small video that is stored otherwise than it is to be shown. The
+# arguments: six numbers of the display matrix (a b c d x y), the file.
+turned() {
+    need lying.mp4
+    python3 "$here/set-display-matrix.py" "$folder/lying.mp4" "${@:1:6}" "$7"
+}
+
+make_lying_mp4() {
+    # shellcheck disable=SC2046
+    quiet_ffmpeg -f lavfi -i "$(moving 160x90 1)" $(h264) "$1"
+}
+
+make_lying90_mp4() { turned 0 1 -1 0 90 0 "$1"; }
+make_lying180_mp4() { turned -1 0 0 -1 160 90 "$1"; }
+make_lying270_mp4() { turned 0 -1 1 0 0 160 "$1"; }
+make_mirrored_mp4() { turned -1 0 0 1 160 0 "$1"; }
+make_flipped_mp4() { turned 1 0 0 -1 0 90 "$1"; }
+make_lying90mirrored_mp4() { turned 0 1 1 0 0 0 "$1"; }
+
+# Pixels that are not square, to be shown as 120x90.
+make_wide_pixels_mkv() {
+    # shellcheck disable=SC2046
+    quiet_ffmpeg -f lavfi -i "$(moving 160x90 1),setsar=3/4" $(h264) "$1"
+}
+
+make_deep_422_mkv() {
+    quiet_ffmpeg -f lavfi -i "$(moving 160x90 1)" -c:v libx264 -preset veryfast -crf 16 \
+        -pix_fmt yuv422p10le "$1"
+}
+
+make_full_444_mkv() {
+    quiet_ffmpeg -f lavfi -i "$(moving 160x90 1)" -vf scale=out_color_matrix=bt709:out_range=pc \
+        -c:v libx264 -preset veryfast -crf 16 -pix_fmt yuv444p -color_range pc -colorspace bt709 \
+        -color_primaries bt709 -color_trc bt709 "$1"
+}
+
+# Video of high dynamic range whose white has 1000 cd/m². The arguments: the
+# transfer's name for zscale and ffmpeg, further parameters of x265, the file.
+high_range() {
+    quiet_ffmpeg -f lavfi -i "$(moving 160x90 1)" \
+        -vf "format=gbrp,zscale=tin=bt709:pin=bt709:min=gbr:rin=full:t=linear:p=bt709:npl=1000,format=gbrpf32le,zscale=tin=linear:pin=bt709:min=gbr:t=$1:p=bt2020:m=bt2020nc:r=limited:npl=1000,format=yuv420p10le" \
+        -c:v libx265 -preset ultrafast -crf 16 -color_range tv -color_primaries bt2020 \
+        -color_trc "$1" -colorspace bt2020nc \
+        -x265-params "log-level=none:colorprim=bt2020:transfer=$1:colormatrix=bt2020nc:range=limited$2" \
+        -tag:v hvc1 "$3"
+}
+
+make_hdr_pq_mkv() { high_range smpte2084 "" "$1"; }
+make_hdr_hlg_mkv() { high_range arib-std-b67 "" "$1"; }
+make_hdr10_mp4() {
+    high_range smpte2084 ":hdr10=1:master-display=G(13250,34500)B(7500,3000)R(34000,16000)WP(15635,16450)L(40000000,50):max-cll=4000,400" "$1"
+}
+
+# Two fields of different moments in each picture. The arguments: which comes
+# first (tff or bff), the codec's options, the file.
+interlaced() {
+    quiet_ffmpeg -f lavfi -i "testsrc2=size=160x96:rate=50:duration=1" -vf "interlace=scan=$1" \
+        -flags +ildct+ilme -g 12 "${@:2}"
+}
+
+make_fields_top_mkv() {
+    interlaced tff -c:v libx264 -preset veryfast -crf 16 -x264-params tff=1 -field_order tt \
+        -pix_fmt yuv420p "$1"
+}
+
+make_fields_bottom_mpg() { interlaced bff -c:v mpeg2video -q:v 2 -field_order bb "$1"; }
+
+make_h263_3gp() {
+    quiet_ffmpeg -f lavfi -i "$(moving 176x144 1)" -c:v h263 -q:v 3 "$1"
+}
+
+# High-efficiency AAC declares half of the rate that it is played at. Debian has no
+# encoder: this marks AAC of 22050 Hz as extended to 44100 (the bits behind the
+# sync word 0x2b7 of ISO/IEC 14496-3 say "not extended" in what ffmpeg writes).
+make_he_aac_m4a() {
+    quiet_ffmpeg -f lavfi -i "sine=440:duration=1:sample_rate=22050" -c:a aac -ac 2 "$1"
+    LC_ALL=C sed -i 's/\x56\xe5\x00/\x56\xe5\xa0/' "$1"
+}
+
+# Attached files: a font, and a text that says nothing of its type.
+make_fonts_mkv() {
+    need silent.mkv
+    quiet_ffmpeg -i "$folder/silent.mkv" -c copy \
+        -attach /usr/share/fonts/truetype/dejavu/DejaVuSans.ttf \
+        -metadata:s:t:0 mimetype=application/x-truetype-font \
+        -metadata:s:t:0 filename="Größe ＡＢ.ttf" "$1"
+}
+
+# Video with a language and a title of its own.
+make_spoken_mkv() {
+    need silent.mkv
+    quiet_ffmpeg -i "$folder/silent.mkv" -c copy -metadata:s:v language=fra \
+        -metadata:s:v title=$'Première \\ prise' "$1"
 }
 
 make_noise_bin() { yes 'neither sound nor picture' | head -c 65536 >"$1"; }

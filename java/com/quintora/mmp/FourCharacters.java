@@ -4,6 +4,7 @@ package com.quintora.mmp;
 /** Codec numbers of four characters, the first in the low byte. */
 final class FourCharacters {
     static final int CHAPTER = 'c' | 'h' << 8 | 'a' << 16 | 'p' << 24;
+    static final int DESCRIPTION = 'd' | 'e' << 8 | 's' << 16 | 'c' << 24;
 
     private FourCharacters() {}
 

@@ -14,6 +14,8 @@ import java.util.OptionalInt;
 public final class Tracks {
     // Where the engine's indices of chapters begin, among those of subtitle tracks.
     private static final int CHAPTER_INDEX_BASE = 0x10000;
+    // Where the pieces of the description begin, among the same.
+    private static final int DESCRIPTION_INDEX_BASE = 0x20000;
     private static final double FRAME_RATE_UNIT = 1000;
 
     private final OrvMediaPlayer player;
@@ -23,6 +25,7 @@ public final class Tracks {
     private final List<VideoTrack> video = new ArrayList<>();
     private final List<SubtitleTrack> subtitles = new ArrayList<>();
     private Chapter chapter;
+    private String descriptionPiece;
     private MediaMetadata metadata;
 
     Tracks(OrvMediaPlayer player) {
@@ -116,6 +119,25 @@ public final class Tracks {
     }
 
     /**
+     * What the media's container and streams say beyond the tables: pixel formats, colours,
+     * turning, attachments and so on.
+     *
+     * @return the description; empty before the media is prepared, for media that cannot be read
+     *     twice (pipes, streams that do not seek), and with engines that have none
+     */
+    public synchronized Optional<MediaDescription> description() {
+        StringBuilder text = new StringBuilder();
+        int[] piece = {DESCRIPTION_INDEX_BASE};
+        do {
+            descriptionPiece = null;
+            player.ask("description()", () -> player.native_getSubtitleTrackInfo(piece[0]));
+            piece[0]++;
+            text.append(descriptionPiece == null ? "" : descriptionPiece);
+        } while (descriptionPiece != null);
+        return DescriptionText.parse(text.toString());
+    }
+
+    /**
      * Plays another sound track.
      *
      * @param index its number among the sound tracks, from 0
@@ -172,10 +194,14 @@ public final class Tracks {
                 bitRate, new TrackFlags(flags)));
     }
 
-    /** Chapters come as subtitle tracks of a codec of their own. */
+    /** Chapters and the description come as subtitle tracks of codecs of their own. */
     void addSubtitle(int index, int trackId, int codec, String text, int flags) {
         if (codec == FourCharacters.CHAPTER) {
             chapter = new Chapter(0, trackId, flags, text);
+            return;
+        }
+        if (codec == FourCharacters.DESCRIPTION) {
+            descriptionPiece = text;
             return;
         }
         int separator = text.indexOf(';');

@@ -17,6 +17,8 @@ final class InfoTable {
         info.video().forEach(table::addVideo);
         info.audio().forEach(table::addAudio);
         info.subtitles().forEach(table::addSubtitle);
+        info.pictures().forEach(table::addPicture);
+        info.attachments().forEach(table::addAttachment);
         info.chapters().forEach(table::addChapter);
         return table.lines;
     }
@@ -29,22 +31,44 @@ final class InfoTable {
         info.metadata().forEach((name, value) -> add(name, value.toString()));
     }
 
-    private void addVideo(MediaInfo.Video track) {
+    private void addVideo(VideoInfo track) {
         add(
                 "video " + track.index(),
                 join(
-                        track.codec(),
-                        track.width() + "x" + track.height(),
+                        CodecNames.of(track.codec(), track.codecName(), track.fourcc()),
+                        text(track.profile()),
+                        named(text(track.language()), text(track.title())),
+                        InfoWords.size(track),
                         track.frameRate() > 0 ? number(track.frameRate()) + " fps" : "",
+                        InfoWords.look(track),
                         bitRate(track.bitRate()),
                         String.join(", ", track.flags())));
     }
 
-    private void addAudio(MediaInfo.Audio track) {
+    private void addPicture(VideoInfo picture) {
+        add(
+                "picture",
+                join(
+                        CodecNames.of(picture.codec(), picture.codecName(), ""),
+                        text(picture.title()),
+                        InfoWords.size(picture)));
+    }
+
+    private void addAttachment(MediaInfo.Attachment file) {
+        add(
+                "attachment",
+                join(
+                        text(file.fileName()),
+                        text(file.mimeType()),
+                        file.sizeBytes() == null ? "" : file.sizeBytes() + " bytes"));
+    }
+
+    private void addAudio(AudioInfo track) {
         add(
                 "audio " + track.index(),
                 join(
-                        track.codec(),
+                        CodecNames.of(track.codec(), track.codecName(), track.fourcc()),
+                        text(track.profile()),
                         named(track.language(), track.title()),
                         track.channelLayout().isEmpty()
                                 ? track.channels() + " channels"
@@ -58,7 +82,7 @@ final class InfoTable {
         add(
                 "subtitles " + track.index(),
                 join(
-                        track.codec(),
+                        CodecNames.of(track.codec(), track.codecName(), track.fourcc()),
                         named(track.language(), track.title()),
                         String.join(", ", track.flags())));
     }
@@ -72,6 +96,10 @@ final class InfoTable {
         if (!text.isEmpty()) {
             lines.add(String.format("%-12s  %s", name, text));
         }
+    }
+
+    private static String text(String value) {
+        return value == null ? "" : value;
     }
 
     private static String named(String language, String title) {

@@ -1,68 +1,74 @@
 // SPDX-License-Identifier: Apache-2.0
 package com.quintora.orv.player;
 
-import com.quintora.mmp.AudioTrack;
 import com.quintora.mmp.Chapter;
+import com.quintora.mmp.MediaDescription;
 import com.quintora.mmp.MediaMetadata;
+import com.quintora.mmp.MediaStream;
 import com.quintora.mmp.OrvMediaPlayer;
 import com.quintora.mmp.SubtitleTrack;
 import com.quintora.mmp.TrackFlags;
-import com.quintora.mmp.VideoTrack;
 import java.util.ArrayList;
 import java.util.LinkedHashMap;
 import java.util.List;
 import java.util.Map;
+import java.util.Optional;
 
-/** All that a player knows of its media; its JSON form is what info --json prints. */
+/**
+ * All that a player knows of its media; its JSON form is what info --json prints. What is unknown
+ * is null and left out of that, or 0 or empty where programs know it so. Names of formats, codecs
+ * and colours are FFmpeg's.
+ */
 record MediaInfo(
         String source,
         String container,
+        String format,
         int durationMs,
+        Long startUs,
         int bitRate,
+        Long sizeBytes,
         Map<String, Object> metadata,
-        List<Video> video,
-        List<Audio> audio,
+        List<VideoInfo> video,
+        List<AudioInfo> audio,
         List<Subtitle> subtitles,
+        List<VideoInfo> pictures,
+        List<Attachment> attachments,
         List<Mark> chapters) {
 
-    record Video(
+    /** stream is the place in the container, codec FFmpeg's name, fourcc the engine's code. */
+    record Subtitle(
             int index,
-            String codec,
-            int width,
-            int height,
-            double frameRate,
-            int bitRate,
-            List<String> flags) {}
-
-    record Audio(
-            int index,
+            Integer stream,
             String codec,
             String codecName,
+            String fourcc,
             String language,
             String title,
-            int channels,
-            String channelLayout,
-            int sampleRate,
-            int bitsPerSample,
-            int bitRate,
             List<String> flags) {}
 
-    record Subtitle(int index, String codec, String language, String title, List<String> flags) {}
+    record Attachment(int stream, String fileName, String mimeType, Long sizeBytes) {}
 
     record Mark(int index, String title, int startMs, int endMs) {}
 
     static MediaInfo of(String source, OrvMediaPlayer player) {
         var tracks = player.tracks();
         var metadata = tracks.metadata();
+        var description = tracks.description();
+        var streams = new Streams(description.map(MediaDescription::streams).orElse(List.of()));
         return new MediaInfo(
                 source,
                 metadata.map(MediaMetadata::container).orElse(""),
+                description.map(MediaDescription::format).orElse(null),
                 player.getDuration(),
+                description.map(found -> Streams.orNull(found.startMicros())).orElse(null),
                 metadata.map(MediaMetadata::bitRate).orElse(0),
+                description.map(found -> Streams.orNull(found.size())).orElse(null),
                 metadata.map(MediaInfo::known).orElse(Map.of()),
-                tracks.video().stream().map(MediaInfo::video).toList(),
-                tracks.audio().stream().map(MediaInfo::audio).toList(),
-                tracks.subtitles().stream().map(MediaInfo::subtitle).toList(),
+                tracks.video().stream().map(track -> VideoInfo.of(track, streams)).toList(),
+                tracks.audio().stream().map(track -> AudioInfo.of(track, streams)).toList(),
+                tracks.subtitles().stream().map(track -> subtitle(track, streams)).toList(),
+                streams.of(MediaStream.Kind.PICTURE).map(VideoInfo::of).toList(),
+                streams.of(MediaStream.Kind.ATTACHMENT).map(MediaInfo::attachment).toList(),
                 tracks.chapters().stream().map(MediaInfo::mark).toList());
     }
 
@@ -81,39 +87,26 @@ record MediaInfo(
         return known;
     }
 
-    private static Video video(VideoTrack track) {
-        return new Video(
-                track.index(),
-                track.codec().strip(),
-                track.width(),
-                track.height(),
-                track.frameRate(),
-                track.bitRate(),
-                flags(track.flags()));
-    }
-
-    private static Audio audio(AudioTrack track) {
-        return new Audio(
-                track.index(),
-                track.codec().strip(),
-                track.codecName(),
-                track.language(),
-                track.title(),
-                track.channels(),
-                track.channelLayout(),
-                track.sampleRate(),
-                track.bitsPerSample(),
-                track.bitRate(),
-                flags(track.flags()));
-    }
-
-    private static Subtitle subtitle(SubtitleTrack track) {
+    private static Subtitle subtitle(SubtitleTrack track, Streams streams) {
+        Optional<MediaStream> stream = streams.of(MediaStream.Kind.SUBTITLE, track.index());
         return new Subtitle(
                 track.index(),
+                stream.map(MediaStream::index).orElse(null),
+                stream.map(MediaStream::codec).orElse(null),
+                stream.map(MediaStream::codecName).orElse(null),
                 track.codec().strip(),
                 track.language(),
                 track.title(),
                 flags(track.flags()));
+    }
+
+    private static Attachment attachment(MediaStream stream) {
+        var file = stream.attachment().orElseThrow();
+        return new Attachment(
+                stream.index(),
+                file.fileName().orElse(null),
+                file.mimeType().orElse(null),
+                Streams.orNull(file.size()));
     }
 
     private static Mark mark(Chapter chapter) {
@@ -121,7 +114,7 @@ record MediaInfo(
                 chapter.index(), chapter.title(), chapter.startMillis(), chapter.endMillis());
     }
 
-    private static List<String> flags(TrackFlags flags) {
+    static List<String> flags(TrackFlags flags) {
         List<String> names = new ArrayList<>();
         if (flags.isDefault()) {
             names.add("default");

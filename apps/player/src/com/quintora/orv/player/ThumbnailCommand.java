@@ -2,7 +2,10 @@
 package com.quintora.orv.player;
 
 import com.quintora.mmp.ColorMode;
+import com.quintora.mmp.MediaDescription;
+import com.quintora.mmp.MediaStream;
 import com.quintora.mmp.OrvMediaPlayer;
+import com.quintora.mmp.PictureDetails;
 import com.quintora.mmp.Pictures;
 import com.quintora.mmp.Thumbnail;
 import java.awt.image.BufferedImage;
@@ -12,6 +15,8 @@ import java.nio.ByteBuffer;
 import java.nio.ByteOrder;
 import java.nio.file.Files;
 import java.nio.file.Path;
+import java.util.List;
+import java.util.Optional;
 import java.util.concurrent.Callable;
 import javax.imageio.ImageIO;
 import picocli.CommandLine.Command;
@@ -105,11 +110,25 @@ final class ThumbnailCommand implements Callable<Integer> {
                 .orElseThrow(() -> new Failure("no picture could be made of '" + source + "'"));
     }
 
+    /** As displayed: turned, and with the pixels made square. */
     private static Size shapeOf(OrvMediaPlayer player) {
         double ratio = (double) player.getVideoWidth() / player.getVideoHeight();
+        PictureDetails picture = shownPicture(player).orElse(null);
+        if (picture != null && picture.displayHeight() > 0) {
+            ratio = (double) picture.displayWidth() / picture.displayHeight();
+        }
         int width = (int) Math.round(USUAL_HEIGHT * ratio);
         return new Size(
                 Math.max(1, Math.min(Pictures.MAX_THUMBNAIL_WIDTH, width)), USUAL_HEIGHT);
+    }
+
+    private static Optional<PictureDetails> shownPicture(OrvMediaPlayer player) {
+        var shown = player.tracks().video().stream().filter(track -> track.flags().isSelected());
+        List<MediaStream> streams =
+                player.tracks().description().map(MediaDescription::streams).orElse(List.of());
+        return shown.findFirst()
+                .flatMap(track -> new Streams(streams).of(MediaStream.Kind.VIDEO, track.index()))
+                .flatMap(MediaStream::picture);
     }
 
     private void write(Thumbnail picture) throws Failure {
