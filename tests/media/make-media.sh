@@ -3,7 +3,7 @@
 #
 # Makes the media of the tests: make-media.sh FOLDER [FILE...]
 #
-# Without names, all of them. A file that is there already is kept. Each file
+# Without names, all of them; --list instead of the folder names them. A file that is there already is kept. Each file
 # has a function of its own; it appears whole or not at all, so that several
 # tests may ask for the same file at the same time.
 set -eu
@@ -250,8 +250,12 @@ high_range() {
 
 make_hdr_pq_mkv() { high_range smpte2084 "" "$1"; }
 make_hdr_hlg_mkv() { high_range arib-std-b67 "" "$1"; }
+# What it was mastered for, in its frames and in the container.
 make_hdr10_mp4() {
-    high_range smpte2084 ":hdr10=1:master-display=G(13250,34500)B(7500,3000)R(34000,16000)WP(15635,16450)L(40000000,50):max-cll=4000,400" "$1"
+    local frames=$1.frames.mp4
+    high_range smpte2084 ":hdr10=1:master-display=G(13250,34500)B(7500,3000)R(34000,16000)WP(15635,16450)L(40000000,50):max-cll=4000,400" "$frames"
+    python3 "$here/add-light-boxes.py" "$frames" 0.005 4000 4000 400 "$1"
+    rm "$frames"
 }
 
 # Two fields of different moments in each picture. The arguments: which comes
@@ -549,6 +553,10 @@ need() {
 }
 
 [ $# -ge 1 ] || { echo "usage: make-media.sh FOLDER [FILE...]" >&2; exit 2; }
+if [ "$1" = --list ]; then
+    xargs -n 1 <<<"$FILES"
+    exit
+fi
 folder=$1
 here=$(dirname -- "$(readlink -f -- "${BASH_SOURCE[0]}")")
 shift

@@ -2,6 +2,7 @@
 #include "inspect/StreamDescription.h"
 
 #include <stdlib.h>
+#include <string.h>
 
 #include <algorithm>
 #include <string>
@@ -84,6 +85,12 @@ const char* fieldOrderOf(const AVCodecParameters& codec) {
         default:
             return nullptr;
     }
+}
+
+// "und" is the code for no known language.
+const char* languageOf(const AVStream& stream) {
+    const char* code = tagOf(stream.metadata, "language");
+    return strcmp(code, "und") == 0 ? "" : code;
 }
 
 void describeCodec(const AVCodecParameters& codec, DescriptionWriter& writer) {
@@ -202,7 +209,7 @@ void describeStream(const AVFormatContext& media, const AVStream& stream,
     writer.number("index", stream.index);
     writer.text("kind", kindOf(stream));
     describeCodec(codec, writer);
-    writer.text("language", tagOf(stream.metadata, "language"));
+    writer.text("language", languageOf(stream));
     writer.text("title", tagOf(stream.metadata, "title"));
     writer.text("flags", flagsOf(stream));
     writer.time("startUs", stream.start_time, stream.time_base);

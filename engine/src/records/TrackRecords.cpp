@@ -141,7 +141,7 @@ void addVideoDetails(const AVStream& stream, VideoCodecInfo& record) {
     if (rate.num > 0 && rate.den > 0) {
         record.mFrameRate = toInt32(av_rescale(rate.num, 1000, rate.den));
     }
-    if (record.mBitRate == 0) record.mBitRate = toInt32(bitRateOf(stream));
+    if (bitRateOf(stream) > 0) record.mBitRate = toInt32(bitRateOf(stream));
 }
 
 // The rate as decoded: high-efficiency AAC declares half of it.
@@ -149,7 +149,7 @@ void addAudioDetails(const AVStream& stream, AudioTrackInfo& record) {
     const AVCodecParameters& codec = *stream.codecpar;
     if (codec.sample_rate > 0) record.mSampleRate = codec.sample_rate;
     if (codec.ch_layout.nb_channels > 0) record.mChannels = codec.ch_layout.nb_channels;
-    if (record.mBitRate == 0) record.mBitRate = toInt32(bitRateOf(stream));
+    if (bitRateOf(stream) > 0) record.mBitRate = toInt32(bitRateOf(stream));
     record.mBitsPerSample = sampleBits(codec);
 }
 
