@@ -5,6 +5,7 @@
 #include <utility>
 
 #include "inspect/AlbumArt.h"
+#include "inspect/KeyFrames.h"
 #include "inspect/PictureCanvas.h"
 
 namespace android {
@@ -40,6 +41,12 @@ TarnPlayer::Engine::Engine(int decoder, orvtarn::Notifier::Deliver deliver)
                 found = orvtarn::frameFrom(file, tracks.shownVideoStream(), seconds, amount);
             });
         }
+        return found;
+    });
+    seeker.setKeyFrameBefore([this](double seconds) {
+        std::optional<double> found;
+        loader.secondReading()->withFile(
+            [&](orvtarn::MediaFile& file) { found = orvtarn::keyFrameBefore(file, seconds); });
         return found;
     });
     if (!create(decoder >= 0)) {

@@ -51,6 +51,29 @@ TEST_F(SeekTest, ClosestGoesToTheFrameItself) {
     EXPECT_NEAR(5500, positionAfter(5500, Mode::SEEK_CLOSEST), 34);
 }
 
+// Without an index a guess leads to the key frame after the time, and past the
+// last one there is none.
+TEST_F(SeekTest, FindsKeyFramesAndFramesInFormatsWithoutAnIndex) {
+    struct Expected {
+        int msec, previous, closest;
+    };
+    // The sound begins 11 ms before the picture.
+    const Expected stream[] = {
+        {7300, 6011, 7311}, {8600, 8011, 8611}, {1400, 11, 1411}, {2500, 2011, 2511}};
+    open("stream.ts");
+    for (const Expected& one : stream) {
+        EXPECT_NEAR(one.previous, positionAfter(one.msec, Mode::SEEK_PREVIOUS_SYNC), 1) << one.msec;
+        EXPECT_NEAR(one.closest, positionAfter(one.msec, Mode::SEEK_CLOSEST), 1) << one.msec;
+    }
+    for (const char* name : {"distant.ts", "distant.mpg"}) {
+        player->reset();
+        open(name);
+        EXPECT_NEAR(11, positionAfter(7300, Mode::SEEK_PREVIOUS_SYNC), 1) << name;
+        EXPECT_NEAR(20031, positionAfter(23500, Mode::SEEK_PREVIOUS_SYNC), 21) << name;
+        EXPECT_NEAR(19921, positionAfter(19900, Mode::SEEK_CLOSEST), 11) << name;
+    }
+}
+
 TEST_F(SeekTest, ShowsTheFrameOfTheNewPosition) {
     open("feature.mkv");
     const Picture first = sink->newest();

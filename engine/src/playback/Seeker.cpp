@@ -6,6 +6,7 @@
 
 #include <algorithm>
 #include <chrono>
+#include <string>
 
 #include "base/EngineLog.h"
 
@@ -21,6 +22,9 @@ constexpr seconds kSeekLimit{10};
 constexpr double kSameFrame = 0.001;
 // An exact seek ends at the next frame at the latest, usually.
 constexpr double kLate = 0.1;
+
+// How far ahead of a key frame mpv asks for it, in seconds.
+constexpr double kRunUp = 0.5;
 
 constexpr char kExact[] = "absolute+exact";
 constexpr char kKeyFrame[] = "absolute+keyframes";
@@ -157,10 +161,29 @@ status_t Seeker::seekToClosestSync(double target, const Turn& turn) {
 // A seek that comes right behind one of mpv's own, as when a track was
 // chosen, may lose its key frame and arrive at the next one: it is repeated.
 status_t Seeker::moveTo(double target, const char* flags, const Turn& turn) {
+    const bool isForward = flags == kForward;
+    const std::optional<double> key = isForward ? std::nullopt : keyFrameWithoutIndex(target);
+    if (key) return moveFrom(*key, flags == kKeyFrame ? *key : target, turn);
     const auto seek = [&] { return mMpv.seek(target, flags); };
     const status_t status = await("seekTo", turn, seek);
-    const bool late = flags != kForward && position() > target + kLate;
+    const bool late = !isForward && position() > target + kLate;
     return status == android::NO_ERROR && late ? await("seekTo", turn, seek) : status;
+}
+
+// To a time, decoding from a key frame that is known. In formats without an index
+// mpv itself gets to the first key frame after the time that it asks for.
+status_t Seeker::moveFrom(double key, double target, const Turn& turn) {
+    mMpv.set("hr-seek-demuxer-offset", target - key + kRunUp);
+    const status_t status = await("seekTo", turn, [&] { return mMpv.seek(target, kExact); });
+    mMpv.set("hr-seek-demuxer-offset", 0.0);
+    return status;
+}
+
+// Nothing in formats that have an index.
+std::optional<double> Seeker::keyFrameWithoutIndex(double target) const {
+    const std::string format = mMpv.getString("file-format").value_or("");
+    const bool isGuessed = format == "mpegts" || format == "mpeg";
+    return isGuessed && mKeyFrameBefore ? mKeyFrameBefore(target) : std::nullopt;
 }
 
 status_t Seeker::await(const char* operation, const Turn& turn,

@@ -6,6 +6,8 @@
 
 #include <chrono>
 #include <functional>
+#include <optional>
+#include <utility>
 
 #include "core/EventLoop.h"
 #include "core/MpvHandle.h"
@@ -23,6 +25,11 @@ public:
     Seeker(MpvHandle& mpv, PlayerState& state, Notifier& notifier, EventLoop& events,
            Transport& transport)
         : mMpv(mpv), mState(state), mNotifier(notifier), mEvents(events), mTransport(transport) {}
+
+    // Finds the last key frame at or before a time, in seconds, in media of which
+    // mpv cannot; nothing where that cannot be known. Before the first seek.
+    using KeyFrameBefore = std::function<std::optional<double>(double seconds)>;
+    void setKeyFrameBefore(KeyFrameBefore find) { mKeyFrameBefore = std::move(find); }
 
     // mode: a MediaTrack::ReadOptions::SeekMode. Times outside of the media are
     // taken as its start or end.
@@ -61,6 +68,8 @@ private:
     android::status_t seekToNextSync(double seconds, const Turn& turn);
     android::status_t seekToClosestSync(double seconds, const Turn& turn);
     android::status_t moveTo(double seconds, const char* flags, const Turn& turn);
+    android::status_t moveFrom(double key, double seconds, const Turn& turn);
+    std::optional<double> keyFrameWithoutIndex(double seconds) const;
     android::status_t await(const char* operation, const Turn& turn,
                             const std::function<int()>& command);
     double position() const;
@@ -70,6 +79,7 @@ private:
     Notifier& mNotifier;
     EventLoop& mEvents;
     Transport& mTransport;
+    KeyFrameBefore mKeyFrameBefore;
 };
 
 }  // namespace orvtarn
