@@ -203,7 +203,7 @@ make_distant_vob() { broadcast_mpeg2 24 500 "$1"; }
 
 # A second of small video that is stored otherwise than it is to be shown. The
 # arguments: six numbers of the display matrix (a b c d x y), the file.
-turned() {
+with_matrix() {
     need lying.mp4
     python3 "$here/set-display-matrix.py" "$folder/lying.mp4" "${@:1:6}" "$7"
 }
@@ -213,12 +213,12 @@ make_lying_mp4() {
     quiet_ffmpeg -f lavfi -i "$(moving 160x90 1)" $(h264) "$1"
 }
 
-make_lying90_mp4() { turned 0 1 -1 0 90 0 "$1"; }
-make_lying180_mp4() { turned -1 0 0 -1 160 90 "$1"; }
-make_lying270_mp4() { turned 0 -1 1 0 0 160 "$1"; }
-make_mirrored_mp4() { turned -1 0 0 1 160 0 "$1"; }
-make_flipped_mp4() { turned 1 0 0 -1 0 90 "$1"; }
-make_lying90mirrored_mp4() { turned 0 1 1 0 0 0 "$1"; }
+make_lying90_mp4() { with_matrix 0 1 -1 0 90 0 "$1"; }
+make_lying180_mp4() { with_matrix -1 0 0 -1 160 90 "$1"; }
+make_lying270_mp4() { with_matrix 0 -1 1 0 0 160 "$1"; }
+make_mirrored_mp4() { with_matrix -1 0 0 1 160 0 "$1"; }
+make_flipped_mp4() { with_matrix 1 0 0 -1 0 90 "$1"; }
+make_lying90mirrored_mp4() { with_matrix 0 1 1 0 0 0 "$1"; }
 
 # Pixels that are not square, to be shown as 120x90.
 make_wide_pixels_mkv() {
@@ -260,17 +260,17 @@ make_hdr10_mp4() {
 
 # Two fields of different moments in each picture. The arguments: which comes
 # first (tff or bff), the codec's options, the file.
-interlaced() {
+in_fields() {
     quiet_ffmpeg -f lavfi -i "testsrc2=size=160x96:rate=50:duration=1" -vf "interlace=scan=$1" \
         -flags +ildct+ilme -g 12 "${@:2}"
 }
 
 make_fields_top_mkv() {
-    interlaced tff -c:v libx264 -preset veryfast -crf 16 -x264-params tff=1 -field_order tt \
+    in_fields tff -c:v libx264 -preset veryfast -crf 16 -x264-params tff=1 -field_order tt \
         -pix_fmt yuv420p "$1"
 }
 
-make_fields_bottom_mpg() { interlaced bff -c:v mpeg2video -q:v 2 -field_order bb "$1"; }
+make_fields_bottom_mpg() { in_fields bff -c:v mpeg2video -q:v 2 -field_order bb "$1"; }
 
 make_h263_3gp() {
     quiet_ffmpeg -f lavfi -i "$(moving 176x144 1)" -c:v h263 -q:v 3 "$1"
