@@ -47,7 +47,7 @@ check_libraries() {
         row libraries old "$complaint"
         return 1
     fi
-    for library in mpv libavformat libavcodec libavutil libswscale; do
+    for library in mpv libavformat libavcodec libavfilter libavutil libswscale; do
         version=$(library_version "$library")
         [ -z "$version" ] || found+=("$library $version")
     done
