@@ -48,6 +48,23 @@ TEST_F(SourceTest, FileUrlsAreDecoded) {
     EXPECT_EQ(BAD_VALUE, setPath("file:///"));
 }
 
+// As /dev/stdin does: the path that such a link leads to is none.
+TEST_F(SourceTest, LinksToPipesAndDeletedFilesAreOpened) {
+    const std::string path = mediaPath("deleted.mp4");
+    outputOf("cp '" + mediaPath("silent.mp4") + "' '" + path + "'");
+    const int file = ::open(path.c_str(), O_RDONLY | O_CLOEXEC);
+    ASSERT_EQ(0, unlink(path.c_str()));
+    EXPECT_EQ(NO_ERROR, prepareUrl("/proc/self/fd/" + std::to_string(file)));
+    player->reset();
+    ::close(file);
+
+    FILE* pipe = popen(("cat '" + mediaPath("short.ts") + "' 2>/dev/null").c_str(), "r");
+    ASSERT_NE(nullptr, pipe);
+    EXPECT_EQ(NO_ERROR, prepareUrl("/proc/self/fd/" + std::to_string(fileno(pipe))));
+    player->reset();
+    pclose(pipe);
+}
+
 TEST_F(SourceTest, UnreadableFilesAreTold) {
     if (geteuid() == 0) GTEST_SKIP() << "root reads everything";
     const std::string path = mediaPath("unreadable.bin");

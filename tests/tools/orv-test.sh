@@ -168,6 +168,34 @@ stand_in ninja <<<'echo "FAILED: one.o"; grep -q ERROR:BOOL=OFF "${0%/bin/*}/con
 expect "a warning in a build for tests" 1 "the build failed" part build_targets on all
 expect "a warning in a build for playing" 0 "" part build_targets off all
 check "leaves the tests in" no "$(grep -q ORV_TESTS "$folder/configured" && echo yes || echo no)"
+# Ctrl-C goes to the shell and to what it has started; ninja ends in its own way.
+# shellcheck disable=SC2016
+stand_in ninja <<<'trap "exit 2" INT; kill -INT $PPID; kill -INT $$'
+# interruptible COMMAND…: with Ctrl-C in force, whatever started this test ignores.
+interruptible() { env --default-signal=INT "$@"; }
+expect "Ctrl-C while it builds" 130 "" interruptible "$root/orv" info none.mkv
+check "is no broken build" 0 "$(grep -c failed "$folder/said")"
+
+# Another build holds the lock until a condition is met.
+stand_in ninja <<<'exit 0'
+lock=$ORV_BUILD/.lock
+# while_locked_until COMMAND…: the lock is let go when that succeeds.
+while_locked_until() {
+    exec {held}>"$lock"
+    flock "$held"
+    (until "$@"; do sleep 0.05; done) &
+    local waits=$!
+    exec {held}>&-
+    expect "a second build" 0 "" part build_targets off all
+    wait "$waits"
+}
+somebody_waits() { grep -q -- "-> FLOCK.*:$(stat -c %i "$lock") " /proc/locks; }
+it_says_so() { grep -q 'waiting for another build' "$folder/said"; }
+while_locked_until somebody_waits
+check "a short wait is no news" no "$(it_says_so && echo yes || echo no)"
+while_locked_until it_says_so
+check "a long one is" yes "$(it_says_so && echo yes || echo no)"
+
 stand_in cmake <<<'echo "CMake Error: no such library"; exit 1'
 rm "$ORV_BUILD/build.ninja"
 expect "a configuration that fails" 1 "the build could not be configured" part build_targets off all

@@ -10,7 +10,8 @@ build_targets() {
     shift
     mkdir -p -- "$ORV_BUILD/log"
     exec {build_lock}>"$ORV_BUILD/.lock"
-    flock -n "$build_lock" || { say "waiting for another build to end" && flock "$build_lock"; }
+    # Another that finds nothing to build is done before anybody wonders.
+    flock -w 3 "$build_lock" || { say "waiting for another build to end" && flock "$build_lock"; }
     configure "$with_tests"
     if [ "$with_tests" = on ]; then
         ninja_quietly "$@" || die_of_build

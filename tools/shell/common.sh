@@ -14,6 +14,15 @@ die_usage() {
     exit 2
 }
 
+# After Ctrl-C, which has ended the program in the foreground, too.
+interrupted() {
+    local watchers
+    mapfile -t watchers < <(jobs -p)
+    [ ${#watchers[@]} -eq 0 ] || kill "${watchers[@]}" 2>/dev/null || true
+    [ ! -t 2 ] || printf '\r\033[K' >&2
+    exit 130
+}
+
 # use packages build …: reads those helpers of tools/shell, each once.
 USED=' '
 use() {
@@ -41,7 +50,7 @@ run_logged() {
 follow_to() {
     local log=$1 status=0 watcher=
     shift
-    mkdir -p -- "$(dirname -- "$log")"
+    mkdir -p -- "${log%/*}"
     : >"$log"
     if [ -t 2 ]; then
         tail -n +1 -f --pid=$$ "$log" > >(show_progress) 2>/dev/null &

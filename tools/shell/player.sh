@@ -34,11 +34,14 @@ archive_classes() {
         return 0
     rm -f -- "$ORV_BUILD"/java/player-*.jsa
     local draft=$CLASS_ARCHIVE.$$
+    # shellcheck disable=SC2064
+    trap "rm -f -- ${draft@Q}" EXIT
     if "${JAVA_COMMAND[@]/#-XX:SharedArchiveFile=*/-XX:ArchiveClassesAtExit=$draft}" play --help \
         >/dev/null 2>&1; then
         mv -f -- "$draft" "$CLASS_ARCHIVE"
     fi
     rm -f -- "$draft"
+    trap - EXIT
 }
 
 # Java itself cannot tell how wide its terminal is, nor whether it has one.

@@ -9,6 +9,9 @@
 #include <unistd.h>
 #include <utils/Errors.h>
 
+#include <filesystem>
+#include <system_error>
+
 #include "source/FileName.h"
 #include "source/Playlist.h"
 #include "source/UrlScheme.h"
@@ -33,6 +36,15 @@ int statusOfErrno(int error) {
         return android::NAME_NOT_FOUND;
     }
     return -error;
+}
+
+// Links of /proc to pipes and deleted files can be opened, but lead to no path.
+std::string absolutePath(const std::string& path) {
+    char resolved[PATH_MAX];
+    if (realpath(path.c_str(), resolved) != nullptr) return resolved;
+    std::error_code error;
+    const std::string absolute = std::filesystem::absolute(path, error).string();
+    return error ? path : absolute;
 }
 
 }  // namespace
@@ -98,14 +110,11 @@ int resolveName(const char* url, std::string& name) {
         if (!isOpenedScheme(schemeOf(name))) return ORV_ERROR_SCHEME;
         return android::NO_ERROR;
     }
-    char resolved[PATH_MAX];
     struct stat status;
-    if (realpath(path.c_str(), resolved) == nullptr || stat(resolved, &status) != 0) {
-        return statusOfErrno(errno);
-    }
+    if (stat(path.c_str(), &status) != 0) return statusOfErrno(errno);
     if (S_ISDIR(status.st_mode)) return android::BAD_VALUE;
-    if (access(resolved, R_OK) != 0) return statusOfErrno(errno);
-    name = resolved;
+    if (access(path.c_str(), R_OK) != 0) return statusOfErrno(errno);
+    name = absolutePath(path);
     return android::NO_ERROR;
 }
 

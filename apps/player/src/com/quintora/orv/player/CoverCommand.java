@@ -2,8 +2,6 @@
 package com.quintora.orv.player;
 
 import com.quintora.mmp.OrvMediaPlayer;
-import java.io.IOException;
-import java.nio.file.Files;
 import java.nio.file.Path;
 import java.util.concurrent.Callable;
 import picocli.CommandLine.Command;
@@ -15,10 +13,10 @@ import picocli.CommandLine.Parameters;
         name = "cover",
         description = "Writes the picture inside a file, such as an album's cover, byte for byte.")
 final class CoverCommand implements Callable<Integer> {
-    @Parameters(paramLabel = "FILE", description = "A media file or URL.")
+    @Parameters(paramLabel = "FILE", description = "A media file or URL; - for standard input.")
     private String source;
 
-    @Parameters(paramLabel = "OUT", description = "Where to write the picture.")
+    @Parameters(paramLabel = "OUT", description = "Where to write the picture; - for standard output.")
     private Path out;
 
     @Mixin private CommonOptions common;
@@ -30,9 +28,7 @@ final class CoverCommand implements Callable<Integer> {
                     player.pictures()
                             .embedded()
                             .orElseThrow(() -> noPicture(source));
-            Files.write(out, picture);
-        } catch (IOException e) {
-            throw Failure.writing(out, e);
+            OutputFile.write(out, picture);
         }
         return 0;
     }

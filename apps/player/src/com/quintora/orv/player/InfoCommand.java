@@ -17,7 +17,7 @@ import picocli.CommandLine.Spec;
         name = "info",
         description = "Tells the container, duration, tracks, chapters and metadata of media.")
 final class InfoCommand implements Callable<Integer> {
-    @Parameters(paramLabel = "FILE|URL", description = "A media file or URL.")
+    @Parameters(paramLabel = "FILE|URL", description = "A media file or URL; - for standard input.")
     private String source;
 
     @Option(names = "--json", description = "For programs: one JSON object.")

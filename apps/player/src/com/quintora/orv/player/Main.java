@@ -1,6 +1,7 @@
 // SPDX-License-Identifier: Apache-2.0
 package com.quintora.orv.player;
 
+import java.io.PrintWriter;
 import picocli.CommandLine;
 import picocli.CommandLine.Command;
 import picocli.CommandLine.ParameterException;
@@ -23,11 +24,25 @@ public final class Main {
     private Main() {}
 
     public static void main(String[] arguments) {
-        System.exit(commandLine().execute(arguments));
+        CommandLine commands = commandLine();
+        int status = commands.execute(arguments);
+        commands.getOut().flush();
+        System.exit(status == 0 && outputIsLost() ? CommandLine.ExitCode.SOFTWARE : status);
+    }
+
+    // Streams of characters swallow what goes wrong, such as a full disk.
+    private static boolean outputIsLost() {
+        if (!System.out.checkError()) {
+            return false;
+        }
+        System.err.println("orv: cannot write to standard output");
+        return true;
     }
 
     static CommandLine commandLine() {
         return new CommandLine(new Main())
+                // In one piece, for readers that close a pipe after the first lines.
+                .setOut(new PrintWriter(System.out))
                 .setUsageHelpWidth(100)
                 .registerConverter(int.class, Main::wholeNumber)
                 .registerConverter(Integer.class, Main::wholeNumber)

@@ -8,11 +8,16 @@ import java.io.IOException;
 final class Media {
     private Media() {}
 
-    /** Gives a prepared player, which the caller closes. Blocks until the media is open. */
+    /** Gives a prepared player, which the caller closes. Blocks until the media is open, and before
+     * that until a pipe has been read to its end. */
     static OrvMediaPlayer open(String source) throws Failure {
         OrvMediaPlayer player = new OrvMediaPlayer();
         try {
-            player.setDataSource(source);
+            if (StandardInput.isPipe(source)) {
+                player.setDataSource(StandardInput.kept(source));
+            } else {
+                player.setDataSource(StandardInput.path(source));
+            }
             player.prepare();
             return player;
         } catch (IOException | SecurityException e) {

@@ -14,7 +14,9 @@ public final class PlayOptions {
     @Parameters(
             arity = "0..1",
             paramLabel = "FILE|URL",
-            description = "What to play; without it, a sample that is made on the spot.")
+            description =
+                    "What to play, - for standard input; without it, a sample that is made on the"
+                            + " spot.")
     String source;
 
     @Option(
@@ -89,6 +91,9 @@ public final class PlayOptions {
 
     /** What stands in a window's title bar: the file's name, or the whole URL. */
     public String title() {
+        if (StandardInput.isNamed(source)) {
+            return "standard input";
+        }
         return source.contains("://") ? source : String.valueOf(Path.of(source).getFileName());
     }
 

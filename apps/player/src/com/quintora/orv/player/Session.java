@@ -159,10 +159,14 @@ public final class Session implements AutoCloseable {
         if (options.pcm != null) {
             player.setPcmFormat(options.pcm);
         }
-        if (options.stream) {
-            player.setDataSource(openStream(options.source));
+        String source = StandardInput.path(options.source);
+        boolean once = StandardInput.isPipe(options.source);
+        if (once && (options.stream || StandardInput.isNamed(options.source))) {
+            player.setDataSource(StandardInput.streamed(options.source));
+        } else if (options.stream) {
+            player.setDataSource(openStream(source));
         } else {
-            player.setDataSource(options.source);
+            player.setDataSource(source);
         }
     }
 

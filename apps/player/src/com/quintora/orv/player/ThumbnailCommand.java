@@ -10,10 +10,11 @@ import com.quintora.mmp.Pictures;
 import com.quintora.mmp.Thumbnail;
 import java.awt.image.BufferedImage;
 import java.awt.image.DataBufferInt;
+import java.io.ByteArrayOutputStream;
 import java.io.IOException;
+import java.io.UncheckedIOException;
 import java.nio.ByteBuffer;
 import java.nio.ByteOrder;
-import java.nio.file.Files;
 import java.nio.file.Path;
 import java.util.List;
 import java.util.Optional;
@@ -34,10 +35,10 @@ import picocli.CommandLine.Spec;
 final class ThumbnailCommand implements Callable<Integer> {
     private static final int USUAL_HEIGHT = 180;
 
-    @Parameters(paramLabel = "FILE", description = "A media file or URL.")
+    @Parameters(paramLabel = "FILE", description = "A media file or URL; - for standard input.")
     private String source;
 
-    @Parameters(paramLabel = "OUT.png", description = "Where to write the picture.")
+    @Parameters(paramLabel = "OUT.png", description = "Where to write the picture; - for standard output.")
     private Path out;
 
     @Option(
@@ -63,13 +64,13 @@ final class ThumbnailCommand implements Callable<Integer> {
         check();
         try (OrvMediaPlayer player = Media.open(source)) {
             seek(player);
-            write(draw(player));
+            OutputFile.write(out, png(draw(player)));
         }
         return 0;
     }
 
     private void check() {
-        if (!out.toString().toLowerCase().endsWith(".png")) {
+        if (!OutputFile.isStandardOutput(out) && !out.toString().toLowerCase().endsWith(".png")) {
             throw new ParameterException(
                     spec.commandLine(), "a thumbnail is a PNG file; '" + out + "' is not named so");
         }
@@ -131,7 +132,7 @@ final class ThumbnailCommand implements Callable<Integer> {
                 .flatMap(MediaStream::picture);
     }
 
-    private void write(Thumbnail picture) throws Failure {
+    private static byte[] png(Thumbnail picture) {
         BufferedImage image =
                 new BufferedImage(picture.width(), picture.height(), BufferedImage.TYPE_INT_RGB);
         int[] pixels = ((DataBufferInt) image.getRaster().getDataBuffer()).getData();
@@ -139,10 +140,14 @@ final class ThumbnailCommand implements Callable<Integer> {
                 .order(ByteOrder.LITTLE_ENDIAN)
                 .asIntBuffer()
                 .get(pixels);
-        try (var file = Files.newOutputStream(out)) {
-            ImageIO.write(image, "png", file);
+        // Not by way of a temporary file.
+        ImageIO.setUseCache(false);
+        var bytes = new ByteArrayOutputStream();
+        try {
+            ImageIO.write(image, "png", bytes);
         } catch (IOException e) {
-            throw Failure.writing(out, e);
+            throw new UncheckedIOException(e);
         }
+        return bytes.toByteArray();
     }
 }

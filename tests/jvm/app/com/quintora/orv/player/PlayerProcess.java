@@ -24,10 +24,21 @@ public final class PlayerProcess implements AutoCloseable {
     /** Starts it on those displays and on no other; it writes into files of that folder. */
     public PlayerProcess(Path folder, String log, Map<String, String> displays, String... arguments)
             throws IOException {
+        this(folder, log, displays, List.of(), arguments);
+    }
+
+    /** Starts it through another program, which is given its command line as arguments. */
+    public PlayerProcess(
+            Path folder,
+            String log,
+            Map<String, String> displays,
+            List<String> starter,
+            String... arguments)
+            throws IOException {
         out = folder.resolve("out");
         err = folder.resolve("err");
-        List<String> command =
-                new ArrayList<>(List.of(System.getProperty("orv.test.java").split("\\|")));
+        List<String> command = new ArrayList<>(starter);
+        command.addAll(List.of(System.getProperty("orv.test.java").split("\\|")));
         command.add("--enable-native-access=ALL-UNNAMED");
         command.add("-Djava.library.path=" + System.getProperty("java.library.path"));
         command.add("-Dorv.columns=80");
