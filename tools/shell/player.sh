@@ -3,16 +3,21 @@
 # Brings the player application up to date and becomes it.
 
 run_player() {
+    prepare_player
+    describe_terminal
+    choose_log "$@"
+    choose_trust "$@"
+    exec "${JAVA_COMMAND[@]}" "$@"
+}
+
+# Sets JAVA_COMMAND to what starts the player that is built.
+prepare_player() {
     use packages build
     need_packages "build and play" play
     build_targets off mediaplayer_orv orv_player
     set_java_command
     archive_classes
     use_utf8
-    describe_terminal
-    choose_log "$@"
-    choose_trust "$@"
-    exec "${JAVA_COMMAND[@]}" "$@"
 }
 
 # A short life needs a quick start: one compiler tier, the simplest collector,
