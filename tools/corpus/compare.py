@@ -45,10 +45,10 @@ class Examination:
         outcome, info = self.player.describe(self.path)
         ended = self._ended("info", outcome)
         is_media = self.reference.is_media()
-        if ended and info is None and is_media:
-            self._add("refused", "info", outcome.reason(), "readable")
+        if ended and info is None and is_media and not self.reference.is_guess():
+            self._add("refused", "info", outcome.reason(), self.reference.format["format_name"])
         if info is not None and not is_media:
-            self._add("extra", "info", "readable", "not readable")
+            self._add("extra", "info", info.get("container", "readable"), "not readable")
         if info is not None and is_media:
             self._compare_info(info)
             self._compare_pictures()

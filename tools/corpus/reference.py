@@ -7,6 +7,8 @@ import child
 
 # Formats that are guessed from a name, and are text.
 NO_MEDIA = {"tty"}
+# AVPROBE_SCORE_RETRY of libavformat.
+WEAK_SCORE = 25
 # How far ahead of a moment its frame is looked for, in seconds.
 WINDOWS = (2, 20, None)
 
@@ -48,6 +50,11 @@ class Reference:
                 if line.startswith(("out_time_us=", "frame="))]
         return done.succeeded() and any(_number(end) for end in ends)
 
+    def is_guess(self):
+        """Whether ffprobe itself would rather have read more before it said
+        which format this is."""
+        return self.format.get("probe_score", 0) <= WEAK_SCORE
+
     def packet_times(self, stream, start, seconds=None):
         """The presentation times of a stream's packets from `start` on, in
         seconds from the start of the media, sorted."""
@@ -69,7 +76,8 @@ class Reference:
             start = 0 if window is None else max(0, at - window)
             seek = ["-ss", f"{start:.3f}"] if start else []
             # An option -t would round to whole frames.
-            filters = f"trim=end={at - start + 0.0005:.4f},{deinterlace}scale={width}:{height}"
+            filters = f"trim=end={at - start + 0.0005:.4f},{deinterlace}" \
+                      f"scale={width}:{height}:in_color_matrix={matrix(stream)}"
             done = self._ffmpeg(
                 *seek, "-i", self.path, "-map", f"0:{stream['index']}", "-vf", filters,
                 "-fps_mode", "passthrough", "-f", "rawvideo", "-pix_fmt", "rgb24", "-")
@@ -92,6 +100,14 @@ class Reference:
 
 def is_interlaced(stream):
     return stream.get("field_order", "progressive") not in ("progressive", "unknown")
+
+
+def matrix(stream):
+    """The colour matrix as the filter scale has it: of large video that does
+    not name one players take that of high definition, ffmpeg does not."""
+    unnamed = stream.get("color_space", "unknown") == "unknown"
+    large = stream.get("width", 0) >= 1280 or stream.get("height", 0) > 576
+    return "bt709" if unnamed and large else "auto"
 
 
 def is_hdr(stream):
