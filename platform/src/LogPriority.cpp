@@ -16,8 +16,9 @@ constexpr Level kLevels[] = {
 };
 
 // A television's log is a service of its own; here it is the terminal, where
-// a program may want less. Unset or unknown, everything is logged.
+// a program wants to hear of what went wrong alone unless it asks for more.
 __attribute__((constructor)) void setLogPriority() {
+    __android_log_set_minimum_priority(ANDROID_LOG_WARN);
     const char* name = getenv("ORV_LOG");
     if (name == nullptr) return;
     for (const Level& level : kLevels) {

@@ -1,5 +1,6 @@
 // SPDX-License-Identifier: Apache-2.0
 // The dispatcher's handlers, its refusals, and its life.
+#include <android/log.h>
 #include <errno.h>
 #include <jni/PlayerContext.h>
 #include <stdlib.h>
@@ -154,7 +155,10 @@ TEST_F(SyncToAsyncHandlersTest, PlayerMayBeReleasedInsideItsOwnEvent) {
 // In a process of its own, where the dispatcher does not exist yet.
 class SyncToAsyncLifeTest : public testing::Test {
 protected:
-    SyncToAsyncLifeTest() { testing::FLAGS_gtest_death_test_style = "threadsafe"; }
+    SyncToAsyncLifeTest() {
+        testing::FLAGS_gtest_death_test_style = "threadsafe";
+        __android_log_set_minimum_priority(ANDROID_LOG_VERBOSE);
+    }
 };
 
 TEST_F(SyncToAsyncLifeTest, StartsOnFirstUseAndEndsWithTheProcess) {

@@ -6,6 +6,7 @@
 #include "CoreCalls.h"
 #include "LogCapture.h"
 #include "PlayerTest.h"
+#include "core/AudioOutputs.h"
 
 using namespace android;
 using namespace orvtest;
@@ -74,6 +75,45 @@ TEST_F(CoreTest, WithoutAnOptionThatIsNeededAPlayerIsAsReleased) {
                                 "found")}));
     EXPECT_FALSE(playsMedia(*other));
     EXPECT_EQ(NO_ERROR, other->release());
+}
+
+// mpv goes on to the next where nobody listens, and knows no driver of that name
+// where it was built without.
+TEST_F(CoreTest, PipewireIsTriedWhereItsSocketIs) {
+    std::string folder = mediaPath("pipewire-XXXXXX");
+    ASSERT_NE(nullptr, mkdtemp(folder.data()));
+    setenv("XDG_RUNTIME_DIR", folder.c_str(), 1);
+    EXPECT_EQ(0u, orvtarn::audioOutputs().find("pulse,"));
+    outputOf("touch '" + folder + "/pipewire-0'");
+    EXPECT_EQ(0u, orvtarn::audioOutputs().find("pipewire,pulse,"));
+    sp<TarnPlayer> other = new TarnPlayer(-1);
+    EXPECT_TRUE(playsMedia(*other));
+    setenv("PIPEWIRE_REMOTE", "/nowhere/at/all", 1);
+    EXPECT_EQ(0u, orvtarn::audioOutputs().find("pulse,"));
+    unsetenv("PIPEWIRE_REMOTE");
+    unsetenv("XDG_RUNTIME_DIR");
+    outputOf("rm -r '" + folder + "'");
+}
+
+TEST_F(CoreTest, SilenceForWantOfADeviceIsReportedOnce) {
+    if (orvtarn::audioOutputs().find("alsa") != std::string::npos) {
+        GTEST_SKIP() << "this machine has sound cards";
+    }
+    setenv("PULSE_SERVER", "unix:/nowhere/at/all", 1);
+    setenv("PIPEWIRE_REMOTE", "/nowhere/at/all", 1);
+    const auto silence = warning("playback: no sound device answers; media plays without sound");
+    LogCapture log;
+    sp<TarnPlayer> other = new TarnPlayer(-1);
+    ASSERT_EQ(NO_ERROR, other->setDataSource(mediaPath("silent.mkv").c_str(), nullptr));
+    ASSERT_EQ(NO_ERROR, other->prepare());
+    EXPECT_THAT(log.lines("TarnPlayer"), testing::IsEmpty()) << "there is no sound to miss";
+    for (int round = 0; round < 2; round++) {
+        ASSERT_EQ(NO_ERROR, other->reset());
+        ASSERT_TRUE(playsMedia(*other));
+        EXPECT_THAT(log.lines("TarnPlayer"), LinesAre({silence}));
+    }
+    unsetenv("PULSE_SERVER");
+    unsetenv("PIPEWIRE_REMOTE");
 }
 
 TEST_F(CoreTest, WithoutACoreAPlayerIsAsReleased) {

@@ -37,7 +37,7 @@ expect() {
 # part FUNCTION…: calls a function of tools/shell as the commands do.
 # shellcheck disable=SC2016
 part() {
-    "$BASH" -c 'set -euo pipefail; ORV_ROOT=$1; . "$1/tools/shell/common.sh"; use packages build
+    "$BASH" -c 'set -euo pipefail; ORV_ROOT=$1; . "$1/tools/shell/common.sh"; use packages build doctor
         shift; "$@"' part "$root" "$@"
 }
 
@@ -137,6 +137,18 @@ for version in 2.0.0 2.5.0 10.0; do
 done
 stand_in pkg-config <<<'exit 1'
 expect "no mpv yet" 0 "" part check_mpv
+
+# A server's socket is all that is looked at; there may be cards besides.
+mkdir "$folder/run"
+XDG_RUNTIME_DIR=$folder/run PULSE_SERVER=somewhere expect "a sound server elsewhere" 0 \
+    "sound      ok       a sound server runs" part check_sound
+python3 -c 'import socket, sys; socket.socket(socket.AF_UNIX).bind(sys.argv[1])' "$folder/run/pipewire-0"
+XDG_RUNTIME_DIR=$folder/run PULSE_SERVER='' expect "PipeWire" 0 "a sound server runs" part check_sound
+rm "$folder/run/pipewire-0"
+if ! compgen -G '/dev/snd/pcm*p' >/dev/null; then
+    XDG_RUNTIME_DIR=$folder/run PULSE_SERVER='' expect "no sound at all" 0 \
+        "there is no sound card and no sound server" part check_sound
+fi
 
 stand_in id <<<'echo 1000'
 expect "another release without root rights" 1 "can only be entered as root: sudo ./orv test --release trixie" \

@@ -2,6 +2,7 @@
 # shellcheck shell=bash
 # What ./orv doctor says of the machine. Each check prints one line and fails
 # when ./orv play could not work for it.
+use sound
 
 # row WHAT STATE SENTENCE
 row() { printf '%-10s %-8s %s\n' "$@"; }
@@ -68,11 +69,10 @@ check_display() {
 }
 
 check_sound() {
-    local runtime=${XDG_RUNTIME_DIR:-/run/user/$(id -u)}
-    if [ -n "${PULSE_SERVER:-}" ] || [ -S "$runtime/pulse/native" ] || [ -S "$runtime/pipewire-0" ]; then
-        row sound ok "a sound server runs"
-    elif grep -qs '^ *[0-9]' /proc/asound/cards; then
-        row sound ok "$(sed -n 's/^ *[0-9]* \[.*\]: //p' /proc/asound/cards | head -n 1)"
+    local output
+    output=$(sound_output)
+    if [ -n "$output" ]; then
+        row sound ok "$output"
     else
         row sound none "there is no sound card and no sound server: video plays without sound"
     fi

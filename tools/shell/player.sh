@@ -5,6 +5,7 @@
 run_player() {
     prepare_player
     describe_terminal
+    describe_sound
     choose_log "$@"
     choose_trust "$@"
     exec "${JAVA_COMMAND[@]}" "$@"
@@ -55,8 +56,17 @@ describe_terminal() {
     local columns
     read -r _ columns < <(stty size 2>/dev/null </dev/tty) || columns=80
     [ "${columns:-0}" -gt 0 ] || columns=80
-    JAVA_COMMAND=("${JAVA_COMMAND[0]}" "-Dorv.columns=$columns" "${JAVA_COMMAND[@]:1}")
+    java_option "-Dorv.columns=$columns"
 }
+
+# The engine plays on in silence, which its user should not take for a fault.
+describe_sound() {
+    use sound
+    [ -n "$(sound_output)" ] || java_option -Dorv.sound=none
+}
+
+# java_option OPTION: adds one to what starts the player.
+java_option() { JAVA_COMMAND=("${JAVA_COMMAND[0]}" "$1" "${JAVA_COMMAND[@]:1}"); }
 
 # The native libraries log to standard error, where a player's user wants quiet.
 choose_log() {

@@ -12,6 +12,7 @@
 
 #include "base/EngineLog.h"
 #include "base/ThreadName.h"
+#include "core/AudioOutputs.h"
 #include "core/MpvError.h"
 #include "source/UrlScheme.h"
 
@@ -292,6 +293,7 @@ void EventLoop::onRestart() {
         mLoadFailed = ORV_ERROR_MALFORMED;
         return;
     }
+    if (hasSound) reportSilence();
     applyLooping();
     becomePreparedIfReady();
 }
@@ -326,6 +328,12 @@ bool EventLoop::drawsAnew() {
     if (mState.phase() != Phase::Preparing || !mPictureHandler()) return false;
     const double position = mMpv.getDouble("time-pos").value_or(0);
     return mMpv.getFlag("seekable").value_or(false) && mMpv.seek(position, "absolute+exact") >= 0;
+}
+
+void EventLoop::reportSilence() {
+    if (mSilenceReported || mMpv.getString("current-ao") != kSilentOutput) return;
+    mSilenceReported = true;
+    ALOGW("playback: no sound device answers; media plays without sound");
 }
 
 void EventLoop::onFrame() {

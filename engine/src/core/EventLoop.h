@@ -77,6 +77,7 @@ private:
     void onRestart();
     bool drawsAnew();
     void endUnattendedSeek();
+    void reportSilence();
     void onProperty(const mpv_event_property& property);
     void onTime(double seconds);
     void onBuffering(bool buffering);
@@ -114,6 +115,7 @@ private:
     uint64_t mFailedSession = 0;
     std::mutex mSourceMutex;
     std::shared_ptr<MediaSource> mSource;
+    bool mSilenceReported = false;  // on the event thread
     std::atomic<bool> mLooksForEnd{false};
     FrameClock mFrameClock;
     std::atomic<uint64_t> mUntimedFrame{0};  // 0 for none

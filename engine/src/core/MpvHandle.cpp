@@ -1,7 +1,6 @@
 // SPDX-License-Identifier: Apache-2.0
 #include "core/MpvHandle.h"
 
-#include <glob.h>
 #include <locale.h>
 #include <string.h>
 
@@ -10,6 +9,7 @@
 
 #include "base/EngineLog.h"
 #include "base/LibraryVersions.h"
+#include "core/AudioOutputs.h"
 #include "source/TlsSettings.h"
 #include "source/UrlScheme.h"
 
@@ -90,15 +90,6 @@ void setNetwork(mpv_handle* mpv) {
     setWished(mpv, {"tls-ca-file", certificateFile().c_str()});
 }
 
-// "null" keeps time where no device is: without it, media without video fail
-// there. ALSA is only asked where it has cards; it complains at length.
-const char* audioOutputs() {
-    glob_t cards;
-    const bool hasCards = glob("/dev/snd/pcm*p", GLOB_NOSORT, nullptr, &cards) == 0;
-    globfree(&cards);
-    return hasCards ? "pulse,alsa,null" : "pulse,null";
-}
-
 // mpv refuses to start while numbers are written with a decimal comma,
 // and looks at the process's locale, not at the thread's. Anybody may have set
 // one since the last handle.
@@ -126,7 +117,7 @@ bool MpvHandle::setOptions(bool hardwareDecoder) {
     }
     for (const Option& option : kWished) setWished(mHandle, option);
     setWished(mHandle, {"hwdec", hardwareDecoder ? "auto-copy-safe" : "no"});
-    setWished(mHandle, {"ao", audioOutputs()});
+    setWished(mHandle, {"ao", audioOutputs().c_str()});
     setNetwork(mHandle);
     return true;
 }

@@ -52,6 +52,7 @@ public final class Session implements AutoCloseable {
             player.setSurface(frames.reader().getSurface());
             frames.start();
             player.prepare();
+            Silence.explain(player);
             goToStart();
             frameRate = player.tracks().currentVideo().map(VideoTrack::frameRate).orElse(0.0);
             frames.expect(frameRate);

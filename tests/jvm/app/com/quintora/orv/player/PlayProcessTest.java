@@ -49,6 +49,27 @@ class PlayProcessTest {
     }
 
     @Test
+    void withoutALogPriorityOnlyWhatWentWrongIsLogged() throws Exception {
+        play(null, folder.resolve("none.mkv").toString());
+        assertEquals(1, process.awaitEnd(), process::all);
+        assertTrue(process.err().contains("TarnPlayer E "), process::all);
+        assertTrue(process.err().lines().noneMatch(line -> line.contains(" I ")), process::all);
+    }
+
+    @Test
+    void aMachineWithoutSoundIsMentionedOnce() throws Exception {
+        Map<String, String> mute = Map.of("ORV_TEST_SOUND", "none");
+        process = new PlayerProcess(folder, "silent", mute, "play", Media.path("short.mp4"));
+        assertEquals(0, process.awaitEnd(), process::all);
+        assertEquals(
+                "orv: there is no sound card and no sound server: this plays without sound\n",
+                process.err());
+        process = new PlayerProcess(folder, "silent", mute, "play", Media.path("silent.mkv"));
+        assertEquals(0, process.awaitEnd(), process::all);
+        assertEquals("", process.err(), "there is no sound to miss");
+    }
+
+    @Test
     void aStreamIsReadThroughJava() throws Exception {
         play("info", Media.path("silent.mkv"), "--stream");
         assertEquals(0, process.awaitEnd(), process::all);

@@ -21,7 +21,10 @@ public final class PlayerProcess implements AutoCloseable {
     private final Path err;
     private final Process process;
 
-    /** Starts it on those displays and on no other; it writes into files of that folder. */
+    /**
+     * Starts it on those displays and on no other; it writes into files of that folder. The log is
+     * a value of ORV_LOG, or null for none.
+     */
     public PlayerProcess(Path folder, String log, Map<String, String> displays, String... arguments)
             throws IOException {
         this(folder, log, displays, List.of(), arguments);
@@ -42,13 +45,18 @@ public final class PlayerProcess implements AutoCloseable {
         command.add("--enable-native-access=ALL-UNNAMED");
         command.add("-Djava.library.path=" + System.getProperty("java.library.path"));
         command.add("-Dorv.columns=80");
+        command.add("-Dorv.sound=" + displays.getOrDefault("ORV_TEST_SOUND", ""));
         command.addAll(
                 Arrays.asList("-cp", System.getProperty("java.class.path"), Main.class.getName()));
         command.addAll(Arrays.asList(arguments));
         ProcessBuilder builder = new ProcessBuilder(command);
         builder.environment().keySet().removeAll(List.of("DISPLAY", "WAYLAND_DISPLAY"));
         builder.environment().putAll(displays);
-        builder.environment().put("ORV_LOG", log);
+        if (log == null) {
+            builder.environment().remove("ORV_LOG");
+        } else {
+            builder.environment().put("ORV_LOG", log);
+        }
         process = builder.redirectOutput(out.toFile()).redirectError(err.toFile()).start();
     }
 
