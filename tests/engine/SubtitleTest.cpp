@@ -122,6 +122,25 @@ TEST_F(SubtitleTest, AppearsAndDisappearsOnScreen) {
     EXPECT_TRUE(seesText()) << "the same line comes back";
 }
 
+// Without a font, each of these would be one and the same box.
+TEST_F(SubtitleTest, OtherScriptsHaveLetters) {
+    if (sizeof(void*) == 4) GTEST_SKIP() << "no fonts of the other machine's";
+    const std::string file = mediaPath("script.srt");
+    const auto pictureOf = [&](const char* letter) {
+        outputOf("printf '1\\n00:00:00,000 --> 00:00:20,000\\n%s\\n' '" + std::string(letter) +
+                 "' >'" + file + "'");
+        player->reset();
+        open("plain.mp4");
+        EXPECT_TRUE(player->setSubtitleDataSource(file.c_str()));
+        EXPECT_TRUE(sees([](const Picture& p) { return brightPixels(p) > 0; })) << letter;
+        return sink->newest().pixels;
+    };
+    for (const auto& [one, other] : std::initializer_list<std::pair<const char*, const char*>>{
+             {"国", "电"}, {"ひ", "カ"}, {"한", "글"}, {"ع", "ف"}, {"ह", "क"}}) {
+        EXPECT_NE(pictureOf(one), pictureOf(other)) << one << " and " << other;
+    }
+}
+
 TEST_F(SubtitleTest, TheOtherTrackIsAnotherText) {
     openAtLine("plain.mkv");
     ASSERT_TRUE(player->onSubtitleTrack(0));

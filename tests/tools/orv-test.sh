@@ -138,6 +138,15 @@ done
 stand_in pkg-config <<<'exit 1'
 expect "no mpv yet" 0 "" part check_mpv
 
+# shellcheck disable=SC2016
+stand_in fc-list <<<'case $1 in *zh-cn | *ja | *hi) ;; *) echo "Some Sans" ;; esac'
+expect "scripts without letters" 0 \
+    "boxes in place of letters in Chinese, Japanese, Hindi; Debian has them in fonts-wqy-microhei fonts-lohit-deva" \
+    part check_fonts
+stand_in fc-list <<<'echo "Some Sans"'
+expect "fonts for all scripts" 0 "fonts      ok       for Chinese, Japanese, Korean, Arabic, Hindi" \
+    part check_fonts
+
 # A server's socket is all that is looked at; there may be cards besides.
 mkdir "$folder/run"
 XDG_RUNTIME_DIR=$folder/run PULSE_SERVER=somewhere expect "a sound server elsewhere" 0 \

@@ -9,7 +9,7 @@ row() { printf '%-10s %-8s %s\n' "$@"; }
 
 check_machine() {
     local bad=0 check
-    for check in packages java libraries display sound; do
+    for check in packages java libraries display fonts sound; do
         "check_$check" || bad=1
     done
     return $bad
@@ -65,6 +65,30 @@ check_display() {
         row display ok "$DISPLAY"
     else
         row display none "without a display ./orv play plays in the terminal"
+    fi
+}
+
+# Languages of other scripts, as fontconfig calls them, and what covers them.
+readonly SCRIPTS='zh-cn Chinese fonts-wqy-microhei
+ja Japanese fonts-wqy-microhei
+ko Korean fonts-wqy-microhei
+ar Arabic fonts-dejavu-core
+hi Hindi fonts-lohit-deva'
+
+# Any font will do, whatever package it is from.
+check_fonts() {
+    local language name package boxes=() packages=()
+    command -v fc-list >/dev/null || { row fonts unknown "there is no fc-list to ask" && return; }
+    while read -r language name package; do
+        [ -n "$(fc-list ":lang=$language" family)" ] && continue
+        boxes+=("$name")
+        case " ${packages[*]} " in *" $package "*) ;; *) packages+=("$package") ;; esac
+    done <<<"$SCRIPTS"
+    if [ ${#boxes[@]} -eq 0 ]; then
+        row fonts ok "for $(cut -d' ' -f2 <<<"$SCRIPTS" | paste -sd, | sed 's/,/, /g')"
+    else
+        row fonts missing "boxes in place of letters in $(printf '%s\n' "${boxes[@]}" |
+            paste -sd, | sed 's/,/, /g'); Debian has them in ${packages[*]}"
     fi
 }
 
