@@ -9,8 +9,6 @@ import java.awt.Component;
 import java.awt.Dimension;
 import java.awt.GraphicsEnvironment;
 import java.awt.Rectangle;
-import java.awt.event.ComponentAdapter;
-import java.awt.event.ComponentEvent;
 import java.awt.event.MouseAdapter;
 import java.awt.event.MouseEvent;
 import java.awt.event.WindowAdapter;
@@ -29,7 +27,7 @@ final class Stage {
     private static final double LARGEST_PART_OF_SCREEN = 0.8;
 
     private final String name;
-    private final VideoPane video = new VideoPane();
+    private final VideoPane video = new VideoPane(this::requestFrames);
     private final NoticePane room = new NoticePane();
     private JFrame frame;
     private ControlBar bar;
@@ -172,12 +170,12 @@ final class Stage {
 
     /** Lets the player draw in the size that is shown, so that nothing is scaled twice. */
     private void requestFrames() {
-        if (videoSize == null || video.getWidth() == 0) {
+        Dimension pixels = video.room();
+        if (videoSize == null || pixels.width == 0 || pixels.height == 0) {
             return;
         }
         Rectangle place =
-                VideoPane.fit(
-                        videoSize.width, videoSize.height, video.getWidth(), video.getHeight());
+                VideoPane.fit(videoSize.width, videoSize.height, pixels.width, pixels.height);
         conductor.requestFrameSize(place.width, place.height);
     }
 
@@ -203,13 +201,6 @@ final class Stage {
                     @Override
                     public void windowClosing(WindowEvent event) {
                         close();
-                    }
-                });
-        video.addComponentListener(
-                new ComponentAdapter() {
-                    @Override
-                    public void componentResized(ComponentEvent event) {
-                        requestFrames();
                     }
                 });
         room.addMouseListener(
