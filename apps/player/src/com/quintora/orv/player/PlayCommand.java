@@ -17,7 +17,7 @@ import picocli.CommandLine.Spec;
         name = "play",
         description = "Plays a file or URL: in a window, or in the terminal where there is no"
                 + " display.",
-        footer = "In the window, the key H lists all keys.")
+        footer = "In the window, H lists the keyboard shortcuts.")
 final class PlayCommand implements Callable<Integer> {
     @Mixin private CommonOptions common;
     @Mixin private PlayOptions options;

@@ -9,8 +9,13 @@ import javax.swing.BorderFactory;
 import javax.swing.JLabel;
 import javax.swing.JMenuItem;
 import javax.swing.JPopupMenu;
+import javax.swing.MenuElement;
+import javax.swing.MenuSelectionManager;
 
-/** A list of choices that opens above a button, with a tick at the present one. */
+/**
+ * A list of choices that opens above a button, with a tick at the present one, where the keyboard
+ * begins: Up and Down move, Enter chooses, Escape closes.
+ */
 final class ChoiceMenu {
     /** A choice: what it says, whether it holds now, what it does. */
     record Choice(String text, boolean chosen, Runnable action) {}
@@ -28,9 +33,19 @@ final class ChoiceMenu {
         heading.setForeground(Theme.MUTED);
         heading.setBorder(BorderFactory.createEmptyBorder(4, 14, 6, 14));
         menu.add(heading);
-        choices.forEach(choice -> menu.add(new Item(choice)));
+        JMenuItem present = null;
+        for (Choice choice : choices) {
+            JMenuItem item = menu.add(new Item(choice));
+            present = present == null || choice.chosen ? item : present;
+        }
         Dimension size = menu.getPreferredSize();
         menu.show(above, above.getWidth() - size.width, -size.height - Theme.GAP);
+        MenuSelectionManager.defaultManager()
+                .setSelectedPath(new MenuElement[] {menu, present});
+    }
+
+    static boolean isOpen() {
+        return MenuSelectionManager.defaultManager().getSelectedPath().length > 0;
     }
 
     private static final class Item extends JMenuItem {

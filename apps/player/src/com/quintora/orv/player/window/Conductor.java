@@ -163,13 +163,13 @@ final class Conductor implements Controls {
     @Override
     public void changeVolume(double by) {
         setVolume(Math.max(0, Math.min(1, volume + by)));
-        stage.tell("Volume " + Math.round(volume * 100) + " %");
+        stage.tell("Volume " + Math.round(volume * 100) + "%");
     }
 
     @Override
     public void toggleMuted() {
         muted = !muted;
-        stage.tell(muted ? "Sound off" : "Sound on");
+        stage.tell(muted ? "Muted" : "Unmuted");
         applyVolume();
     }
 
@@ -212,7 +212,7 @@ final class Conductor implements Controls {
                 () ->
                         openMenu(
                                 above,
-                                "Sound track",
+                                "Audio track",
                                 details.audioChoices(
                                         index -> later(() -> session.selectAudio(index)))));
     }

@@ -40,7 +40,7 @@ final class ControlBar extends JPanel {
                         Glyph.BACK, "Back 10 seconds (Left)", () -> controls.skip(-SKIP_MS));
         forward =
                 new FlatButton(
-                        Glyph.FORWARD, "On 10 seconds (Right)", () -> controls.skip(SKIP_MS));
+                        Glyph.FORWARD, "Forward 10 seconds (Right)", () -> controls.skip(SKIP_MS));
         mute = new FlatButton(Glyph.VOLUME, "Mute (M)", controls::toggleMuted);
         volume =
                 new LevelBar(
@@ -53,7 +53,7 @@ final class ControlBar extends JPanel {
         audio =
                 new FlatButton(
                         Glyph.AUDIO,
-                        "Sound track (A)",
+                        "Audio track (A)",
                         () -> controls.chooseAudio(audioButton()));
         subtitles =
                 new FlatButton(
@@ -63,7 +63,7 @@ final class ControlBar extends JPanel {
         fullScreen =
                 new FlatButton(
                         Glyph.FULL_SCREEN, "Full screen (F)", controls::toggleFullScreen);
-        help = new FlatButton(null, "Keys (H)", controls::toggleHelp);
+        help = new FlatButton(null, "Keyboard shortcuts (H)", controls::toggleHelp);
         help.setText("?");
         speed.setText(Speeds.label(1));
         setBackground(Theme.PANEL);
@@ -102,7 +102,7 @@ final class ControlBar extends JPanel {
         volume.showLevel(muted ? 0 : level, 0);
         mute.show(
                 muted || level == 0 ? Glyph.MUTED : Glyph.VOLUME,
-                muted ? "Sound on (M)" : "Mute (M)");
+                muted ? "Unmute (M)" : "Mute (M)");
     }
 
     void showTracks(int audioTracks, int subtitleTracks) {

@@ -9,14 +9,17 @@ import java.awt.event.MouseEvent;
 import java.awt.image.BufferedImage;
 import javax.swing.JComponent;
 import javax.swing.JFrame;
-import javax.swing.MenuSelectionManager;
 import javax.swing.Timer;
 
-/** The window over the whole screen; its controls and pointer hide while the mouse rests. */
+/**
+ * The window over the whole screen. Its controls lie over the picture; they and the pointer hide
+ * while the mouse rests.
+ */
 final class FullScreen {
     private static final int REST_MS = 2_500;
 
     private final JFrame frame;
+    private final Deck deck;
     private final JComponent controls;
     private final Timer rest = new Timer(REST_MS, event -> hideControls());
     private final Cursor noCursor =
@@ -28,8 +31,9 @@ final class FullScreen {
     private boolean on;
     private boolean playing;
 
-    FullScreen(JFrame frame, JComponent controls) {
+    FullScreen(JFrame frame, Deck deck, JComponent controls) {
         this.frame = frame;
+        this.deck = deck;
         this.controls = controls;
         rest.setRepeats(false);
         Toolkit.getDefaultToolkit()
@@ -45,6 +49,7 @@ final class FullScreen {
         // A window can lose its frame only while it is not shown.
         frame.dispose();
         frame.setUndecorated(on);
+        deck.setOverlapping(on);
         frame.getGraphicsConfiguration().getDevice().setFullScreenWindow(on ? frame : null);
         frame.setVisible(true);
         showControls();
@@ -73,8 +78,7 @@ final class FullScreen {
     }
 
     private void hideControls() {
-        boolean aMenuIsOpen = MenuSelectionManager.defaultManager().getSelectedPath().length > 0;
-        if (aMenuIsOpen) {
+        if (ChoiceMenu.isOpen()) {
             rest.restart();
         } else if (on && playing) {
             controls.setVisible(false);

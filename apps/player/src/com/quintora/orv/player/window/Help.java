@@ -25,7 +25,7 @@ final class Help extends JPanel {
     Help() {
         super(new GridBagLayout());
         setOpaque(false);
-        getAccessibleContext().setAccessibleName("Keys");
+        getAccessibleContext().setAccessibleName("Keyboard shortcuts");
         addMouseListener(
                 new MouseAdapter() {
                     @Override

@@ -8,20 +8,23 @@ import javax.swing.AbstractAction;
 import javax.swing.JComponent;
 import javax.swing.KeyStroke;
 
-/** The window's keys. */
+/** The window's keys. They rest while a menu is open, which has keys of its own. */
 final class Keys {
-    private final JComponent root;
+    private final JComponent content;
     private final Controls controls;
     private final List<Help.Line> lines = new ArrayList<>();
 
-    private Keys(JComponent root, Controls controls) {
-        this.root = root;
+    private Keys(JComponent content, Controls controls) {
+        this.content = content;
         this.controls = controls;
     }
 
-    /** Binds every key; gives what the help says of them. */
-    static List<Help.Line> bind(JComponent root, Controls controls, ControlBar bar) {
-        Keys keys = new Keys(root, controls);
+    /**
+     * Binds every key for the window in which that component is; gives what the help says of them.
+     * It must not be the root pane, where these bindings would hide those of an open menu.
+     */
+    static List<Help.Line> bind(JComponent content, Controls controls, ControlBar bar) {
+        Keys keys = new Keys(content, controls);
         keys.bindPlaying();
         keys.bindSkips();
         keys.bindSound();
@@ -37,35 +40,35 @@ final class Keys {
         line("[  ]", "Slower, faster");
         on("OPEN_BRACKET", () -> controls.changeSpeed(-1));
         on("CLOSE_BRACKET", () -> controls.changeSpeed(1));
-        line(",  .", "One frame back, on");
+        line(",  .", "Previous frame, next frame");
         on("COMMA", () -> controls.step(-1));
         on("PERIOD", () -> controls.step(1));
     }
 
     private void bindSkips() {
-        line("Left, Right", "10 seconds back, on");
+        line("Left, Right", "10 seconds back, forward");
         on("LEFT", () -> controls.skip(-10_000));
         on("RIGHT", () -> controls.skip(10_000));
-        line("Shift+Left, Shift+Right", "1 second back, on");
+        line("Shift+Left, Shift+Right", "1 second back, forward");
         on("shift LEFT", () -> controls.skip(-1_000));
         on("shift RIGHT", () -> controls.skip(1_000));
-        line("Page Up, Page Down", "1 minute back, on");
+        line("Page Up, Page Down", "1 minute back, forward");
         on("PAGE_UP", () -> controls.skip(-60_000));
         on("PAGE_DOWN", () -> controls.skip(60_000));
-        line("Home", "To the start");
+        line("Home", "Go to the start");
         on("HOME", () -> controls.seekTo(0));
     }
 
     private void bindSound() {
-        line("Up, Down", "Louder, softer");
+        line("Up, Down", "Volume up, down");
         on("UP", () -> controls.changeVolume(ControlBar.VOLUME_STEP));
         on("DOWN", () -> controls.changeVolume(-ControlBar.VOLUME_STEP));
-        line("M", "Sound off or on");
+        line("M", "Mute or unmute");
         on("M", controls::toggleMuted);
     }
 
     private void bindChoices(ControlBar bar) {
-        line("A", "Sound track");
+        line("A", "Audio track");
         on("A", () -> controls.chooseAudio(bar.audioButton()));
         line("S", "Subtitles");
         on("S", () -> controls.chooseSubtitles(bar.subtitlesButton()));
@@ -75,7 +78,7 @@ final class Keys {
         line("F, F11", "Full screen");
         on("F", controls::toggleFullScreen);
         on("F11", controls::toggleFullScreen);
-        line("Escape", "Leave full screen or this list");
+        line("Escape", "Close this list, leave full screen");
         on("ESCAPE", controls::leave);
         line("H, ?, F1", "This list");
         on("H", controls::toggleHelp);
@@ -91,7 +94,7 @@ final class Keys {
     }
 
     private void on(String key, Runnable action) {
-        bind(root, JComponent.WHEN_IN_FOCUSED_WINDOW, key, action);
+        bind(content, JComponent.WHEN_IN_FOCUSED_WINDOW, key, action);
     }
 
     /** While a component has the focus or, as the condition says, its window has. */
@@ -104,6 +107,11 @@ final class Keys {
                             @Override
                             public void actionPerformed(ActionEvent event) {
                                 action.run();
+                            }
+
+                            @Override
+                            public boolean isEnabled() {
+                                return !ChoiceMenu.isOpen();
                             }
                         });
     }

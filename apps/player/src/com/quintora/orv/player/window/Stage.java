@@ -3,7 +3,6 @@ package com.quintora.orv.player.window;
 
 import android.media.Image;
 import com.quintora.orv.player.Snapshot;
-import java.awt.BorderLayout;
 import java.awt.Color;
 import java.awt.Component;
 import java.awt.Dimension;
@@ -52,11 +51,11 @@ final class Stage {
         message = new MessagePanel();
         room.add(video, VIDEO);
         room.add(message, MESSAGE);
-        frame.add(room, BorderLayout.CENTER);
-        frame.add(bar, BorderLayout.SOUTH);
+        Deck deck = new Deck(room, bar);
+        frame.add(deck);
         frame.setGlassPane(help);
-        fullScreen = new FullScreen(frame, bar);
-        help.list(Keys.bind(frame.getRootPane(), conductor, bar));
+        fullScreen = new FullScreen(frame, deck, bar);
+        help.list(Keys.bind(deck, conductor, bar));
         giveFocusToPicture();
         listen();
         room.setPreferredSize(new Dimension(854, 480));

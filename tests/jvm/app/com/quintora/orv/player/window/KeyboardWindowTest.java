@@ -43,7 +43,7 @@ class KeyboardWindowTest {
             frame = new JFrame();
             bar = new ControlBar(controls);
             frame.add(bar);
-            help = Keys.bind(frame.getRootPane(), controls, bar);
+            help = Keys.bind(bar, controls, bar);
             bar.seekBar().showPosition(30_000, 60_000, 100);
             frame.pack();
             frame.setVisible(true);
@@ -127,7 +127,7 @@ class KeyboardWindowTest {
                 help.stream()
                         .mapToInt(line -> line.keys().split("(?<=[\\w?]), |  ").length)
                         .sum();
-        var keys = frame.getRootPane().getInputMap(JComponent.WHEN_IN_FOCUSED_WINDOW).keys();
+        var keys = bar.getInputMap(JComponent.WHEN_IN_FOCUSED_WINDOW).keys();
         assertEquals(keys.length, names, () -> help + " for " + Arrays.toString(keys));
     }
 

@@ -9,7 +9,7 @@ import com.quintora.orv.player.PlayOptions;
 import java.awt.Component;
 import java.awt.Container;
 import java.awt.Frame;
-import java.awt.event.ActionEvent;
+import java.awt.event.KeyEvent;
 import java.awt.image.BufferedImage;
 import java.util.concurrent.Callable;
 import java.util.concurrent.FutureTask;
@@ -30,6 +30,9 @@ abstract class WindowFixture {
 
     @AfterEach
     void closeWindow() throws Exception {
+        if (onWindow(ChoiceMenu::isOpen)) {
+            press("ESCAPE");
+        }
         if (!playing.isDone()) {
             press("Q");
         }
@@ -38,10 +41,15 @@ abstract class WindowFixture {
     }
 
     final void open(String media, String... options) throws Exception {
+        openSource(Media.path(media), options);
+    }
+
+    /** Of a path or a URL. */
+    final void openSource(String source, String... options) throws Exception {
         PlayOptions parsed = new PlayOptions();
         CommandLine parser = new CommandLine(parsed);
-        parser.parseArgs(Stream.concat(Stream.of(options), Stream.of(Media.path(media)))
-                .toArray(String[]::new));
+        parser.parseArgs(
+                Stream.concat(Stream.of(options), Stream.of(source)).toArray(String[]::new));
         playing = new FutureTask<>(() -> PlayerWindow.play(parsed));
         new Thread(playing, "main").start();
         Wait.until("the window is open", () -> openFrame() != null);
@@ -57,22 +65,31 @@ abstract class WindowFixture {
         return null;
     }
 
-    /** As if the key were pressed in the window. */
+    /** Presses a key in the window, and lets it go: a name of KeyStroke's, as in "shift LEFT". */
     final void press(String key) throws Exception {
+        KeyStroke stroke = KeyStroke.getKeyStroke(key);
         SwingUtilities.invokeAndWait(
                 () -> {
-                    var root = frame.getRootPane();
-                    Object action =
-                            root.getInputMap(JComponent.WHEN_IN_FOCUSED_WINDOW)
-                                    .get(KeyStroke.getKeyStroke(key));
-                    root.getActionMap()
-                            .get(action)
-                            .actionPerformed(new ActionEvent(root, 0, key));
+                    for (int kind : new int[] {KeyEvent.KEY_PRESSED, KeyEvent.KEY_RELEASED}) {
+                        Component target = keyboardTarget();
+                        target.dispatchEvent(
+                                new KeyEvent(target, kind, 0, stroke.getModifiers(),
+                                        stroke.getKeyCode(), KeyEvent.CHAR_UNDEFINED));
+                    }
                 });
     }
 
+    // On a display without a window manager, or beside other windows, none may have the focus.
+    private Component keyboardTarget() {
+        Component focused = frame.getMostRecentFocusOwner();
+        return ChoiceMenu.isOpen() || focused == null ? frame.getRootPane() : focused;
+    }
+
     final void awaitPicture() throws Exception {
-        Wait.until("a picture shows", () -> brightest(find(VideoPane.class, null), 150) > 100);
+        Wait.until("a picture shows", () -> {
+            VideoPane video = find(VideoPane.class, null);
+            return video != null && brightest(video, 150) > 100;
+        });
     }
 
     final void awaitButton(String name) throws Exception {
@@ -86,15 +103,22 @@ abstract class WindowFixture {
     final void awaitSecond(int from, int to) throws Exception {
         Wait.until(
                 "the time is between " + from + " and " + to + " s",
-                () -> {
-                    int second = Integer.parseInt(label().substring(2));
-                    return second >= from && second <= to;
-                });
+                () -> second() >= from && second() <= to);
+    }
+
+    /** Of the elapsed time, which is below a minute. */
+    final int second() throws Exception {
+        return Integer.parseInt(label().substring(2));
     }
 
     /** The elapsed time that stands beside the bar. */
     final String label() throws Exception {
         return onWindow(() -> find(frame, JLabel.class, null).getText());
+    }
+
+    /** The words on the picture, or null. */
+    final String notice() throws Exception {
+        return find(NoticePane.class, null).getAccessibleContext().getAccessibleDescription();
     }
 
     final <T extends Component> T find(Class<T> type, String name) throws Exception {

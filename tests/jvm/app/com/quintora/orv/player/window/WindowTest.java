@@ -64,7 +64,7 @@ class WindowTest extends WindowFixture {
     void tracksAreOfferedWhereThereAreSome() throws Exception {
         open("tracks.mkv");
         awaitButton("Pause (Space)");
-        assertTrue(button("Sound track (A)").isEnabled());
+        assertTrue(button("Audio track (A)").isEnabled());
         assertTrue(button("Subtitles (S)").isEnabled());
     }
 
@@ -115,10 +115,5 @@ class WindowTest extends WindowFixture {
         assertFalse(button("Play (Space)").isEnabled());
         press("Q");
         assertEquals(1, playing.get(Wait.LIMIT.toSeconds(), TimeUnit.SECONDS));
-    }
-
-    /** The words on the picture. */
-    private String notice() throws Exception {
-        return find(NoticePane.class, null).getAccessibleContext().getAccessibleDescription();
     }
 }

@@ -1,0 +1,51 @@
+// SPDX-License-Identifier: Apache-2.0
+package com.quintora.orv.player.window;
+
+import java.awt.BorderLayout;
+import java.awt.Component;
+import java.awt.Container;
+import java.awt.Dimension;
+import javax.swing.JPanel;
+
+/** The picture and the bar: one above the other, or the bar over the whole picture. */
+final class Deck extends JPanel {
+    private final Component picture;
+    private final Component bar;
+    private boolean overlaps;
+
+    Deck(Component picture, Component bar) {
+        super(new Layout());
+        this.picture = picture;
+        this.bar = bar;
+        // The first is the uppermost.
+        add(bar, BorderLayout.SOUTH);
+        add(picture, BorderLayout.CENTER);
+    }
+
+    /** Whether the bar lies over the picture, which has all the room then. */
+    void setOverlapping(boolean overlaps) {
+        this.overlaps = overlaps;
+        revalidate();
+    }
+
+    /** Otherwise a new frame would be painted over the bar. */
+    @Override
+    public boolean isOptimizedDrawingEnabled() {
+        return !overlaps;
+    }
+
+    private static final class Layout extends BorderLayout {
+        @Override
+        public void layoutContainer(Container target) {
+            Deck deck = (Deck) target;
+            if (!deck.overlaps) {
+                super.layoutContainer(target);
+                return;
+            }
+            Dimension room = deck.getSize();
+            int height = Math.min(room.height, deck.bar.getPreferredSize().height);
+            deck.picture.setBounds(0, 0, room.width, room.height);
+            deck.bar.setBounds(0, room.height - height, room.width, height);
+        }
+    }
+}
