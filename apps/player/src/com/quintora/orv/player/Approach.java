@@ -2,44 +2,141 @@
 package com.quintora.orv.player;
 
 import com.quintora.mmp.OrvMediaPlayer;
+import com.quintora.mmp.PlayerState;
 import com.quintora.mmp.VideoTrack;
 
-/** The way from the key frame, at which a seek ends, to the moment that was asked for. */
+/**
+ * The way from the key frame, at which a seek ends, to the frame that is shown at the time that was
+ * asked for: its own time is not after that, the next frame's is. Times are in milliseconds. For
+ * one thread at a time.
+ */
 final class Approach {
-    // The fastest at which no frame is left out.
-    private static final double SPEED = 16;
+    /** What is moved; it rests meanwhile. */
+    interface Film {
+        /** Goes to a key frame near that time, usually before it. */
+        void seekTo(int millis);
+
+        /**
+         * Goes some frames on, or back when negative; of many frames possibly only about that
+         * many. Returns false when there are fewer: it is at the last of them then.
+         */
+        boolean step(int frames);
+
+        /** The time of the frame that is shown. */
+        int position();
+    }
+
+    private enum Pace {
+        UNKNOWN,
+        STEADY,
+        VARIABLE
+    }
+
+    // Positions are rounded.
     private static final int ROUNDING_MS = 1;
 
-    private Approach() {}
+    // Rates are rounded, too.
+    private static final double RATE_PRECISION = 1e-4;
+
+    // For pictures of which nobody knows how often they come.
+    private static final double USUAL_RATE = 25;
+
+    // Far more than any way needs; none shall go on for ever.
+    private static final int MOST_STEPS = 60;
+
+    private final Film film;
+    private final double periodMs;
+    private Pace pace = Pace.UNKNOWN;
+
+    /** For a player with a picture, which must not play meanwhile. */
+    static Approach of(OrvMediaPlayer player) {
+        double rate = player.tracks().currentVideo().map(VideoTrack::frameRate).orElse(0.0);
+        return new Approach(new PlayerFilm(player), rate > 0 ? rate : USUAL_RATE);
+    }
+
+    /** Media of about so many frames a second. */
+    Approach(Film film, double framesPerSecond) {
+        this.film = film;
+        periodMs = 1000 / framesPerSecond;
+    }
 
     /**
-     * Goes on to the frame of that moment, or to the last one. The speed is the normal one
-     * afterwards.
+     * Goes to the frame of that time, to the first one when all are later.
+     *
+     * @throws IllegalStateException when the media cannot seek
      */
-    static void to(OrvMediaPlayer player, int millis) {
-        double framesPerSecond =
-                player.tracks().currentVideo().map(VideoTrack::frameRate).orElse(0.0);
-        double last = millis + ROUNDING_MS - 1000 / framesPerSecond;
-        if (framesPerSecond == 0 || player.getCurrentPosition() > last) {
-            return;
-        }
-        player.trickPlay().setSpeed(SPEED);
-        try {
-            stepTo(player, millis, last);
-        } catch (IllegalStateException e) {
-            // The last frame may be nearer than the duration says: the player stands there.
-        } finally {
-            player.trickPlay().setSpeed(1);
+    void to(int millis) {
+        film.seekTo(millis);
+        int latest = millis + ROUNDING_MS;
+        int most = Integer.MAX_VALUE;
+        boolean isLast = false;
+        for (int i = 0; i < MOST_STEPS && !isArrived(latest, isLast); i++) {
+            int before = film.position();
+            int frames = framesTo(latest, before, most);
+            boolean found = step(frames);
+            boolean isPast = film.position() > latest;
+            if (!found && frames < 0 && isPast) {
+                return; // The first frame of all.
+            }
+            isLast = !isPast && (found ? frames == -1 && before > latest : frames > 0);
+            if (film.position() == before) {
+                most = 1; // Many frames by their usual length may be fewer than one.
+            } else if (isPast != before > latest) {
+                most = Math.max(1, Math.abs(frames) / 2);
+            }
         }
     }
 
-    // One by one: some media have fewer frames than their rate says.
-    private static void stepTo(OrvMediaPlayer player, int millis, double last) {
-        while (player.getCurrentPosition() <= last) {
-            player.trickPlay().step(1);
+    private boolean isArrived(int latest, boolean isLast) {
+        int left = latest - film.position();
+        boolean isExact = left <= 2 * ROUNDING_MS;
+        return left >= 0 && (isExact || isLast || pace == Pace.STEADY && left < periodMs);
+    }
+
+    /** How many frames to step: at least one, forward or back, and not more than so many. */
+    private int framesTo(int latest, int position, int most) {
+        int left = latest - position;
+        double frames = left >= 0 ? Math.floor(left / periodMs) : Math.ceil(-left / periodMs);
+        int count = (int) Math.max(1, Math.min(frames, most));
+        return left >= 0 ? count : -count;
+    }
+
+    private boolean step(int frames) {
+        int before = film.position();
+        boolean found = film.step(frames);
+        if (found && pace != Pace.VARIABLE) {
+            double expected = frames * periodMs;
+            double error = Math.abs(film.position() - before - expected);
+            boolean isAsExpected =
+                    error <= 2 * ROUNDING_MS + Math.abs(expected) * RATE_PRECISION;
+            pace = isAsExpected ? Pace.STEADY : Pace.VARIABLE;
         }
-        if (player.getCurrentPosition() > millis + ROUNDING_MS) {
-            player.trickPlay().step(-1);
+        return found;
+    }
+
+    private record PlayerFilm(OrvMediaPlayer player) implements Film {
+        @Override
+        public void seekTo(int millis) {
+            player.seekTo(millis);
+        }
+
+        @Override
+        public boolean step(int frames) {
+            try {
+                player.trickPlay().step(frames);
+                return true;
+            } catch (IllegalStateException e) {
+                PlayerState state = player.getState();
+                if (state != PlayerState.PAUSED && state != PlayerState.COMPLETED) {
+                    throw e; // The media failed, or was released.
+                }
+                return false;
+            }
+        }
+
+        @Override
+        public int position() {
+            return player.getCurrentPosition();
         }
     }
 }

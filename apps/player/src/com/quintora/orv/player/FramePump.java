@@ -16,7 +16,7 @@ final class FramePump implements AutoCloseable {
     // What the pump's thread is told, and what it tells.
     private volatile double framesPerSecond;
     private volatile boolean jumped;
-    private volatile boolean hidden;
+    private boolean hidden; // Under the lock of this object.
     private volatile long shown;
     private volatile long dropped;
     private volatile long firstFrameAt;
@@ -47,9 +47,10 @@ final class FramePump implements AutoCloseable {
         jumped = true;
     }
 
-    /** Frames that come meanwhile are neither shown nor counted. */
-    void hide(boolean hide) {
+    /** Of the frames that come meanwhile only the last is shown, afterwards. */
+    synchronized void hide(boolean hide) {
         hidden = hide;
+        notifyAll();
     }
 
     long shown() {
@@ -81,7 +82,7 @@ final class FramePump implements AutoCloseable {
             throws InterruptedException {
         while (!closed && rate == framesPerSecond) {
             try (Image image = reader.awaitImage(WAIT_MS)) {
-                if (image == null || hidden) {
+                if (image == null || isOvertaken()) {
                     continue;
                 }
                 if (firstFrameAt == 0) {
@@ -99,9 +100,22 @@ final class FramePump implements AutoCloseable {
         }
     }
 
+    /** Keeps a frame until frames are shown; whether there is a later one then. */
+    private synchronized boolean isOvertaken() throws InterruptedException {
+        if (!hidden) {
+            return false;
+        }
+        long count = reader.getFrameCount();
+        while (hidden && !closed) {
+            wait();
+        }
+        return closed || reader.getFrameCount() > count;
+    }
+
     @Override
-    public void close() {
+    public synchronized void close() {
         closed = true;
+        notifyAll();
         reader.close();
     }
 }

@@ -24,6 +24,7 @@ public final class Session implements AutoCloseable {
     private final PlayOptions options;
     private final OrvMediaPlayer player = new OrvMediaPlayer();
     private final FramePump frames;
+    private final Playhead playhead;
     private final CountDownLatch ended = new CountDownLatch(1);
     private final Stopwatch stopwatch = new Stopwatch();
     private volatile double frameRate;
@@ -33,6 +34,7 @@ public final class Session implements AutoCloseable {
     public Session(PlayOptions options, Consumer<Image> screen) {
         this.options = options;
         frames = new FramePump(screen);
+        playhead = new Playhead(player, frames);
         player.addListener(new Ending());
     }
 
@@ -53,8 +55,9 @@ public final class Session implements AutoCloseable {
             frames.start();
             player.prepare();
             Silence.explain(player);
-            goToStart();
             frameRate = player.tracks().currentVideo().map(VideoTrack::frameRate).orElse(0.0);
+            playhead.open();
+            goToStart();
             frames.expect(frameRate);
             applyOptions();
         } catch (IOException | SecurityException | IllegalStateException e) {
@@ -71,10 +74,40 @@ public final class Session implements AutoCloseable {
         player.start();
     }
 
-    public void seekTo(int millis) {
-        frames.expectJump();
-        player.seekTo(millis);
-        frames.expectJump();
+    /** Plays or pauses; waits for no seek: what is asked for during one holds after it. */
+    public void togglePlaying() {
+        playhead.togglePlaying();
+    }
+
+    /**
+     * Goes to the frame that is shown at that time; media without a picture, and media that plays
+     * backward, to where the player's own seek leads. Blocks; what played plays on afterwards.
+     *
+     * @return where it ended, in milliseconds
+     */
+    public int seekTo(int millis) throws Failure {
+        if (!player.trickPlay().canSeekAt(1)) {
+            throw new Failure("seeking is not possible in this media");
+        }
+        playhead.seekTo(millis);
+        return player.getCurrentPosition();
+    }
+
+    /** Whether a seek or step is under way. */
+    public boolean isSeeking() {
+        return playhead.isMoving();
+    }
+
+    /** Goes some frames on, or back when negative, and pauses there. Blocks. */
+    public void step(int count) throws Failure {
+        if (player.getVideoWidth() == 0) {
+            throw new Failure("the media has no picture to step through");
+        }
+        try {
+            playhead.step(count);
+        } catch (IllegalStateException e) {
+            throw new Failure(count > 0 ? "this is the last frame" : "this is the first frame", e);
+        }
     }
 
     public void setSpeed(double speed) throws Failure {
@@ -128,7 +161,7 @@ public final class Session implements AutoCloseable {
         return new Snapshot(
                 player.getCurrentPosition(),
                 player.getDuration(),
-                player.isPlaying(),
+                playhead.isPlaying(),
                 player.trickPlay().getSpeed(),
                 player.trickPlay().getBufferedPercent(),
                 frames.shown(),
@@ -205,11 +238,6 @@ public final class Session implements AutoCloseable {
         }
         if (start > 0) {
             seekTo(start);
-        }
-        if (start > 0 && options.speed > 0) {
-            frames.hide(true);
-            Approach.to(player, start);
-            frames.hide(false);
         }
     }
 

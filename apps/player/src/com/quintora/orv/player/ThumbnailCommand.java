@@ -100,8 +100,7 @@ final class ThumbnailCommand implements Callable<Integer> {
         if (duration > 0 && at > duration) {
             throw Failure.endsBefore(source, duration, "that moment");
         }
-        player.seekTo(at);
-        Approach.to(player, at);
+        Approach.of(player).to(at);
     }
 
     private Thumbnail draw(OrvMediaPlayer player) throws Failure {

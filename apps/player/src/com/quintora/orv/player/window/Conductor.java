@@ -13,20 +13,15 @@ import java.awt.Component;
 import java.awt.EventQueue;
 import java.util.ArrayList;
 import java.util.List;
-import java.util.concurrent.Executors;
-import java.util.concurrent.RejectedExecutionException;
-import java.util.concurrent.ScheduledExecutorService;
-import java.util.concurrent.TimeUnit;
+import java.util.Locale;
 import java.util.concurrent.atomic.AtomicInteger;
 
 /**
- * Carries out what the window's controls ask, on a thread of its own, because the player's calls
- * may take their time; and tells the window how things stand.
+ * Carries out what the window's controls ask, on threads of its own, because the player's calls may
+ * take their time; and tells the window how things stand. Pausing and the volume wait for nothing
+ * that takes long, such as a seek.
  */
 final class Conductor implements Controls {
-    private static final int POLL_MS = 80;
-    private static final int NO_SEEK = -1;
-
     /** A call of the player's. */
     interface Command {
         void run() throws Failure;
@@ -36,14 +31,10 @@ final class Conductor implements Controls {
     private final OrvMediaPlayer player;
     private final Stage stage;
     private final MediaDetails details;
-    private final ScheduledExecutorService worker =
-            Executors.newSingleThreadScheduledExecutor(
-                    task -> {
-                        Thread thread = new Thread(task, "conductor");
-                        thread.setDaemon(true);
-                        return thread;
-                    });
-    private final AtomicInteger pendingSeek = new AtomicInteger(NO_SEEK);
+    private final Mover mover;
+    private final Workers workers = new Workers();
+    private final AtomicInteger pendingSpeedSteps = new AtomicInteger();
+    private volatile boolean ending;
     private volatile Failure failure;
 
     // On the window's thread.
@@ -55,13 +46,14 @@ final class Conductor implements Controls {
         this.stage = stage;
         player = session.player();
         details = new MediaDetails(player);
+        mover = new Mover(new Moved(), this::later, this::tell);
         volume = options.volume() / 100.0;
         player.addListener(new Events());
     }
 
     /** Opens the media and plays it; the window tells what becomes of it. */
     void begin() {
-        worker.execute(() -> failOn(this::openAndPlay));
+        workers.later(() -> failOn(this::openAndPlay));
     }
 
     private void openAndPlay() throws Failure {
@@ -69,23 +61,24 @@ final class Conductor implements Controls {
         details.read();
         EventQueue.invokeLater(() -> stage.showMedia(details, volume));
         session.start();
-        worker.scheduleWithFixedDelay(
-                () -> failOn(this::poll), 0, POLL_MS, TimeUnit.MILLISECONDS);
+        workers.begin(() -> failOn(this::poll));
     }
 
     /** Runs what the playback cannot go on without. */
     void failOn(Command command) {
         try {
             command.run();
-        } catch (Failure e) {
-            fail(e);
-        } catch (RuntimeException e) {
-            if (player.getState() != PlayerState.RELEASED) {
-                fail(new Failure(sentence(e), e));
+        } catch (Failure | RuntimeException e) {
+            if (!isEnding()) {
+                fail(e instanceof Failure problem ? problem : new Failure(sentence(e), e));
             }
-            // Otherwise the window was closed meanwhile. Nothing is left to poll in either case.
-            worker.shutdown();
+            workers.endPolling();
         }
+    }
+
+    // What fails then is no failure.
+    private boolean isEnding() {
+        return ending || player.getState() == PlayerState.RELEASED;
     }
 
     // Exceptions that are no answer of the player's rarely have words that say enough.
@@ -98,7 +91,8 @@ final class Conductor implements Controls {
     }
 
     void end() {
-        worker.shutdownNow();
+        ending = true;
+        workers.end();
     }
 
     Failure failure() {
@@ -107,50 +101,22 @@ final class Conductor implements Controls {
 
     @Override
     public void togglePlaying() {
-        later(
-                () -> {
-                    if (player.isPlaying()) {
-                        player.pause();
-                    } else {
-                        player.start();
-                    }
-                });
+        soon(session::togglePlaying);
     }
 
     @Override
     public void skip(int millis) {
-        stage.tell((millis < 0 ? "− " : "+ ") + Math.abs(millis) / 1000 + " s");
-        later(() -> skipFrom(player.getCurrentPosition(), millis));
+        mover.skip(millis);
     }
 
-    // A seek ends at the key frame before its goal. Where key frames are so far apart that this
-    // leads back, the goal moves on.
-    private void skipFrom(int from, int millis) {
-        int duration = player.getDuration();
-        int goal = from;
-        do {
-            goal = goalOf(goal, millis, duration);
-            session.seekTo(goal);
-        } while (millis > 0 && goal < duration && player.getCurrentPosition() <= from);
-    }
-
-    /** Where a skip leads, in milliseconds; without a duration (0) nobody knows where to stop. */
-    static int goalOf(int from, int millis, int duration) {
-        long end = duration > 0 ? duration : Integer.MAX_VALUE;
-        return (int) Math.max(0, Math.min((long) from + millis, end));
-    }
-
-    // While the knob is dragged only its latest place counts.
     @Override
     public void seekTo(int millis) {
-        if (pendingSeek.getAndSet(millis) == NO_SEEK) {
-            later(() -> session.seekTo(pendingSeek.getAndSet(NO_SEEK)));
-        }
+        mover.seekTo(millis);
     }
 
     @Override
     public void step(int frames) {
-        later(() -> player.trickPlay().step(frames));
+        mover.step(frames);
     }
 
     @Override
@@ -176,22 +142,28 @@ final class Conductor implements Controls {
     private void applyVolume() {
         stage.showVolume(volume, muted);
         double level = muted ? 0 : volume;
-        later(() -> session.setVolume(level));
+        soon(() -> session.setVolume(level));
     }
 
     @Override
     public void changeSpeed(int steps) {
-        later(() -> applySpeed(Speeds.from(player.trickPlay().getSpeed(), steps)));
+        if (pendingSpeedSteps.getAndAdd(steps) == 0) {
+            later(
+                    () -> {
+                        int all = pendingSpeedSteps.getAndSet(0);
+                        applySpeed(Speeds.from(player.trickPlay().getSpeed(), all));
+                    });
+        }
     }
 
     private void applySpeed(double speed) throws Failure {
         session.setSpeed(speed);
-        EventQueue.invokeLater(() -> stage.tell(Speeds.label(speed)));
+        tell(Speeds.label(speed));
     }
 
     @Override
     public void chooseSpeed(Component above) {
-        later(
+        soon(
                 () -> {
                     double now = player.trickPlay().getSpeed();
                     List<ChoiceMenu.Choice> choices = new ArrayList<>();
@@ -256,12 +228,16 @@ final class Conductor implements Controls {
         session.requestFrameSize(width, height);
     }
 
+    private void tell(String words) {
+        EventQueue.invokeLater(() -> stage.tell(words));
+    }
+
     private void later(Command command) {
-        try {
-            worker.execute(() -> carryOut(command));
-        } catch (RejectedExecutionException e) {
-            // The window is closing.
-        }
+        workers.later(() -> carryOut(command));
+    }
+
+    private void soon(Command command) {
+        workers.soon(() -> carryOut(command));
     }
 
     // What the player refuses, such as a seek in a live stream, is worth a notice, no more.
@@ -269,10 +245,14 @@ final class Conductor implements Controls {
         try {
             command.run();
         } catch (Failure | RuntimeException e) {
-            if (failure == null && player.getState() != PlayerState.RELEASED) {
-                EventQueue.invokeLater(() -> stage.tell(sentence(e)));
+            if (failure == null && !isEnding()) {
+                tell(capitalized(sentence(e)));
             }
         }
+    }
+
+    private static String capitalized(String sentence) {
+        return sentence.substring(0, 1).toUpperCase(Locale.ROOT) + sentence.substring(1);
     }
 
     private void poll() {
@@ -288,6 +268,28 @@ final class Conductor implements Controls {
         failure = problem;
         System.err.println("orv: " + problem.getMessage());
         EventQueue.invokeLater(() -> stage.showFailure(problem.getMessage()));
+    }
+
+    private final class Moved implements Mover.Playback {
+        @Override
+        public int position() {
+            return player.getCurrentPosition();
+        }
+
+        @Override
+        public int duration() {
+            return player.getDuration();
+        }
+
+        @Override
+        public int seekTo(int millis) throws Failure {
+            return session.seekTo(millis);
+        }
+
+        @Override
+        public void step(int frames) throws Failure {
+            session.step(frames);
+        }
     }
 
     private final class Events implements PlayerListener {

@@ -14,11 +14,9 @@ import javax.swing.SwingUtilities;
 import org.junit.jupiter.api.AfterEach;
 import org.junit.jupiter.api.BeforeEach;
 import org.junit.jupiter.api.Test;
-import org.junit.jupiter.params.ParameterizedTest;
-import org.junit.jupiter.params.provider.CsvSource;
 import picocli.CommandLine;
 
-/** What becomes of the player's refusals, and where skips lead. */
+/** What becomes of the player's refusals. */
 class ConductorWindowTest {
     private final Stage stage = new Stage("test");
     private Session session;
@@ -74,15 +72,6 @@ class ConductorWindowTest {
         session.close();
         conductor.failOn(() -> session.player().start());
         assertNull(conductor.failure());
-    }
-
-    @ParameterizedTest
-    @CsvSource({
-        "5000, 10000, 60000, 15000", "55000, 10000, 60000, 60000", "5000, -10000, 60000, 0",
-        "5000, 10000, 0, 15000", "5000, -10000, 0, 0", "2147483000, 10000, 0, 2147483647"
-    })
-    void aSkipEndsWithinTheMedia(int from, int by, int duration, int goal) {
-        assertEquals(goal, Conductor.goalOf(from, by, duration));
     }
 
     private static JLabel label(String name) throws Exception {

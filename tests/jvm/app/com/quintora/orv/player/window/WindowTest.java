@@ -50,14 +50,57 @@ class WindowTest extends WindowFixture {
         awaitSecond(0, 0);
     }
 
+    /** Key frames are 15 seconds apart. */
     @Test
-    void farKeyFramesDoNotHoldUpASkip() throws Exception {
-        open("distant.mkv");
+    void skipsAreExactBetweenKeyFrames() throws Exception {
+        open("distant.mkv", "--start", "12");
         awaitButton("Pause (Space)");
         press("SPACE");
         awaitButton("Play (Space)");
+        int start = second();
+        assertTrue(start >= 11, start + " s");
+        press("shift RIGHT");
+        awaitSecond(start + 1, start + 1);
+        Wait.until("it says so", () -> ("+ 1 s  " + label()).equals(notice()));
+        press("LEFT");
+        awaitSecond(start - 9, start - 9);
+        Wait.until("it says so", () -> ("− 10 s  " + label()).equals(notice()));
+        press("HOME");
+        awaitSecond(0, 0);
+    }
+
+    @Test
+    void aSkipBeyondTheEndSaysHowFarItWent() throws Exception {
+        open("distant.mkv", "--start", "25");
+        awaitButton("Pause (Space)");
+        press("SPACE");
+        awaitButton("Play (Space)");
+        press("PAGE_DOWN");
+        awaitSecond(29, 29);
+        Wait.until("it says so", () -> notice().matches("\\+ [2-5](\\.\\d)? s  0:29"));
+    }
+
+    @Test
+    void whatPlayedPlaysOnAfterASkip() throws Exception {
+        open("distant.mkv");
+        awaitButton("Pause (Space)");
         press("RIGHT");
-        awaitSecond(15, 16);
+        awaitSecond(10, 12);
+        awaitButton("Pause (Space)");
+        int before = second();
+        Wait.until("it goes on", () -> second() > before);
+    }
+
+    @Test
+    void aStepPauses() throws Exception {
+        open("distant.mkv");
+        awaitButton("Pause (Space)");
+        press("PERIOD");
+        awaitButton("Play (Space)");
+        press("HOME");
+        awaitSecond(0, 0);
+        press("COMMA");
+        Wait.until("it says so", () -> "This is the first frame".equals(notice()));
     }
 
     @Test
