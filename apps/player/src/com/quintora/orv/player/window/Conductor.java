@@ -257,7 +257,11 @@ final class Conductor implements Controls {
 
     private void poll() {
         Snapshot now = session.snapshot();
-        EventQueue.invokeLater(() -> stage.show(now));
+        boolean seeks = session.isSeeking();
+        EventQueue.invokeLater(() -> {
+            stage.show(now);
+            stage.showWaiting(seeks, now.playing());
+        });
     }
 
     // The first failure is the cause of what follows.
@@ -296,6 +300,14 @@ final class Conductor implements Controls {
         @Override
         public void onError(OrvMediaPlayer player, MediaException error) {
             fail(new Failure(error.getMessage(), error));
+        }
+
+        @Override
+        public void onInfo(OrvMediaPlayer player, int what, int extra) {
+            if (what == INFO_BUFFERING_STARTED || what == INFO_BUFFERING_ENDED) {
+                boolean waits = what == INFO_BUFFERING_STARTED;
+                EventQueue.invokeLater(() -> stage.setBuffering(waits));
+            }
         }
 
         @Override

@@ -51,6 +51,11 @@ final class MessagePanel extends JPanel {
         this.glyph = glyph;
         this.color = color;
         this.title.setText(title);
+        // Whole addresses are cut off at the end.
+        this.title.setPreferredSize(null);
+        Dimension whole = this.title.getPreferredSize();
+        this.title.setPreferredSize(
+                new Dimension(Math.min(whole.width, TEXT_WIDTH), whole.height));
         this.text.setText(text);
         // A text area knows its height only once its width is set.
         this.text.setSize(TEXT_WIDTH, Short.MAX_VALUE);

@@ -15,6 +15,7 @@ final class NoticePane extends JPanel {
     private final CardLayout cards = new CardLayout();
     private final Timer noticeEnd = new Timer(NOTICE_MS, event -> setNotice(""));
     private String notice = "";
+    private String lasting = "";
 
     NoticePane() {
         setLayout(cards);
@@ -32,10 +33,26 @@ final class NoticePane extends JPanel {
         noticeEnd.restart();
     }
 
+    /** Writes a few words until others come, or none; what is told for a moment goes first. */
+    void keepTelling(String words) {
+        if (!words.equals(lasting)) {
+            lasting = words;
+            showWords();
+        }
+    }
+
     private void setNotice(String words) {
         notice = words;
-        getAccessibleContext().setAccessibleDescription(words);
+        showWords();
+    }
+
+    private void showWords() {
+        getAccessibleContext().setAccessibleDescription(words());
         repaint();
+    }
+
+    private String words() {
+        return notice.isEmpty() ? lasting : notice;
     }
 
     /** A new frame is painted from here on, or it would cover the words. */
@@ -47,21 +64,21 @@ final class NoticePane extends JPanel {
     @Override
     public void paint(Graphics graphics) {
         super.paint(graphics);
-        if (!notice.isEmpty()) {
-            paintNotice(graphics);
+        if (!words().isEmpty()) {
+            paintWords(graphics, words());
         }
     }
 
-    private void paintNotice(Graphics graphics) {
+    private void paintWords(Graphics graphics, String words) {
         Graphics2D g = Theme.smooth(graphics);
         g.setFont(Theme.BODY.deriveFont(16f));
         var metrics = g.getFontMetrics();
-        int width = metrics.stringWidth(notice) + 28;
+        int width = metrics.stringWidth(words) + 28;
         int height = metrics.getHeight() + 16;
         g.setColor(new Color(0, 0, 0, 170));
         g.fillRoundRect(20, 20, width, height, Theme.CORNER * 2, Theme.CORNER * 2);
         g.setColor(Theme.TEXT);
-        g.drawString(notice, 34, 28 + metrics.getAscent());
+        g.drawString(words, 34, 28 + metrics.getAscent());
         g.dispose();
     }
 }

@@ -17,6 +17,7 @@ import java.util.Locale;
 import javax.swing.JFrame;
 import javax.swing.LayoutFocusTraversalPolicy;
 import javax.swing.SwingUtilities;
+import javax.swing.Timer;
 import javax.swing.WindowConstants;
 
 /** The window: the picture or a message, and the controls. On the window's thread but for draw. */
@@ -24,6 +25,8 @@ final class Stage {
     private static final String VIDEO = "video";
     private static final String MESSAGE = "message";
     private static final double LARGEST_PART_OF_SCREEN = 0.8;
+    private static final int OPENING_MS = 400;
+    private static final int LONG_SEEK_LOOKS = 5;
 
     private final String name;
     private final VideoPane video = new VideoPane(this::requestFrames);
@@ -31,10 +34,14 @@ final class Stage {
     private JFrame frame;
     private ControlBar bar;
     private final Help help = new Help();
+    // Most media open so quickly that a word about it would only flicker.
+    private final Timer opening = new Timer(OPENING_MS, event -> showOpening());
     private FullScreen fullScreen;
     private MessagePanel message;
     private Conductor conductor;
     private Dimension videoSize;
+    private boolean buffering;
+    private int seekingLooks;
     private Runnable onClosed;
 
     /** The name stands in the title bar. */
@@ -63,6 +70,8 @@ final class Stage {
         frame.pack();
         frame.setLocationRelativeTo(null);
         frame.setVisible(true);
+        opening.setRepeats(false);
+        opening.start();
     }
 
     /** Called with each frame, on the frames' thread. */
@@ -71,7 +80,13 @@ final class Stage {
         video.draw(plane.getBuffer(), image.getWidth(), image.getHeight(), plane.getRowStride());
     }
 
+    private void showOpening() {
+        tellInstead(Glyph.PLAY, Theme.ACCENT, name, "Opening…");
+    }
+
     void showMedia(MediaDetails details, double volume) {
+        opening.stop();
+        room.show(VIDEO);
         bar.showTracks(details.audioTracks(), details.subtitleTracks());
         bar.seekBar().showMarks(details.chapters());
         bar.showVolume(volume, false);
@@ -95,6 +110,18 @@ final class Stage {
         requestFrames();
     }
 
+    /** Whether the media waits for data, once it plays. */
+    void setBuffering(boolean waits) {
+        buffering = waits;
+    }
+
+    /** Says what the user waits for; a seek that is quick is not worth a word. */
+    void showWaiting(boolean seeks, boolean plays) {
+        seekingLooks = seeks ? seekingLooks + 1 : 0;
+        boolean isLongSeek = seekingLooks > LONG_SEEK_LOOKS;
+        room.keepTelling(isLongSeek ? "Seeking…" : buffering && plays ? "Buffering…" : "");
+    }
+
     void show(Snapshot now) {
         bar.show(now);
         fullScreen.showPlaying(now.playing());
@@ -105,6 +132,8 @@ final class Stage {
     }
 
     void showFailure(String sentence) {
+        opening.stop();
+        room.keepTelling("");
         bar.showNothingToPlay();
         tellInstead(Glyph.ALERT, Theme.ALERT, "This cannot be played", sentence);
     }
@@ -143,6 +172,7 @@ final class Stage {
     }
 
     void close() {
+        opening.stop();
         frame.dispose();
         onClosed.run();
     }
