@@ -10,7 +10,7 @@
 
 namespace android {
 
-TarnPlayer::Engine::Engine(int decoder, orvtarn::Notifier::Deliver deliver)
+TarnPlayer::Engine::Engine(orvtarn::Notifier::Deliver deliver)
     : notifier(std::move(deliver)),
       video([this] { events.onFrame(); },
             [this](uint64_t frame, int64_t due) { return events.frameTime(frame, due); }),
@@ -49,7 +49,7 @@ TarnPlayer::Engine::Engine(int decoder, orvtarn::Notifier::Deliver deliver)
             [&](orvtarn::MediaFile& file) { found = orvtarn::keyFrameBefore(file, seconds); });
         return found;
     });
-    if (!create(decoder >= 0)) {
+    if (!create()) {
         release();
         return;
     }
@@ -58,8 +58,8 @@ TarnPlayer::Engine::Engine(int decoder, orvtarn::Notifier::Deliver deliver)
     loader.setOnForget([this] { subtitles.reset(); });
 }
 
-bool TarnPlayer::Engine::create(bool hardwareDecoder) {
-    if (!mpv.create(hardwareDecoder)) return false;
+bool TarnPlayer::Engine::create() {
+    if (!mpv.create()) return false;
     subtitles.readUsualLook();
     return protocol.install(mpv.get()) && video.create(mpv.get()) && events.start();
 }

@@ -30,7 +30,7 @@ namespace android {
 // The units of one player and the order in which they come and go.
 class TarnPlayer::Engine {
 public:
-    Engine(int decoder, orvtarn::Notifier::Deliver deliver);
+    explicit Engine(orvtarn::Notifier::Deliver deliver);
     ~Engine() { release(); }
 
     // Runs one operation, unless the player is released: then answers closed.
@@ -93,7 +93,7 @@ public:
     MediaAlbumArt* copyAlbumArt();
 
 private:
-    bool create(bool hardwareDecoder);
+    bool create();
     void beforeLoad();
 };
 

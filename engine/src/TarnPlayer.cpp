@@ -20,9 +20,8 @@ orvtarn::RequestHeaders pairsOf(const KeyedVector<String8, String8>* headers) {
 
 }  // namespace
 
-TarnPlayer::TarnPlayer(int decoder)
-    : mEngine(new Engine(decoder,
-                         [this](int msg, int ext1, int ext2) { sendEvent(msg, ext1, ext2); })) {}
+TarnPlayer::TarnPlayer(int /*decoder*/)
+    : mEngine(new Engine([this](int msg, int ext1, int ext2) { sendEvent(msg, ext1, ext2); })) {}
 
 TarnPlayer::~TarnPlayer() = default;
 

@@ -37,7 +37,7 @@ Loudness loudnessOf(const std::vector<uint8_t>& bytes) {
 class AudioTest : public testing::Test {
 protected:
     AudioTest() {
-        EXPECT_TRUE(mpv.create(false));
+        EXPECT_TRUE(mpv.create());
         mpv.set("ao", "pcm");
         mpv.set("ao-pcm-file", file);
         mpv.set("ao-pcm-waveheader", false);

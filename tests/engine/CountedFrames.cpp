@@ -21,7 +21,6 @@ android::status_t CountingSink::queueBuffer(int slot, int64_t timestampUs) {
     const CountedFrame frame = {numberIn(newest()), timestampUs};
     std::lock_guard<std::mutex> lock(mFramesMutex);
     mFrames.push_back(frame);
-    fprintf(stderr, "FRAME %d\n", frame.number);
     mLast = frame;
     return status;
 }

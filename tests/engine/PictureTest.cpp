@@ -19,6 +19,17 @@ namespace {
 // beside the right one has less than 25 dB.
 constexpr double kSamePicture = 30;  // dB
 
+constexpr char kDeinterlace[] = "bwdif=mode=send_frame:deint=interlaced,";
+// Up to 1000 cd/m², of which 203 are white.
+constexpr char kTonesOfPq[] =
+    "zscale=tin=smpte2084:pin=bt2020:min=bt2020nc:rin=tv:t=linear:npl=203:p=bt709,"
+    "tonemap=mobius:desat=0:peak=4.9261,"
+    "zscale=tin=linear:pin=bt709:t=bt709:p=bt709:m=bt709:r=tv,format=yuv444p,";
+constexpr char kTonesOfHlg[] =
+    "zscale=tin=arib-std-b67:pin=bt2020:min=bt2020nc:rin=tv:t=linear:npl=203:p=bt709,"
+    "tonemap=mobius:desat=0:peak=4.9261,"
+    "zscale=tin=linear:pin=bt709:t=bt709:p=bt709:m=bt709:r=tv,format=yuv444p,";
+
 struct Kind {
     const char* file;
     int width;  // as it is to be seen
@@ -132,6 +143,14 @@ INSTANTIATE_TEST_SUITE_P(Colours, PictureTest,
                                          Kind{"bt709.mkv", 192, 108},
                                          Kind{"bt709-full.mkv", 192, 108},
                                          Kind{"bt2020.mkv", 192, 108}),
+                         nameOf);
+INSTANTIATE_TEST_SUITE_P(Interlaced, PictureTest,
+                         testing::Values(Kind{"top-first.ts", 192, 108, 1.0, kDeinterlace},
+                                         Kind{"bottom-first.ts", 192, 108, 1.0, kDeinterlace}),
+                         nameOf);
+INSTANTIATE_TEST_SUITE_P(HighDynamicRange, PictureTest,
+                         testing::Values(Kind{"pq.mkv", 192, 108, 1.0, kTonesOfPq},
+                                         Kind{"hlg.mkv", 192, 108, 1.0, kTonesOfHlg}),
                          nameOf);
 
 }  // namespace

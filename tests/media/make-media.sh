@@ -57,7 +57,9 @@ make_slides_mkv() {
 # Stored lying, to be shown upright.
 make_rotated_mp4() {
     need video.mp4
-    quiet_ffmpeg -i "$folder/video.mp4" -c copy -an -metadata:s:v:0 rotate=90 "$1"
+    quiet_ffmpeg -i "$folder/video.mp4" -c copy -an "$1.mp4"
+    python3 "$here/set-display-matrix.py" "$1.mp4" 0 1 -1 0 180 0 "$1"
+    rm "$1.mp4"
 }
 
 # Without a word about its colours, and with.
@@ -452,19 +454,18 @@ make_locale() {
 # left out in most formats and programs fill them in differently.
 soft() { echo "testsrc2=size=${1:-192x108}:rate=25:duration=2,gblur=2"; }
 
-# The argument after the file: by how much it is to be turned to be seen.
-turned() {
-    need soft.mp4
-    quiet_ffmpeg -i "$folder/soft.mp4" -c copy -metadata:s:v:0 rotate="$2" "$1"
-}
-
 make_soft_mp4() {
     # shellcheck disable=SC2046
     quiet_ffmpeg -f lavfi -i "$(soft)" $(h264) -crf 8 "$1"
 }
-make_turned_90_mp4() { turned "$1" 90; }
-make_turned_180_mp4() { turned "$1" 180; }
-make_turned_270_mp4() { turned "$1" 270; }
+# The arguments: a display matrix without its last column, as in with_matrix.
+soft_with_matrix() {
+    need soft.mp4
+    python3 "$here/set-display-matrix.py" "$folder/soft.mp4" "$@"
+}
+make_turned_90_mp4() { soft_with_matrix 0 1 -1 0 108 0 "$1"; }
+make_turned_180_mp4() { soft_with_matrix -1 0 0 -1 192 108 "$1"; }
+make_turned_270_mp4() { soft_with_matrix 0 -1 1 0 0 192 "$1"; }
 
 # Two pictures of which the second, the usual one, is stored lying.
 make_turned_and_not_mp4() {

@@ -38,7 +38,9 @@ namespace android {
 // listener on a thread of the engine's own, on which it may call the player.
 class TarnPlayer : public MediaPlayerBase {
 public:
-    // -1 makes a player that is not bound to a hardware decoder. Sets the
+    // decoder: the number of the hardware decoder to use, -1 for any. This engine
+    // chooses by itself, whatever the number: a decoder of the machine's that
+    // copies its pictures back, or software where there is none. Sets the
     // process's LC_NUMERIC to "C". A player whose mpv cannot start, as
     // without memory, is as a released one.
     explicit TarnPlayer(int decoder);

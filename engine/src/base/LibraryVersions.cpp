@@ -22,6 +22,7 @@ struct Renamed {
 // mpv 0.40 has the first name, 0.35 the second.
 const Renamed kRenamed[] = {
     {"load-console", "load-osd-console"},
+    {"play-direction", "play-dir"},
     {"sub-outline-color", "sub-border-color"},
 };
 

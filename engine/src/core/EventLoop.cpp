@@ -492,7 +492,7 @@ android::status_t EventLoop::causeOfBreak() {
 
 // The shown time is clearly before the end that the media name.
 bool EventLoop::endsEarly() {
-    if (mMpv.getString("play-dir").value_or("") == "backward") return false;
+    if (mMpv.isBackward()) return false;
     const PlayerState::Values now = mState.read([](const PlayerState::Values& v) { return v; });
     const double position = mMpv.getDouble("time-pos").value_or(now.position);
     // A stream without a length ends when its connection does.

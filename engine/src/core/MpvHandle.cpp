@@ -10,11 +10,15 @@
 #include "base/EngineLog.h"
 #include "base/LibraryVersions.h"
 #include "core/AudioOutputs.h"
+#include "core/MpvValue.h"
 #include "source/TlsSettings.h"
 #include "source/UrlScheme.h"
 
 namespace orvtarn {
 namespace {
+
+constexpr char kDirection[] = "play-direction";
+constexpr char kBackward[] = "backward";
 
 struct Option {
     const char* name;
@@ -54,6 +58,8 @@ const Option kWished[] = {
     {"sws-fast", "yes"},
     // Brings back the line on screen when a subtitle track is turned on.
     {"demuxer-mkv-subtitle-preroll-secs-index", "60"},
+    // A hardware decoder that gives its pictures back, where there is one.
+    {"hwdec", "auto-copy-safe"},
     {"network-timeout", "20"},
     {"ordered-chapters", "no"},
     {"load-unsafe-playlists", "no"},
@@ -103,20 +109,19 @@ mpv_handle* createWithPointInNumbers() {
 
 }  // namespace
 
-bool MpvHandle::create(bool hardwareDecoder) {
+bool MpvHandle::create() {
     mHandle = createWithPointInNumbers();
     if (mHandle == nullptr) return refused(__func__, "no playback core");
-    if (setOptions(hardwareDecoder) && initialize()) return true;
+    if (setOptions() && initialize()) return true;
     destroy();
     return false;
 }
 
-bool MpvHandle::setOptions(bool hardwareDecoder) {
+bool MpvHandle::setOptions() {
     for (const Option& option : kNeeded) {
         if (!setNeeded(mHandle, option)) return false;
     }
     for (const Option& option : kWished) setWished(mHandle, option);
-    setWished(mHandle, {"hwdec", hardwareDecoder ? "auto-copy-safe" : "no"});
     setWished(mHandle, {"ao", audioOutputs().c_str()});
     setNetwork(mHandle);
     return true;
@@ -190,6 +195,16 @@ std::optional<std::string> MpvHandle::getString(const char* property) const {
 
 bool MpvHandle::getNode(const char* property, MpvNode& node) const {
     return mpv_get_property(mHandle, property, MPV_FORMAT_NODE, node.get()) >= 0;
+}
+
+int MpvHandle::setBackward(bool backward) {
+    return assign(mHandle, {kDirection, std::string(backward ? kBackward : "forward")});
+}
+
+bool MpvHandle::isBackward() const {
+    const std::optional<MpvAssignment> now = currentValue(mHandle, kDirection);
+    const auto* name = now ? std::get_if<std::string>(&now->value) : nullptr;
+    return name != nullptr && *name == kBackward;
 }
 
 int MpvHandle::command(std::initializer_list<const char*> arguments) {

@@ -32,7 +32,7 @@ class MpvHandle {
 public:
     // Creates and initialises mpv with the options every player has.
     // False without memory or with a library that refuses a needed one.
-    bool create(bool hardwareDecoder);
+    bool create();
     // Ends mpv; its streams are closed and its threads gone afterwards.
     void destroy();
     mpv_handle* get() const { return mHandle; }
@@ -52,12 +52,16 @@ public:
     std::optional<std::string> getString(const char* property) const;
     bool getNode(const char* property, MpvNode& node) const;
 
+    // The direction in which media play.
+    int setBackward(bool backward);
+    bool isBackward() const;
+
     int command(std::initializer_list<const char*> arguments);
     // A seek to or by a time; flags as mpv writes them, "absolute+exact".
     int seek(double seconds, const char* flags);
 
 private:
-    bool setOptions(bool hardwareDecoder);
+    bool setOptions();
     bool initialize();
 
     mpv_handle* mHandle = nullptr;

@@ -85,21 +85,27 @@ void VideoOutput::wake(bool redraw) {
 void VideoOutput::run() {
     nameThisThread("orv-render");
     bool retry = false;
+    bool showsPicture = false;  // whose surface may come to want another size
     std::unique_lock<std::mutex> lock(mWakeMutex);
     while (true) {
-        mWakeUp.wait_for(lock, retry ? kRetryInterval : kSizePollInterval,
-                         [this] { return mWoken || mQuit; });
+        const auto woken = [this] { return mWoken || mQuit; };
+        if (retry || showsPicture) {
+            mWakeUp.wait_for(lock, retry ? kRetryInterval : kSizePollInterval, woken);
+        } else {
+            mWakeUp.wait(lock, woken);
+        }
         if (mQuit) return;
         bool redraw = mRedraw || retry;
-        const bool woken = mWoken;
+        const bool isWoken = mWoken;
         mWoken = mRedraw = false;
         const uint64_t toldFrame = mToldFrame;
         const int64_t toldTimeUs = mToldTimeUs;
         lock.unlock();
         deliverHeld(toldFrame, toldTimeUs);
-        const bool newFrame = woken && takeFrame();
+        const bool newFrame = isWoken && takeFrame();
         if (!newFrame && !redraw) redraw = sizeChanged();
         retry = (newFrame || (redraw && mHasPicture)) && !render(newFrame);
+        showsPicture = mHasPicture && hasSurface();
         lock.lock();
     }
 }
@@ -144,6 +150,11 @@ VideoOutput::Size VideoOutput::wantedSize() const {
     if (mProducer->getDefaultSize(&size.width, &size.height) != android::NO_ERROR)
         return mVideoSize;
     return size.width > 0 && size.height > 0 ? size : mVideoSize.load();
+}
+
+bool VideoOutput::hasSurface() {
+    std::lock_guard<std::mutex> lock(mSurfaceMutex);
+    return mProducer != nullptr && mVisible;
 }
 
 bool VideoOutput::sizeChanged() {

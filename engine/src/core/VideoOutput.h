@@ -66,6 +66,7 @@ private:
     bool takeFrame();
     bool render(bool newFrame);
     Size wantedSize() const;
+    bool hasSurface();
     bool sizeChanged();
     android::status_t draw();
     android::status_t drawInto(const android::IGraphicBufferProducer::PixelBuffer& buffer);

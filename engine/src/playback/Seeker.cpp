@@ -68,7 +68,7 @@ status_t Seeker::runAndAwait(const char* operation, const std::function<int()>& 
 }
 
 status_t Seeker::setDirection(const char* operation, bool backward) {
-    const auto turn = [&] { return mMpv.set("play-dir", backward ? "backward" : "forward"); };
+    const auto turn = [&] { return mMpv.setBackward(backward); };
     return inTurn(operation, Kind::SeekInPlace,
                   [&](const Turn& t) { return await(operation, t, turn); });
 }
@@ -173,9 +173,10 @@ status_t Seeker::moveTo(double target, const char* flags, const Turn& turn) {
 // To a time, decoding from a key frame that is known. In formats without an index
 // mpv itself gets to the first key frame after the time that it asks for.
 status_t Seeker::moveFrom(double key, double target, const Turn& turn) {
+    const double usual = mMpv.getDouble("hr-seek-demuxer-offset").value_or(0);
     mMpv.set("hr-seek-demuxer-offset", target - key + kRunUp);
     const status_t status = await("seekTo", turn, [&] { return mMpv.seek(target, kExact); });
-    mMpv.set("hr-seek-demuxer-offset", 0.0);
+    mMpv.set("hr-seek-demuxer-offset", usual);
     return status;
 }
 

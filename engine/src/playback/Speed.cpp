@@ -91,7 +91,7 @@ bool Speed::onEndReached() {
 void Speed::becomeNormal() {
     mSpeed = ORV_SPEED_NORMAL;
     setTempo(ORV_SPEED_NORMAL);
-    mMpv.set("play-dir", "forward");
+    mMpv.setBackward(false);
     mTransport.setTrick(false, false);
 }
 
