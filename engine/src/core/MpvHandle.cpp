@@ -10,6 +10,7 @@
 #include "base/EngineLog.h"
 #include "base/LibraryVersions.h"
 #include "core/AudioOutputs.h"
+#include "core/HardwareDecoder.h"
 #include "core/MpvValue.h"
 #include "source/TlsSettings.h"
 #include "source/UrlScheme.h"
@@ -58,8 +59,6 @@ const Option kWished[] = {
     {"sws-fast", "yes"},
     // Brings back the line on screen when a subtitle track is turned on.
     {"demuxer-mkv-subtitle-preroll-secs-index", "60"},
-    // A hardware decoder that gives its pictures back, where there is one.
-    {"hwdec", "auto-copy-safe"},
     {"network-timeout", "20"},
     {"ordered-chapters", "no"},
     {"load-unsafe-playlists", "no"},
@@ -122,6 +121,7 @@ bool MpvHandle::setOptions() {
         if (!setNeeded(mHandle, option)) return false;
     }
     for (const Option& option : kWished) setWished(mHandle, option);
+    setWished(mHandle, {"hwdec", hardwareDecoder()});
     setWished(mHandle, {"ao", audioOutputs().c_str()});
     setNetwork(mHandle);
     return true;
