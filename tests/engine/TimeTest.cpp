@@ -3,6 +3,8 @@
 #include <media/MediaTrack.h>
 #include <orvtarn/PlayerTypes.h>
 
+#include <cmath>
+
 #include "CountedFrames.h"
 #include "PlayerTest.h"
 
@@ -68,7 +70,8 @@ class FrameTimeTest : public TimeTest,
                       public testing::WithParamInterface<std::tuple<Counted, int>> {};
 
 TEST_P(FrameTimeTest, IsTheFilesOwn) {
-    const auto& [media, speed] = GetParam();
+    const Counted& media = std::get<0>(GetParam());
+    const int speed = std::get<1>(GetParam());
     open(media.file);
     ASSERT_EQ(NO_ERROR, player->setSpeed(speed));
     playToEnd();
