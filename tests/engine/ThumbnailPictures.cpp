@@ -37,7 +37,7 @@ std::vector<uint8_t> decodedAt(const std::string& name, double seconds, const st
                               ":flags=bicubic+accurate_rnd,format=bgra";
     const std::string graph = (filters.empty() ? "" : filters + ",") + select + "," + scale;
     std::vector<uint8_t> pixels =
-        outputOf("ffmpeg -nostdin -v fatal -autorotate 0 -i '" + mediaPath(name) +
+        outputOf("ffmpeg -nostdin -v fatal -noautorotate -i '" + mediaPath(name) +
                  "' -map 0:v:0 -vsync passthrough -frames:v 1 -vf '" + graph + "' -f rawvideo -");
     EXPECT_EQ(pixels.size(), static_cast<size_t>(width) * height * 4) << name << " at " << seconds;
     return pixels;
