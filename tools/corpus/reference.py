@@ -59,11 +59,13 @@ class Reference:
         """The presentation times of a stream's packets from `start` on, in
         seconds from the start of the media, sorted."""
         origin = _number(self.format.get("start_time")) or 0
-        span = "" if seconds is None else f"+{seconds}"
+        # FFmpeg 7 reads nothing of an interval without an end.
+        interval = [] if seconds is None else [
+            "-read_intervals", f"{start + origin:.3f}%+{seconds}"]
         done = child.run(
             ["ffprobe", "-v", "error", "-select_streams", str(stream["index"]),
-             "-show_entries", "packet=pts_time", "-of", "csv=p=0",
-             "-read_intervals", f"{start + origin:.3f}%{span}", self.path], self.limit)
+             "-show_entries", "packet=pts_time", "-of", "csv=p=0", *interval, self.path],
+            self.limit)
         times = (_number(line.strip(",")) for line in done.out.decode().splitlines())
         return sorted(time - origin for time in times if time is not None and time - origin >= start)
 
