@@ -210,7 +210,8 @@ while_locked_until() {
     expect "a second build" 0 "" part build_targets off all
     wait "$waits"
 }
-somebody_waits() { grep -q -- "-> FLOCK.*:$(stat -c %i "$lock") " /proc/locks; }
+# The kernel's own list of locks is empty in a container.
+somebody_waits() { cat /proc/[0-9]*/comm 2>/dev/null | grep -qx flock; }
 it_says_so() { grep -q 'waiting for another build' "$folder/said"; }
 while_locked_until somebody_waits
 check "a short wait is no news" no "$(it_says_so && echo yes || echo no)"
