@@ -24,7 +24,7 @@
 namespace orvtarn {
 
 // The only thread that waits for mpv's events. Keeps the player's state
-// by them and tells the listener.
+// by them and delivers its changes to the listener.
 class EventLoop {
 public:
     EventLoop(MpvHandle& mpv, PlayerState& state, VideoOutput& video, Notifier& notifier)

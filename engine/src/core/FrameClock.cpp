@@ -23,6 +23,7 @@ void FrameClock::setSpeed(double speed) {
     mSpeed = speed;
     mKnown.reset();
     mStep.reset();
+    mLastStep.reset();
 }
 
 std::optional<double> FrameClock::leave() {

@@ -12,24 +12,23 @@ extern "C" {
 #include <libavformat/avformat.h>
 }
 
+#include "inspect/StreamTime.h"
+
 namespace orvtarn {
 namespace {
 
-// A frame that a time just misses by rounding is still meant.
-constexpr int64_t kRoundingUs = 1000;
+constexpr int64_t kRoundingUs = StreamTime::kRoundingUs;
 constexpr int64_t kFirstRunUpUs = 1000 * 1000;
 
 class FrameCounter {
 public:
-    FrameCounter(MediaFile& file, const AVStream& stream) : mFile(file), mStream(stream) {
-        const int64_t start = file.context()->start_time;
-        mStartUs = start == AV_NOPTS_VALUE ? 0 : start;
-    }
+    FrameCounter(MediaFile& file, const AVStream& stream)
+        : mFile(file), mStream(stream), mTime(file, stream) {}
 
     std::optional<FrameAt> find(int64_t timeUs, int amount) {
         for (int64_t ahead = kFirstRunUpUs; !mFile.isInterrupted(); ahead *= 4) {
             const int64_t fromUs = std::max<int64_t>(timeUs - ahead, 0);
-            if (!seek(fromUs) || !read(timeUs, amount)) return {};
+            if (!mTime.seek(fromUs) || !read(timeUs, amount)) return {};
             const auto now = mTimes.upper_bound(timeUs + kRoundingUs);
             const auto before = static_cast<int>(std::distance(mTimes.begin(), now)) - 1;
             const bool isEnough = before >= std::max(-amount, 0);
@@ -47,15 +46,6 @@ private:
         return FrameAt{timeUs / 1e6, found == index};
     }
 
-    bool seek(int64_t us) {
-        AVFormatContext* media = mFile.context();
-        if (us == 0 && (media->iformat->flags & AVFMT_TS_DISCONT) != 0) {
-            return av_seek_frame(media, -1, 0, AVSEEK_FLAG_BYTE) >= 0;
-        }
-        const int64_t time = av_rescale_q(us + mStartUs, AV_TIME_BASE_Q, mStream.time_base);
-        return av_seek_frame(media, mStream.index, time, AVSEEK_FLAG_BACKWARD) >= 0;
-    }
-
     // Keeps the times of packets from here on, until those of so many frames after
     // the time are known. Frames are not stored in the order of their times.
     bool read(int64_t timeUs, int amount) {
@@ -66,7 +56,7 @@ private:
         bool goesOn = true;
         while (goesOn && !mFile.isInterrupted() && av_read_frame(mFile.context(), packet) >= 0) {
             if (packet->stream_index == mStream.index && packet->pts != AV_NOPTS_VALUE) {
-                const int64_t us = usOf(packet->pts);
+                const int64_t us = mTime.of(packet->pts);
                 const bool isNew = mTimes.insert(us).second;
                 after += isNew && us > timeUs + kRoundingUs;
                 goesOn = after < std::max(amount, 1) || !isSettled(*packet, timeUs, amount);
@@ -82,16 +72,12 @@ private:
         if (packet.dts == AV_NOPTS_VALUE) return true;
         auto wanted = mTimes.upper_bound(timeUs + kRoundingUs);
         std::advance(wanted, std::max(amount, 1) - 1);
-        return usOf(packet.dts) >= *wanted;
-    }
-
-    int64_t usOf(int64_t timestamp) const {
-        return av_rescale_q(timestamp, mStream.time_base, AV_TIME_BASE_Q) - mStartUs;
+        return mTime.of(packet.dts) >= *wanted;
     }
 
     MediaFile& mFile;
     const AVStream& mStream;
-    int64_t mStartUs;
+    StreamTime mTime;
     std::set<int64_t> mTimes;
 };
 

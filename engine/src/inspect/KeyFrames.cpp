@@ -8,24 +8,23 @@ extern "C" {
 #include <libavformat/avformat.h>
 }
 
+#include "inspect/StreamTime.h"
+
 namespace orvtarn {
 namespace {
 
-// A frame that a time just misses by rounding is still meant.
-constexpr int64_t kRoundingUs = 1000;
+constexpr int64_t kRoundingUs = StreamTime::kRoundingUs;
 constexpr int64_t kFirstRunUpUs = 2 * 1000 * 1000;
 
 class Search {
 public:
-    Search(MediaFile& file, const AVStream& stream) : mFile(file), mStream(stream) {
-        const int64_t start = file.context()->start_time;
-        mStartUs = start == AV_NOPTS_VALUE ? 0 : start;
-    }
+    Search(MediaFile& file, const AVStream& stream)
+        : mFile(file), mStream(stream), mTime(file, stream) {}
 
     // Of packets from one time to another; both from the media's start.
     std::optional<int64_t> lastKeyFrame(int64_t fromUs, int64_t toUs) {
         std::optional<int64_t> last;
-        if (!seek(fromUs)) return last;
+        if (!mTime.seek(fromUs)) return last;
         AVPacket* packet = av_packet_alloc();
         bool goesOn = packet != nullptr;
         while (goesOn && !mFile.isInterrupted() && av_read_frame(mFile.context(), packet) >= 0) {
@@ -44,27 +43,13 @@ private:
         const int64_t decoded = packet.dts == AV_NOPTS_VALUE ? packet.pts : packet.dts;
         if (shown == AV_NOPTS_VALUE) return true;
         const bool isKey = (packet.flags & AV_PKT_FLAG_KEY) != 0;
-        if (isKey && timeUs(shown) <= toUs) last = timeUs(shown);
-        return timeUs(decoded) <= toUs;
-    }
-
-    // Searches by decoding times miss the first key frame.
-    bool seek(int64_t us) {
-        AVFormatContext* media = mFile.context();
-        if (us == 0 && (media->iformat->flags & AVFMT_TS_DISCONT) != 0) {
-            return av_seek_frame(media, -1, 0, AVSEEK_FLAG_BYTE) >= 0;
-        }
-        const int64_t time = av_rescale_q(us + mStartUs, AV_TIME_BASE_Q, mStream.time_base);
-        return av_seek_frame(media, mStream.index, time, AVSEEK_FLAG_BACKWARD) >= 0;
-    }
-
-    int64_t timeUs(int64_t timestamp) const {
-        return av_rescale_q(timestamp, mStream.time_base, AV_TIME_BASE_Q) - mStartUs;
+        if (isKey && mTime.of(shown) <= toUs) last = mTime.of(shown);
+        return mTime.of(decoded) <= toUs;
     }
 
     MediaFile& mFile;
     const AVStream& mStream;
-    int64_t mStartUs;
+    StreamTime mTime;
 };
 
 }  // namespace
