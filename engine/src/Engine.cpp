@@ -13,12 +13,14 @@ namespace android {
 TarnPlayer::Engine::Engine(orvtarn::Notifier::Deliver deliver)
     : notifier(std::move(deliver)),
       video([this] { events.onFrame(); },
-            [this](uint64_t frame, int64_t due) { return events.frameTime(frame, due); }),
-      events(mpv, state, video, notifier),
-      loader(mpv, state, video, events, protocol),
+            [this](uint64_t frame, int64_t due) { return frameTiming.begin(frame, due); }),
+      frameTiming(mpv, state, video),
+      media(mpv, state, notifier),
+      events(mpv, state, video, notifier, media, frameTiming),
+      loader(mpv, state, video, media, protocol),
       transport(mpv, state, events),
       seeker(mpv, state, notifier, events, transport),
-      speed(mpv, state, seeker, transport, events),
+      speed(mpv, state, seeker, transport, events, frameTiming),
       stepper(mpv, state, seeker, transport, events),
       abRepeat(mpv, state),
       audio(mpv, video),
@@ -28,7 +30,7 @@ TarnPlayer::Engine::Engine(orvtarn::Notifier::Deliver deliver)
       bytes(mpv, state, loader, seeker),
       metaData(mpv, state, loader),
       parameters(mpv, state, video, tracks, subtitles) {
-    events.setEndHandler([this] { return !speed.onEndReached() && transport.complete(); });
+    media.setEndHandler([this] { return !speed.onEndReached() && transport.complete(); });
     events.setPictureHandler([this] { return videoFilters.adapt(); });
     events.setOpenedHandler([this] {
         videoFilters.onOpened();

@@ -6,8 +6,10 @@
 #include "Gate.h"
 #include "base/EngineLog.h"
 #include "core/EventLoop.h"
+#include "core/FrameTiming.h"
 #include "core/MpvHandle.h"
 #include "core/Notifier.h"
+#include "core/OpenMedia.h"
 #include "core/PlayerState.h"
 #include "core/VideoOutput.h"
 #include "playback/AbRepeat.h"
@@ -71,6 +73,8 @@ public:
     orvtarn::VideoOutput video;
 
 private:
+    orvtarn::FrameTiming frameTiming;
+    orvtarn::OpenMedia media;
     orvtarn::EventLoop events;
 
 public:

@@ -82,16 +82,37 @@ TEST_F(FrameClockTest, AReportFromBeyondAJumpIsNotTheFrames) {
 TEST_F(FrameClockTest, TheLastFrameBeforeAJumpIsKnownWhenMpvLeaves) {
     playUntil(30);
     clock.begin(at(31));
-    const auto time = clock.leave();
+    const auto time = clock.leave(at(31.5));
     ASSERT_TRUE(time);
     EXPECT_NEAR(31 / 25.0, *time, 1e-6);
     EXPECT_FALSE(clock.begin(at(32))) << "no successor";
 }
 
+TEST_F(FrameClockTest, AFrameThatWasDueBeforeAJumpIsOfBefore) {
+    playUntil(30);
+    clock.leave(at(31.1));
+    EXPECT_NEAR(31, frameFor(31, 0, 0.15), 1e-6);
+    EXPECT_NEAR(0, frameFor(31.3, 0, 0.1), 1e-6);
+    EXPECT_NEAR(1, frameFor(32.3, 1, 0.1), 1e-6);
+}
+
+TEST_F(FrameClockTest, AFrameThatIsDueAfterAJumpIsOfBeyond) {
+    playUntil(30);
+    clock.leave(at(30.9));
+    EXPECT_NEAR(75, frameFor(31, 75, 0.1), 1e-6);
+}
+
+TEST_F(FrameClockTest, AFrameAtAnotherDistanceIsOfBeyondAJump) {
+    playUntil(30);
+    // The jump is known late.
+    clock.leave(at(32));
+    EXPECT_NEAR(0, frameFor(31.6, 0, 0.1), 1e-6);
+}
+
 TEST_F(FrameClockTest, NothingFollowsFromAFrameThatStandsStill) {
     playUntil(3);
     clock.begin(at(9));
-    clock.stand(2);
+    clock.stand();
     EXPECT_FALSE(clock.begin(at(10)));
 }
 

@@ -1,9 +1,7 @@
 // SPDX-License-Identifier: Apache-2.0
 #include "core/EventLoop.h"
 
-#include <math.h>
 #include <media/MediaPlayerInterface.h>
-#include <orvtarn/PlayerTypes.h>
 #include <string.h>
 
 #include <algorithm>
@@ -13,8 +11,6 @@
 #include "base/EngineLog.h"
 #include "base/ThreadName.h"
 #include "core/AudioOutputs.h"
-#include "core/MpvError.h"
-#include "source/UrlScheme.h"
 
 namespace orvtarn {
 namespace {
@@ -53,11 +49,6 @@ bool flagOf(const mpv_event_property& property) {
     return *static_cast<const int*>(property.data) != 0;
 }
 
-int64_t toMicroseconds(double seconds) { return llround(std::max(seconds, 0.0) * 1e6); }
-
-// Tracks of one file may end at different times. Seconds.
-constexpr double kEndSlack = 1.5;
-
 // Places in mpv's load at which it waits.
 constexpr char kBeforeOpening[] = "on_load";
 constexpr char kOpened[] = "on_preloaded";
@@ -84,12 +75,7 @@ void EventLoop::stop() {
     mQuit = true;
     mpv_wakeup(mMpv.get());
     mThread.join();
-    mCause.stop();
-}
-
-void EventLoop::setSource(std::shared_ptr<MediaSource> source) {
-    std::lock_guard<std::mutex> lock(mSourceMutex);
-    mSource = std::move(source);
+    mMedia.stop();
 }
 
 void EventLoop::run() {
@@ -98,67 +84,33 @@ void EventLoop::run() {
     while (!mQuit) {
         const mpv_event& event = *mpv_wait_event(mMpv.get(), isEmpty ? -1 : 0);
         handle(event);
-        if (mLooksForEnd.exchange(false)) mEndReached = true;
         // A frame's time may be among the reports that wait, and mpv hands out its
         // log after everything else.
         isEmpty = event.event_id == MPV_EVENT_NONE;
         if (!isEmpty) continue;
-        if (mEndReached || mLoadFailed) settleEnd();
-        answerFrameTime();
+        mMedia.settle();
+        mFrames.answer();
     }
 }
 
-std::optional<int64_t> EventLoop::frameTime(uint64_t frame, int64_t due) {
-    const PlayerState::Values now = mState.read([](const PlayerState::Values& v) { return v; });
-    const std::optional<double> expected = mFrameClock.begin(due);
-    mUntimedFrame = frame;
-    mpv_wakeup(mMpv.get());
-    if (!expected || now.phase != Phase::Started || now.seeking) return {};
-    return toMicroseconds(*expected);
-}
-
-// Until a seek or the load is done, mpv's time may be the one that it left
-// or the one that was asked for.
-void EventLoop::answerFrameTime() {
-    const uint64_t frame = mUntimedFrame;
-    if (frame == 0) return;
-    const PlayerState::Values now = mState.read([](const PlayerState::Values& v) { return v; });
-    if (now.isArriving() || (now.phase == Phase::Preparing && !now.restarted)) return;
-    const double reported = mMpv.getDouble("time-pos").value_or(now.position);
-    if (now.phase != Phase::Started) {
-        mFrameClock.stand(reported);
-        return setFrameTime(frame, reported);
-    }
-    setFrameTime(frame, mFrameClock.resolve(reported, mpv_get_time_us(mMpv.get())));
-}
-
-void EventLoop::setFrameTime(uint64_t frame, double seconds) {
-    mVideo.setFrameTime(frame, toMicroseconds(seconds));
-    mUntimedFrame.compare_exchange_strong(frame, 0);  // unless the next one is here
-}
-
-// mpv's time is no longer that of a frame before.
 void EventLoop::onSeek() {
     mState.update([](PlayerState::Values& v) { v.seeks++; });
-    const uint64_t frame = mUntimedFrame;
-    const std::optional<double> time = mFrameClock.leave();
-    if (frame != 0 && time) setFrameTime(frame, *time);
+    mFrames.leave();
 }
 
 void EventLoop::lookForEnd() {
-    mLooksForEnd = true;
+    mMedia.lookForEnd();
     mpv_wakeup(mMpv.get());
 }
 
 void EventLoop::handle(const mpv_event& event) {
     switch (event.event_id) {
         case MPV_EVENT_START_FILE:
-            if (mLoadFailed) settleEnd();
-            mTrouble.forget();
+            mMedia.onStart();
             mState.update([](PlayerState::Values& v) { v.fileStarted = true; });
             break;
         case MPV_EVENT_END_FILE:
-            onEndFile(*static_cast<const mpv_event_end_file*>(event.data));
+            mMedia.onEndFile(*static_cast<const mpv_event_end_file*>(event.data));
             break;
         case MPV_EVENT_HOOK:
             onHook(*static_cast<const mpv_event_hook*>(event.data));
@@ -188,31 +140,17 @@ void EventLoop::handle(const mpv_event& event) {
 }
 
 void EventLoop::onHook(const mpv_event_hook& hook) {
-    if (strcmp(hook.name, kBeforeOpening) == 0) onBeforeOpening();
+    if (strcmp(hook.name, kBeforeOpening) == 0) mMedia.onBeforeOpening();
     if (strcmp(hook.name, kOpened) == 0) {
-        mHasTracks = mMpv.getInt("track-list/count").value_or(0) > 0;
+        mMedia.onOpened();
+        if (mOpenedHandler) mOpenedHandler();
     }
-    if (strcmp(hook.name, kOpened) == 0 && mOpenedHandler) mOpenedHandler();
     mpv_hook_continue(mMpv.get(), hook.id);
-}
-
-void EventLoop::onBeforeOpening() {
-    // Of a playlist, the first entry is the media: mpv would go on to the
-    // others, and even when the first fails.
-    mMpv.command({"playlist-clear"});
-    mHasTracks = false;
-    mOpening = mMpv.getString("stream-open-filename").value_or("");
-    const std::shared_ptr<MediaSource> media = source();
-    if (media == nullptr) return;
-    const android::status_t status = checkReference(*media, mOpening);
-    if (status == android::NO_ERROR) return;
-    failWith(status);
-    mMpv.command({"stop"});
 }
 
 void EventLoop::onLogMessage(const mpv_event_log_message& message) {
     const std::string text(message.text, strcspn(message.text, "\n"));
-    mTrouble.note(text);
+    mMedia.onLogLine(text);
     if (message.log_level <= MPV_LOG_LEVEL_ERROR) {
         ALOGW("%s: %s", message.prefix, text.c_str());
     } else {
@@ -225,47 +163,7 @@ void EventLoop::onLogMessage(const mpv_event_log_message& message) {
 void EventLoop::onLoaded() {
     const bool indexed = mMpv.getString("file-format").value_or("").find("mpeg") != 0;
     mMpv.set("hr-seek-demuxer-offset", indexed ? 0.0 : 2.0);
-    // A connection that breaks loses it.
-    mFileSize = mMpv.getInt("file-size").value_or(0);
-}
-
-void EventLoop::onEndFile(const mpv_event_end_file& end) {
-    const bool isPlaylist = end.reason == MPV_END_FILE_REASON_REDIRECT;
-    if (isPlaylist && end.playlist_insert_num_entries > 0) return;
-    const bool isError = end.reason == MPV_END_FILE_REASON_ERROR;
-    const bool isEnd = isPlaylist || end.reason == MPV_END_FILE_REASON_EOF;
-    if (isError || isEnd) mLoadFailed = isError ? statusOfMpvError(end.error) : ORV_ERROR_MALFORMED;
-    mFailedSession = mState.update([](PlayerState::Values& v) {
-        v.fileOpen = false;
-        return v.session;
-    });
-}
-
-// All that mpv has logged about an end is known.
-void EventLoop::settleEnd() {
-    if (mLoadFailed) onLoadFailed(*mLoadFailed);
-    if (mEndReached && !mLoadFailed) onEndReached();
-    mLoadFailed.reset();
-    mEndReached = false;
-}
-
-void EventLoop::onLoadFailed(android::status_t status) {
-    if (sourceFailed()) return failIn(mFailedSession, ORV_ERROR_IO);
-    // What they were opened with was known; what is inside was not.
-    if (status == ORV_ERROR_UNSUPPORTED && !mHasTracks) status = ORV_ERROR_MALFORMED;
-    if (!FailureCause::isVague(status)) return failIn(mFailedSession, status);
-    if (mTrouble.status() != android::NO_ERROR && mTrouble.status() != ORV_ERROR_CONNECTION_LOST) {
-        return failIn(mFailedSession, mTrouble.status());
-    }
-    findCause(status);
-}
-
-void EventLoop::findCause(android::status_t status) {
-    const std::shared_ptr<MediaSource> media = source();
-    const uint64_t session = mFailedSession;
-    if (media == nullptr) return failIn(session, status);
-    mCause.find(media, mOpening, status,
-                [this, session](android::status_t cause) { failIn(session, cause); });
+    mMedia.onLoaded();
 }
 
 void EventLoop::onRestart() {
@@ -275,7 +173,7 @@ void EventLoop::onRestart() {
         mMpv.getInt("vid").value_or(0) > 0 && mMpv.getInt("dwidth").value_or(0) > 0;
     const bool hasSound =
         mMpv.getInt("aid").value_or(0) > 0 && mMpv.getInt("audio-params/samplerate").has_value();
-    const double duration = durationOf(mMpv.getDouble("duration").value_or(0));
+    const double duration = mMedia.durationOf(mMpv.getDouble("duration").value_or(0));
     const bool seekable = mMpv.getFlag("seekable").value_or(false);
     const bool again = drawsAnew();
     const bool opened = mState.update([&](PlayerState::Values& v) {
@@ -288,11 +186,7 @@ void EventLoop::onRestart() {
         return true;
     });
     if (!opened) return endUnattendedSeek();
-    if (!hasVideo && !hasSound) {
-        mFailedSession = mState.read([](const PlayerState::Values& v) { return v.session; });
-        mLoadFailed = ORV_ERROR_MALFORMED;
-        return;
-    }
+    if (!hasVideo && !hasSound) return mMedia.onNothingToPlay();
     if (hasSound) reportSilence();
     applyLooping();
     becomePreparedIfReady();
@@ -319,7 +213,7 @@ void EventLoop::endUnattendedSeek() {
         v.position = position;
         return true;
     });
-    if (ended) mLooksForEnd = true;
+    if (ended) mMedia.lookForEnd();
 }
 
 // The first picture is not shown before its filters are right. mpv is asked for
@@ -364,12 +258,11 @@ void EventLoop::onProperty(const mpv_event_property& property) {
             case kTime:
                 return onTime(numberOf(property));
             case kDuration: {
-                const double duration = durationOf(numberOf(property));
+                const double duration = mMedia.durationOf(numberOf(property));
                 return mState.update([&](PlayerState::Values& v) { v.duration = duration; });
             }
             case kEndReached:
-                mEndReached = flagOf(property);
-                return;
+                return mMedia.onEndReached(flagOf(property));
             case kSeekable:
                 mState.update([&](PlayerState::Values& v) { v.seekable = flagOf(property); });
                 return applyLooping();
@@ -392,7 +285,7 @@ void EventLoop::applyLooping() {
 }
 
 void EventLoop::onTime(double seconds) {
-    // A word from before a seek or step that is done would undo its position.
+    // A report from before a seek or step that is done would undo its position.
     if (mState.phase() != Phase::Started) seconds = mMpv.getDouble("time-pos").value_or(seconds);
     mState.update([&](PlayerState::Values& v) { v.position = std::max(seconds, 0.0); });
 }
@@ -414,18 +307,6 @@ void EventLoop::onBuffered(double seconds) {
     if (percent >= 0) mNotifier.post(android::MEDIA_BUFFERING_UPDATE, percent);
 }
 
-void EventLoop::onEndReached() {
-    // The word may be older than a seek away from the end.
-    if (!mMpv.getFlag("eof-reached").value_or(false)) return;
-    if (brokeOff()) {
-        mMpv.set("pause", true);
-        return failWith(causeOfBreak());
-    }
-    // A seek may pass the end on its way; it has the end looked for when done.
-    if (mState.read([](const PlayerState::Values& v) { return v.seeking; })) return;
-    if (mEndHandler()) mNotifier.post(android::MEDIA_PLAYBACK_COMPLETE);
-}
-
 void EventLoop::onVideoSize() {
     const int width = static_cast<int>(mMpv.getInt("dwidth").value_or(0));
     const int height = static_cast<int>(mMpv.getInt("dheight").value_or(0));
@@ -438,66 +319,6 @@ void EventLoop::onVideoSize() {
     });
     mVideo.setVideoSize(width, height);
     if (changed) mNotifier.post(android::MEDIA_SET_VIDEO_SIZE, width, height);
-}
-
-void EventLoop::failWith(android::status_t status) {
-    failIn(mState.read([](const PlayerState::Values& v) { return v.session; }), status);
-}
-
-// Any thread. A load that was overtaken meanwhile fails nothing.
-void EventLoop::failIn(uint64_t session, android::status_t status) {
-    const bool news = mState.update(
-        [&](PlayerState::Values& v) { return v.session == session && v.fail(status); });
-    if (!news) return;
-    ALOGE("playback: ended by an error (status %d)", status);
-    mNotifier.post(android::MEDIA_ERROR, android::MEDIA_ERROR_UNKNOWN, status);
-}
-
-std::shared_ptr<MediaSource> EventLoop::source() {
-    std::lock_guard<std::mutex> lock(mSourceMutex);
-    return mSource;
-}
-
-// Of media without a length mpv only tells how far they have been read.
-double EventLoop::durationOf(double byMpv) {
-    const std::shared_ptr<MediaSource> media = source();
-    const int64_t known = media != nullptr ? media->knownDuration() : 0;
-    const bool isGuess = byMpv <= 0 || mMpv.getInt("file-size").value_or(0) <= 0;
-    return isGuess && known > 0 ? static_cast<double>(known) / 1000 : byMpv;
-}
-
-bool EventLoop::sourceFailed() {
-    const std::shared_ptr<MediaSource> media = source();
-    return media != nullptr && media->readFailed();
-}
-
-// Whether the media came to an end because nobody gives their bytes any more.
-bool EventLoop::brokeOff() {
-    const std::shared_ptr<MediaSource> media = source();
-    if (media == nullptr) return false;
-    if (media->isOfBytes()) return media->readFailed();
-    if (schemeOf(mOpening).empty() || !endsEarly()) return false;
-    if (mTrouble.status() != android::NO_ERROR) return true;
-    // Of a connection that cannot be taken up again, nothing is logged. Those
-    // that can be may end before their last byte: an index may follow the media.
-    const bool seekable = mState.read([](const PlayerState::Values& v) { return v.seekable; });
-    const int64_t position = mMpv.getInt("stream-pos").value_or(mFileSize);
-    return !seekable && (mFileSize <= 0 || position < mFileSize);
-}
-
-android::status_t EventLoop::causeOfBreak() {
-    if (sourceFailed()) return ORV_ERROR_IO;
-    return mTrouble.status() != android::NO_ERROR ? mTrouble.status() : ORV_ERROR_CONNECTION_LOST;
-}
-
-// The shown time is clearly before the end that the media name.
-bool EventLoop::endsEarly() {
-    if (mMpv.isBackward()) return false;
-    const PlayerState::Values now = mState.read([](const PlayerState::Values& v) { return v; });
-    const double position = mMpv.getDouble("time-pos").value_or(now.position);
-    // A stream without a length ends when its connection does.
-    if (now.duration <= 0) return mFileSize > 0;
-    return position < now.duration - kEndSlack;
 }
 
 }  // namespace orvtarn

@@ -26,11 +26,10 @@ void FrameClock::setSpeed(double speed) {
     mLastStep.reset();
 }
 
-std::optional<double> FrameClock::leave() {
+std::optional<double> FrameClock::leave(int64_t at) {
     std::lock_guard<std::mutex> lock(mMutex);
-    const std::optional<double> time = expected();
-    mKnown.reset();
-    return time;
+    mLeftAt = at;
+    return follows() ? expected() : std::nullopt;
 }
 
 std::optional<double> FrameClock::begin(int64_t due) {
@@ -47,6 +46,7 @@ std::optional<double> FrameClock::begin(int64_t due) {
         mStep.reset();
         mLastStep.reset();
     }
+    if (mLeftAt && (due >= *mLeftAt || !follows())) forget();
     return expected();
 }
 
@@ -57,16 +57,20 @@ double FrameClock::resolve(double reported, int64_t readAt) {
     return time;
 }
 
-void FrameClock::stand(double time) {
+void FrameClock::stand() {
     std::lock_guard<std::mutex> lock(mMutex);
+    forget();
+}
+
+void FrameClock::forget() {
     mKnown.reset();
-    mPrevious = time;
+    mLeftAt.reset();
 }
 
 double FrameClock::choose(double reported, int64_t readAt) {
     const std::optional<double> time = expected();
     // mpv has jumped meanwhile.
-    if (time && (reported - mPrevious) * mSpeed <= 0) return *time;
+    if (time && (mLeftAt || (reported - mPrevious) * mSpeed <= 0)) return *time;
     if (isInTime(readAt) || !time || !agrees(*time, reported)) {
         mKnown = Frame{reported, mDue};
         return reported;
@@ -78,6 +82,11 @@ double FrameClock::choose(double reported, int64_t readAt) {
 std::optional<double> FrameClock::expected() const {
     if (!mKnown || !mStep) return {};
     return mKnown->time + static_cast<double>(mDue - mKnown->due) * kMicroseconds * mSpeed;
+}
+
+bool FrameClock::follows() const {
+    if (!mStep) return false;
+    return static_cast<double>(*mLastStep) < static_cast<double>(*mStep) * (1 + kJitter);
 }
 
 // Before the next frame can be due.

@@ -98,7 +98,7 @@ android::status_t Loader::setSource(const char* operation,
         describeSource();
     }
     mProtocol.setSource(source);
-    mEvents.setSource(source);
+    mMedia.setSource(source);
     mState.update([](PlayerState::Values& v) { v.phase = Phase::Initialized; });
     return android::NO_ERROR;
 }
@@ -330,7 +330,7 @@ void Loader::forgetSource() {
     }
     if (mOnForget) mOnForget();
     mProtocol.setSource(nullptr);
-    mEvents.setSource(nullptr);
+    mMedia.setSource(nullptr);
     if (details != nullptr) details->close();
     if (media != nullptr) media->close();
 }

@@ -11,7 +11,7 @@
 #include <optional>
 #include <string>
 
-#include "core/EventLoop.h"
+#include "core/OpenMedia.h"
 #include "core/MpvHandle.h"
 #include "core/PlayerState.h"
 #include "core/VideoOutput.h"
@@ -27,9 +27,9 @@ namespace orvtarn {
 // Takes a data source, opens it and gives it up again.
 class Loader {
 public:
-    Loader(MpvHandle& mpv, PlayerState& state, VideoOutput& video, EventLoop& events,
+    Loader(MpvHandle& mpv, PlayerState& state, VideoOutput& video, OpenMedia& media,
            StreamProtocol& protocol)
-        : mMpv(mpv), mState(state), mVideo(video), mEvents(events), mProtocol(protocol) {}
+        : mMpv(mpv), mState(state), mVideo(video), mMedia(media), mProtocol(protocol) {}
 
     android::status_t setUrl(const char* url, RequestHeaders headers);
     android::status_t setFd(int fd, int64_t offset, int64_t length);
@@ -81,7 +81,7 @@ private:
     MpvHandle& mMpv;
     PlayerState& mState;
     VideoOutput& mVideo;
-    EventLoop& mEvents;
+    OpenMedia& mMedia;
     StreamProtocol& mProtocol;
     std::function<void()> mBeforeLoad;
     std::function<void()> mOnUnload;

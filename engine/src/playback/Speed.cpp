@@ -63,7 +63,7 @@ status_t Speed::apply(int speed) {
 // How fast mpv plays, whatever the direction. 0 or an mpv_error.
 int Speed::setTempo(int speed) {
     const double tempo = jumps(speed) ? 1.0 : abs(speed) / 1000.0;
-    mEvents.setSpeed(speed < 0 ? -tempo : tempo);
+    mFrameTiming.setSpeed(speed < 0 ? -tempo : tempo);
     const int error = mMpv.set("framedrop", speed > kFastestFullDecoding ? "decoder+vo" : "vo");
     return error < 0 ? error : mMpv.set("speed", tempo);
 }

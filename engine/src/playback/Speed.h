@@ -22,8 +22,13 @@ namespace orvtarn {
 class Speed {
 public:
     Speed(MpvHandle& mpv, PlayerState& state, Seeker& seeker, Transport& transport,
-          EventLoop& events)
-        : mMpv(mpv), mState(state), mSeeker(seeker), mTransport(transport), mEvents(events) {}
+          EventLoop& events, FrameTiming& frameTiming)
+        : mMpv(mpv),
+          mState(state),
+          mSeeker(seeker),
+          mTransport(transport),
+          mEvents(events),
+          mFrameTiming(frameTiming) {}
     ~Speed() { stopJumping(); }
 
     // BAD_VALUE outside of 250..32000 forward or backward, INVALID_OPERATION
@@ -55,6 +60,7 @@ private:
     Seeker& mSeeker;
     Transport& mTransport;
     EventLoop& mEvents;
+    FrameTiming& mFrameTiming;
     std::atomic<int> mSpeed{1000};
 
     std::mutex mSetMutex;  // one change at a time

@@ -1,0 +1,166 @@
+// SPDX-License-Identifier: Apache-2.0
+#include "core/OpenMedia.h"
+
+#include <media/MediaPlayerInterface.h>
+#include <orvtarn/PlayerTypes.h>
+
+#include <utility>
+
+#include "base/EngineLog.h"
+#include "core/MpvError.h"
+#include "source/UrlScheme.h"
+
+namespace orvtarn {
+namespace {
+
+// Tracks of one file may end at different times. Seconds.
+constexpr double kEndSlack = 1.5;
+
+}  // namespace
+
+void OpenMedia::setSource(std::shared_ptr<MediaSource> source) {
+    std::lock_guard<std::mutex> lock(mSourceMutex);
+    mSource = std::move(source);
+}
+
+void OpenMedia::onStart() {
+    if (mLoadFailed) settle();
+    mTrouble.forget();
+}
+
+void OpenMedia::onBeforeOpening() {
+    // Of a playlist, the first entry is the media: mpv would go on to the
+    // others, and even when the first fails.
+    mMpv.command({"playlist-clear"});
+    mHasTracks = false;
+    mOpening = mMpv.getString("stream-open-filename").value_or("");
+    const std::shared_ptr<MediaSource> media = source();
+    if (media == nullptr) return;
+    const android::status_t status = checkReference(*media, mOpening);
+    if (status == android::NO_ERROR) return;
+    failIn(session(), status);
+    mMpv.command({"stop"});
+}
+
+void OpenMedia::onOpened() { mHasTracks = mMpv.getInt("track-list/count").value_or(0) > 0; }
+
+// A connection that breaks loses the size.
+void OpenMedia::onLoaded() { mFileSize = mMpv.getInt("file-size").value_or(0); }
+
+void OpenMedia::onEndFile(const mpv_event_end_file& end) {
+    const bool isPlaylist = end.reason == MPV_END_FILE_REASON_REDIRECT;
+    if (isPlaylist && end.playlist_insert_num_entries > 0) return;
+    const bool isError = end.reason == MPV_END_FILE_REASON_ERROR;
+    const bool isEnd = isPlaylist || end.reason == MPV_END_FILE_REASON_EOF;
+    if (isError || isEnd) mLoadFailed = isError ? statusOfMpvError(end.error) : ORV_ERROR_MALFORMED;
+    mFailedSession = mState.update([](PlayerState::Values& v) {
+        v.fileOpen = false;
+        return v.session;
+    });
+}
+
+void OpenMedia::onNothingToPlay() {
+    mFailedSession = session();
+    mLoadFailed = ORV_ERROR_MALFORMED;
+}
+
+void OpenMedia::settle() {
+    if (mLooksForEnd.exchange(false)) mEndReached = true;
+    if (mLoadFailed) onLoadFailed(*mLoadFailed);
+    if (mEndReached && !mLoadFailed) onEnd();
+    mLoadFailed.reset();
+    mEndReached = false;
+}
+
+void OpenMedia::onLoadFailed(android::status_t status) {
+    if (sourceFailed()) return failIn(mFailedSession, ORV_ERROR_IO);
+    // What they were opened with was known; what is inside was not.
+    if (status == ORV_ERROR_UNSUPPORTED && !mHasTracks) status = ORV_ERROR_MALFORMED;
+    if (!FailureCause::isVague(status)) return failIn(mFailedSession, status);
+    if (mTrouble.status() != android::NO_ERROR && mTrouble.status() != ORV_ERROR_CONNECTION_LOST) {
+        return failIn(mFailedSession, mTrouble.status());
+    }
+    findCause(status);
+}
+
+void OpenMedia::findCause(android::status_t status) {
+    const std::shared_ptr<MediaSource> media = source();
+    const uint64_t session = mFailedSession;
+    if (media == nullptr) return failIn(session, status);
+    mCause.find(media, mOpening, status,
+                [this, session](android::status_t cause) { failIn(session, cause); });
+}
+
+void OpenMedia::onEnd() {
+    // The report may be older than a seek away from the end.
+    if (!mMpv.getFlag("eof-reached").value_or(false)) return;
+    if (brokeOff()) {
+        mMpv.set("pause", true);
+        return failIn(session(), causeOfBreak());
+    }
+    // A seek may pass the end on its way; it has the end looked for when done.
+    if (mState.read([](const PlayerState::Values& v) { return v.seeking; })) return;
+    if (mEndHandler()) mNotifier.post(android::MEDIA_PLAYBACK_COMPLETE);
+}
+
+// Whether the media came to an end because nobody gives their bytes any more.
+bool OpenMedia::brokeOff() const {
+    const std::shared_ptr<MediaSource> media = source();
+    if (media == nullptr) return false;
+    if (media->isOfBytes()) return media->readFailed();
+    if (schemeOf(mOpening).empty() || !endsEarly()) return false;
+    if (mTrouble.status() != android::NO_ERROR) return true;
+    // Of a connection that cannot be taken up again, nothing is logged. Those
+    // that can be may end before their last byte: an index may follow the media.
+    const bool seekable = mState.read([](const PlayerState::Values& v) { return v.seekable; });
+    const int64_t position = mMpv.getInt("stream-pos").value_or(mFileSize);
+    return !seekable && (mFileSize <= 0 || position < mFileSize);
+}
+
+// The shown time is clearly before the end that the media name.
+bool OpenMedia::endsEarly() const {
+    if (mMpv.isBackward()) return false;
+    const PlayerState::Values now = mState.read([](const PlayerState::Values& v) { return v; });
+    const double position = mMpv.getDouble("time-pos").value_or(now.position);
+    // A stream without a length ends when its connection does.
+    if (now.duration <= 0) return mFileSize > 0;
+    return position < now.duration - kEndSlack;
+}
+
+android::status_t OpenMedia::causeOfBreak() const {
+    if (sourceFailed()) return ORV_ERROR_IO;
+    return mTrouble.status() != android::NO_ERROR ? mTrouble.status() : ORV_ERROR_CONNECTION_LOST;
+}
+
+bool OpenMedia::sourceFailed() const {
+    const std::shared_ptr<MediaSource> media = source();
+    return media != nullptr && media->readFailed();
+}
+
+// Of media without a length mpv only reports how far they have been read.
+double OpenMedia::durationOf(double byMpv) const {
+    const std::shared_ptr<MediaSource> media = source();
+    const int64_t known = media != nullptr ? media->knownDuration() : 0;
+    const bool isGuess = byMpv <= 0 || mMpv.getInt("file-size").value_or(0) <= 0;
+    return isGuess && known > 0 ? static_cast<double>(known) / 1000 : byMpv;
+}
+
+uint64_t OpenMedia::session() const {
+    return mState.read([](const PlayerState::Values& v) { return v.session; });
+}
+
+// Any thread. A load that was overtaken meanwhile fails nothing.
+void OpenMedia::failIn(uint64_t session, android::status_t status) {
+    const bool news = mState.update(
+        [&](PlayerState::Values& v) { return v.session == session && v.fail(status); });
+    if (!news) return;
+    ALOGE("playback: ended by an error (status %d)", status);
+    mNotifier.post(android::MEDIA_ERROR, android::MEDIA_ERROR_UNKNOWN, status);
+}
+
+std::shared_ptr<MediaSource> OpenMedia::source() const {
+    std::lock_guard<std::mutex> lock(mSourceMutex);
+    return mSource;
+}
+
+}  // namespace orvtarn
