@@ -36,7 +36,7 @@ std::string takeException() {
     auto text = static_cast<jstring>(env->CallObjectMethod(thrown, toString));
     const char* chars = text != nullptr ? env->GetStringUTFChars(text, nullptr) : nullptr;
     env->ExceptionClear();
-    if (chars == nullptr) return "an exception that cannot be told";
+    if (chars == nullptr) return "an exception without a readable text";
     std::string copy(chars);
     env->ReleaseStringUTFChars(text, chars);
     return copy;

@@ -46,7 +46,7 @@ void JavaWorkload::run(jint times) { call(mRun, times); }
 
 void JavaWorkload::rewind() { call(mRewind); }
 
-// Also after a failure, which stays the one that is told.
+// Also after a failure, which stays the one that is reported.
 void JavaWorkload::close() {
     if (mWorkload == nullptr) return;
     javaEnv()->CallVoidMethod(mWorkload, mClose);

@@ -105,11 +105,7 @@ INSTANTIATE_TEST_SUITE_P(Kinds, BrokenFileTest,
                                          BrokenFile{"cut.mp4",
                                                     ORV_ERROR_NOTHING_INSIDE - E_ORV_FORMAT_MP4},
                                          BrokenFile{"subtitles-only.mkv", ORV_ERROR_UNSUPPORTED}),
-                         [](const auto& info) {
-                             std::string name = info.param.name;
-                             for (char& c : name) c = isalnum(c) ? c : '_';
-                             return name;
-                         });
+                         [](const auto& info) { return testName(info.param.name); });
 
 struct HollowFile {
     const char* ending;

@@ -27,6 +27,12 @@ std::unique_ptr<orvtarn::MediaFile> openMedia(const std::string& name) {
     return file;
 }
 
+std::string testName(const std::string& name) {
+    std::string plain = name;
+    for (char& letter : plain) letter = isalnum(letter) ? letter : '_';
+    return plain;
+}
+
 std::vector<uint8_t> bytesOf(const std::string& path) { return outputOf("cat '" + path + "'"); }
 
 std::vector<uint8_t> outputOf(const std::string& command) {

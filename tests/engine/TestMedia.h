@@ -17,6 +17,9 @@ std::string mediaPath(const std::string& name);
 // The same, opened; a failed expectation and null when it cannot be.
 std::unique_ptr<orvtarn::MediaFile> openMedia(const std::string& name);
 
+// A name as the last part of a test's: only letters, digits and underscores.
+std::string testName(const std::string& name);
+
 std::vector<uint8_t> bytesOf(const std::string& path);
 
 // What a shell command writes to its output; a failed expectation when it fails.

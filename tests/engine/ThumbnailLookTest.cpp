@@ -1,6 +1,7 @@
 // SPDX-License-Identifier: Apache-2.0
 #include <gtest/gtest.h>
 
+#include "TestMedia.h"
 #include "ThumbnailPictures.h"
 
 namespace orvtarn {
@@ -59,11 +60,8 @@ TEST_P(ThumbnailLook, IsWhatFfmpegMakesOfTheFrame) {
     }
 }
 
-INSTANTIATE_TEST_SUITE_P(Stored, ThumbnailLook, testing::ValuesIn(kLooks), [](const auto& info) {
-    std::string name = info.param.name;
-    for (char& character : name) character = isalnum(character) ? character : '_';
-    return name;
-});
+INSTANTIATE_TEST_SUITE_P(Stored, ThumbnailLook, testing::ValuesIn(kLooks),
+                         [](const auto& info) { return orvtest::testName(info.param.name); });
 
 // The metadata in the frames say that the content goes up to 4000 cd/m².
 TEST(ThumbnailLook, TakesThePeakOfHdrFromTheMetadata) {

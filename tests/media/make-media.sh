@@ -156,7 +156,7 @@ make_broken_tags_mp4() {
 make_front_jpg() { quiet_ffmpeg -f lavfi -i "testsrc=size=96x64:duration=1:rate=1" -frames:v 1 "$1"; }
 make_back_png() { quiet_ffmpeg -f lavfi -i "color=blue:size=32x32:duration=1:rate=1" -frames:v 1 "$1"; }
 
-# The back of the sleeve comes first, to be told from the front. The arguments:
+# The back of the sleeve comes first, to be distinguished from the front. The arguments:
 # the codec and the file.
 covered() {
     need front.jpg back.png

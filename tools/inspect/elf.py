@@ -95,7 +95,7 @@ class Library:
         return int.from_bytes(self.elf.stream.read(self.word), "little")
 
     def functions_by_address(self):
-        """Address to name; the bit that tells Thumb code is not part of it."""
+        """Address to name; the bit that marks Thumb code is not part of it."""
         return {symbol["st_value"] & ~1: symbol.name
                 for table in (".symtab", ".dynsym") for symbol in self.symbols(table)
                 if symbol["st_info"]["type"] == "STT_FUNC"

@@ -3,7 +3,7 @@
 """engine.py list PRODUCT ENGINE: what the product needs of an engine library.
 engine.py check ENGINE LISTS: which of it ENGINE lacks.
 
-PRODUCT tells what it links to, ENGINE (one that was built from the same
+PRODUCT shows what it links to, ENGINE (one that was built from the same
 headers) the order of the virtual slots. LISTS is the folder of the lists,
 engine.ARCHITECTURE.txt. Ends with 0 when nothing is lacking, 1 when something
 is, 2 when the input is unfit."""

@@ -41,7 +41,7 @@ def objects_by_address(library):
 
 
 def addresses_in(library, code):
-    """Every address that a function's code forms, as far as its text tells."""
+    """Every address that a function's code forms, as far as its text shows."""
     # x86-64: the disassembler works the addresses out.
     for address in re.findall(r"# ([0-9a-f]+) <", code):
         yield int(address, 16)

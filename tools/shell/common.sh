@@ -62,7 +62,7 @@ follow_to() {
     return "$status"
 }
 
-# The percentages that apt-get (its status lines) and ninja ([ 12%]) tell.
+# The percentages that apt-get (its status lines) and ninja ([ 12%]) report.
 show_progress() {
     local line percent
     while IFS= read -r line; do

@@ -70,7 +70,7 @@ install_packages() {
         "Once that is mended, start ./orv again."
 }
 
-# apt-get refuses to go on from there; what dpkg cannot mend, apt-get will tell.
+# apt-get refuses to go on from there; what dpkg cannot mend, apt-get will report.
 finish_interrupted_installation() {
     [ -n "$(find /var/lib/dpkg/updates -name '[0-9]*' -print -quit 2>/dev/null)" ] || return 0
     say "finishing an installation that was interrupted"
@@ -94,7 +94,7 @@ package_lists_are_old() {
     [ -z "$(find /var/lib/apt/lists -maxdepth 1 -name '*_Packages*' -ctime -7 -print -quit 2>/dev/null)" ]
 }
 
-# A source of somebody else's may fail without harm: the installation will tell.
+# A source of somebody else's may fail without harm: the installation will report it.
 update_package_lists() {
     say "reading Debian's package lists"
     apt_get update -o APT::Update::Error-Mode=any || say \

@@ -50,7 +50,7 @@ archive_classes() {
     trap - EXIT
 }
 
-# Java itself cannot tell how wide its terminal is, nor whether it has one.
+# Java itself cannot find out how wide its terminal is, nor whether it has one.
 describe_terminal() {
     [ -t 1 ] || return 0
     local columns

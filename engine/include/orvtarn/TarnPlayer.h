@@ -34,7 +34,7 @@ namespace android {
 // reset; speed, repeated section, subtitle files and look do not.
 //
 // Programs without an event channel follow a player by asking for its position
-// (see getCurrentPosition), which tells every state apart. Events go to the
+// (see getCurrentPosition), which distinguishes all states. Events go to the
 // listener on a thread of the engine's own, on which it may call the player.
 class TarnPlayer : public MediaPlayerBase {
 public:

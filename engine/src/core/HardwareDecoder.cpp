@@ -6,18 +6,18 @@
 namespace orvtarn {
 namespace {
 
-bool hasDevice(const char* pattern) {
+bool isThere(const std::string& pattern) {
     glob_t found;
-    const bool isThere = glob(pattern, GLOB_NOSORT, nullptr, &found) == 0;
+    const bool matches = glob(pattern.c_str(), GLOB_NOSORT, nullptr, &found) == 0;
     globfree(&found);
-    return isThere;
+    return matches;
 }
 
 }  // namespace
 
-const char* hardwareDecoder() {
-    if (hasDevice("/dev/nvidiactl")) return "nvdec-copy";
-    return hasDevice("/dev/dri/renderD*") ? "vaapi-copy" : "no";
+const char* hardwareDecoder(const std::string& devices) {
+    if (isThere(devices + "/nvidiactl")) return "nvdec-copy";
+    return isThere(devices + "/dri/renderD*") ? "vaapi-copy" : "no";
 }
 
 }  // namespace orvtarn

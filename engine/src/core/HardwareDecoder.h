@@ -1,13 +1,14 @@
 // SPDX-License-Identifier: Apache-2.0
 #pragma once
 
+#include <string>
+
 namespace orvtarn {
 
 // The hardware decoder that mpv shall try, as its option "hwdec" has it: one that
-// copies its pictures back, so that they can be drawn by software, and that this
-// machine has the device of. A search for others would complain on machines
-// without them. "no" where there is none; mpv decodes by software where the
-// decoder cannot do the media.
-const char* hardwareDecoder();
+// copies its pictures back, so that they can be drawn by software, and whose device
+// is in that folder. mpv's own search would complain on machines without one. "no"
+// where there is none; mpv decodes in software what the decoder cannot do.
+const char* hardwareDecoder(const std::string& devices = "/dev");
 
 }  // namespace orvtarn

@@ -7,7 +7,7 @@
 
 namespace orvtarn {
 
-// Tells the listener of events, in order, on a thread of its own, so that a
+// Delivers events to the listener, in order, on a thread of its own, so that a
 // listener may call the player and may take its time.
 class Notifier {
 public:
@@ -18,10 +18,10 @@ public:
 
     // Any thread; never blocks.
     void post(int msg, int ext1 = 0, int ext2 = 0);
-    // Forgets what was not told yet. Waits for a delivery under way, unless it
+    // Drops what was not delivered yet. Waits for a delivery under way, unless it
     // is called from that delivery.
     void stop();
-    // Whether this is the thread that tells the listener.
+    // Whether this is the thread that calls the listener.
     bool isDelivering() const;
 
 private:

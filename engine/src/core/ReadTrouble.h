@@ -10,7 +10,7 @@
 namespace orvtarn {
 
 // What mpv and FFmpeg log about reading the media's bytes. To mpv, media that
-// broke off look like media that ended; only the log tells them apart. The
+// broke off look like media that ended; only the log distinguishes them. The
 // texts are fixed in both, in no user's language. One thread uses it.
 class ReadTrouble {
 public:

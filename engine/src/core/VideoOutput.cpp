@@ -237,7 +237,7 @@ android::status_t VideoOutput::drawInto(
     return failed(android::UNKNOWN_ERROR, "VideoOutput", mpv_error_string(error));
 }
 
-// Tells mpv that the frame is done with, without drawing it.
+// Reports to mpv that the frame is done with, without drawing it.
 void VideoOutput::skip() {
     int yes = 1;
     mpv_render_param parameters[] = {

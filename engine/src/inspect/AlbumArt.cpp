@@ -20,27 +20,28 @@ bool isFrontCover(const AVStream& stream) {
     return strcmp(tagOf(stream.metadata, "comment"), "Cover (front)") == 0;
 }
 
-const AVPacket* coverOf(const AVFormatContext& media) {
-    const AVPacket* cover = nullptr;
+}  // namespace
+
+AVStream* coverOf(const MediaFile& file) {
+    const AVFormatContext& media = *file.context();
+    AVStream* cover = nullptr;
     for (unsigned i = 0; i < media.nb_streams; i++) {
-        const AVStream& stream = *media.streams[i];
-        if (stream.attached_pic.size <= 0) continue;
-        if (isFrontCover(stream)) return &stream.attached_pic;
-        if (cover == nullptr) cover = &stream.attached_pic;
+        AVStream* stream = media.streams[i];
+        if (stream->attached_pic.size <= 0) continue;
+        if (isFrontCover(*stream)) return stream;
+        if (cover == nullptr) cover = stream;
     }
     return cover;
 }
 
-}  // namespace
-
 MediaAlbumArt* extractAlbumArt(const MediaFile& file) {
-    const AVPacket* cover = coverOf(*file.context());
+    const AVStream* cover = coverOf(file);
     if (cover == nullptr) return nullptr;
-    const size_t size = static_cast<size_t>(cover->size);
+    const size_t size = static_cast<size_t>(cover->attached_pic.size);
     void* block = malloc(sizeof(MediaAlbumArt) + size);
     if (block == nullptr) return nullptr;
     MediaAlbumArt* art = new (block) MediaAlbumArt{static_cast<uint32_t>(size)};
-    memcpy(art->data(), cover->data, size);
+    memcpy(art->data(), cover->attached_pic.data, size);
     return art;
 }
 

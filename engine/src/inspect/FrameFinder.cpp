@@ -5,6 +5,8 @@
 
 #include <algorithm>
 
+#include "inspect/AlbumArt.h"
+
 extern "C" {
 #include <libavcodec/avcodec.h>
 #include <libavformat/avformat.h>
@@ -64,8 +66,10 @@ bool FrameFinder::chooseStream(int streamIndex) {
     const int best = av_find_best_stream(media, AVMEDIA_TYPE_VIDEO, streamIndex, -1, nullptr, 0);
     if (best < 0) return false;
     mStream = media->streams[best];
-    if (streamIndex < 0 && isEmbeddedPicture(*mStream) && firstVideo(*media) != nullptr) {
-        mStream = firstVideo(*media);
+    if (streamIndex < 0 && isEmbeddedPicture(*mStream)) {
+        AVStream* cover = coverOf(mFile);
+        AVStream* video = firstVideo(*media);
+        if (video != nullptr || cover != nullptr) mStream = video != nullptr ? video : cover;
     }
     for (unsigned i = 0; i < media->nb_streams; i++) {
         media->streams[i]->discard =

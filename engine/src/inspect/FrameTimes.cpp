@@ -47,15 +47,20 @@ private:
     }
 
     // Keeps the times of packets from here on, until those of so many frames after
-    // the time are known. Frames are not stored in the order of their times.
+    // the time are known. Frames are not stored in the order of their times. False
+    // when one has no time, as in program streams: it would not be counted.
     bool read(int64_t timeUs, int amount) {
         mTimes.clear();
         AVPacket* packet = av_packet_alloc();
         if (packet == nullptr) return false;
         int after = 0;
         bool goesOn = true;
-        while (goesOn && !mFile.isInterrupted() && av_read_frame(mFile.context(), packet) >= 0) {
-            if (packet->stream_index == mStream.index && packet->pts != AV_NOPTS_VALUE) {
+        bool areTimed = true;
+        while (goesOn && areTimed && !mFile.isInterrupted() &&
+               av_read_frame(mFile.context(), packet) >= 0) {
+            const bool isPicture = packet->stream_index == mStream.index;
+            areTimed = !isPicture || packet->pts != AV_NOPTS_VALUE;
+            if (isPicture && areTimed) {
                 const int64_t us = mTime.of(packet->pts);
                 const bool isNew = mTimes.insert(us).second;
                 after += isNew && us > timeUs + kRoundingUs;
@@ -64,7 +69,7 @@ private:
             av_packet_unref(packet);
         }
         av_packet_free(&packet);
-        return true;
+        return areTimed;
     }
 
     // Whether no packet to come is shown before the frame that is wanted.

@@ -14,7 +14,7 @@ struct FrameAt {
 
 // The frame that many frames after the one of a time, or before it for a negative
 // number, of the video stream with that index or of the best one for -1. Counts
-// packets, and decodes nothing. Nothing where packets have no times.
+// packets, and decodes nothing. Nothing where one of them has no time.
 std::optional<FrameAt> frameFrom(MediaFile& file, int streamIndex, double seconds, int amount);
 
 }  // namespace orvtarn

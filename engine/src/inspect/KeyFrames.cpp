@@ -2,6 +2,7 @@
 #include "inspect/KeyFrames.h"
 
 #include <algorithm>
+#include <utility>
 
 extern "C" {
 #include <libavcodec/avcodec.h>
@@ -24,6 +25,7 @@ public:
     // Of packets from one time to another; both from the media's start.
     std::optional<int64_t> lastKeyFrame(int64_t fromUs, int64_t toUs) {
         std::optional<int64_t> last;
+        mUntimed = false;
         if (!mTime.seek(fromUs)) return last;
         AVPacket* packet = av_packet_alloc();
         bool goesOn = packet != nullptr;
@@ -36,20 +38,32 @@ public:
     }
 
 private:
-    // Program streams do not give each frame a time: it is shown soon after it
-    // is decoded, then. False once there can be no more.
-    bool look(const AVPacket& packet, int64_t toUs, std::optional<int64_t>& last) const {
-        const int64_t shown = packet.pts == AV_NOPTS_VALUE ? packet.dts : packet.pts;
+    // False once there can be no more.
+    bool look(const AVPacket& packet, int64_t toUs, std::optional<int64_t>& last) {
+        const std::optional<int64_t> shown = timeOfKeyFrame(packet);
+        if (shown && *shown <= toUs) last = shown;
         const int64_t decoded = packet.dts == AV_NOPTS_VALUE ? packet.pts : packet.dts;
-        if (shown == AV_NOPTS_VALUE) return true;
+        return decoded == AV_NOPTS_VALUE || mTime.of(decoded) <= toUs;
+    }
+
+    // When this packet's key frame, or one before it, is shown. Program streams do
+    // not give each frame a time: a frame that others refer to is shown when the next
+    // of its kind is decoded.
+    std::optional<int64_t> timeOfKeyFrame(const AVPacket& packet) {
         const bool isKey = (packet.flags & AV_PKT_FLAG_KEY) != 0;
-        if (isKey && mTime.of(shown) <= toUs) last = mTime.of(shown);
-        return mTime.of(decoded) <= toUs;
+        if (isKey && packet.pts != AV_NOPTS_VALUE) return mTime.of(packet.pts);
+        if (packet.dts == AV_NOPTS_VALUE) return {};
+        if (isKey && mStream.codecpar->video_delay == 0) return mTime.of(packet.dts);
+        if (isKey) mUntimed = true;
+        const bool isReferredTo = packet.pts != AV_NOPTS_VALUE && packet.pts > packet.dts;
+        if (!isReferredTo || !std::exchange(mUntimed, false)) return {};
+        return mTime.of(packet.dts);
     }
 
     MediaFile& mFile;
     const AVStream& mStream;
     StreamTime mTime;
+    bool mUntimed = false;  // the newest key frame has no time yet
 };
 
 }  // namespace

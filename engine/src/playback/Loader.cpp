@@ -27,7 +27,7 @@ using std::chrono::seconds;
 
 constexpr seconds kPrepareLimit{30};
 constexpr seconds kUnloadLimit{10};
-// How often a read that blocks is told again to end.
+// How often a read that blocks is asked again to end.
 constexpr milliseconds kCancelInterval{20};
 
 // What raw samples are when nobody says.

@@ -11,8 +11,8 @@
 #include <optional>
 #include <string>
 
-#include "core/OpenMedia.h"
 #include "core/MpvHandle.h"
+#include "core/OpenMedia.h"
 #include "core/PlayerState.h"
 #include "core/VideoOutput.h"
 #include "inspect/SecondReading.h"

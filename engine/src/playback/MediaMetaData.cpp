@@ -88,9 +88,9 @@ private:
 
 bool MediaMetaData::get(MetaDataInfo& info) {
     if (mState.requireOpen("getMetaDataInfo") != android::NO_ERROR) return false;
-    const bool told =
+    const bool described =
         mLoader.secondReading()->withFile([&](MediaFile& file) { info = metaDataInfo(file); });
-    if (!told) info = fromMpv();
+    if (!described) info = fromMpv();
     return true;
 }
 

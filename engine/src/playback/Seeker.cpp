@@ -41,12 +41,12 @@ status_t Seeker::seekTo(int msec, int mode) {
     const double duration = mState.read([](const PlayerState::Values& v) { return v.duration; });
     double target = std::max(msec, 0) / 1000.0;
     if (duration > 0) target = std::min(target, duration);
-    return told(
+    return announced(
         inTurn("seekTo", Kind::Seek, [&](const Turn& turn) { return seekAs(mode, target, turn); }));
 }
 
 status_t Seeker::seekToTime(const char* operation, double target) {
-    return told(showFrame(operation, target));
+    return announced(showFrame(operation, target));
 }
 
 status_t Seeker::showFrame(const char* operation, double target) {
@@ -79,7 +79,7 @@ status_t Seeker::runAlone(const char* operation, const std::function<bool()>& mo
     });
 }
 
-status_t Seeker::told(status_t status) {
+status_t Seeker::announced(status_t status) {
     if (status == android::NO_ERROR) mNotifier.post(android::MEDIA_SEEK_COMPLETE);
     return status;
 }

@@ -62,7 +62,7 @@ private:
     // Runs a task as the only one that seeks.
     android::status_t inTurn(const char* operation, Kind kind, const Task& task);
     android::status_t begin(const char* operation, Kind kind, const Turn& turn);
-    android::status_t told(android::status_t status);
+    android::status_t announced(android::status_t status);
     void leaveEnd();
     android::status_t seekAs(int mode, double seconds, const Turn& turn);
     android::status_t seekToNextSync(double seconds, const Turn& turn);

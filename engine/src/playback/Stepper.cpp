@@ -14,7 +14,7 @@ namespace {
 
 using android::status_t;
 
-// mpv has no word for a step's end: it is asked.
+// mpv does not report a step's end: it is asked.
 constexpr std::chrono::milliseconds kPollInterval{2};
 constexpr std::chrono::seconds kStepLimit{5};
 // A seek takes about as long as this many steps.

@@ -19,7 +19,7 @@ constexpr uint64_t kCommand = 1;
 
 bool isLocal(const SubtitleFile& file) { return schemeOf(file.name).empty(); }
 
-// The demuxer for VobSub finds the pictures beside the index, unless told. A
+// The demuxer for VobSub finds the pictures beside the index, unless it gets them. A
 // quoted value: the length in bytes, then the text as it is.
 std::string demuxerOptions(const SubtitleFile& file) {
     std::string options =

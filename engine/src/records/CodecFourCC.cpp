@@ -56,7 +56,7 @@ const Code kCodes[] = {
     {"wmv3", "WMV3"},
 };
 
-// "pcm_s16le" is told from others by what follows the prefix.
+// "pcm_s16le" differs from others in what follows the prefix.
 std::string_view withoutPcm(std::string_view name) {
     const std::string_view prefix = "pcm_";
     return name.substr(0, prefix.size()) == prefix ? name.substr(prefix.size()) : name;

@@ -10,11 +10,11 @@
 
 namespace orvtarn {
 
-// How mpv is told to read a stream of raw samples.
+// How mpv is to read a stream of raw samples.
 struct PcmFormat {
     MpvOptions options;
     int bytesPerSecond = 0;
-    int64_t durationMs = 0;  // 0 when the description does not tell
+    int64_t durationMs = 0;  // 0 when the description does not say
 };
 
 // Checks the whole description against orvtarn/PcmRecords.h. True with the

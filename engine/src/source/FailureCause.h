@@ -13,7 +13,7 @@
 
 namespace orvtarn {
 
-// Finds out why media did not open, beyond what mpv tells: asks their server,
+// Finds out why media did not open, beyond what mpv reports: asks their server,
 // or looks at their first bytes. Works on a thread of its own, for some seconds
 // at most. One thread uses it.
 class FailureCause {

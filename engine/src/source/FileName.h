@@ -5,7 +5,7 @@
 
 namespace orvtarn {
 
-// Tells files from other media. True with the path for a path, which is taken
+// Distinguishes files from other media. True with the path for a path, which is taken
 // as it is, and for a "file:" URL, whose percent codes are decoded; false for
 // URLs of other kinds.
 bool filePath(const std::string& name, std::string& path);

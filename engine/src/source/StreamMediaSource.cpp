@@ -14,7 +14,7 @@ namespace {
 
 constexpr uint32_t kUnknownLength = 0xFFFFFFFF;
 // How often a source that has nothing now is asked again, and a blocked read
-// is told again to end: a word that comes just before the read blocks is lost.
+// is asked again to end: a request that comes just before the read blocks is lost.
 constexpr std::chrono::milliseconds kPollInterval{10};
 
 // The lock that the source keeps for the engine.
@@ -126,7 +126,7 @@ int StreamMediaSource::readOnce(uint8_t* buffer, int length) {
     if (status != ORV_STREAM_ERROR_CODE_OK) return -1;
     const int count = std::clamp(reported, 0, length);
     // Where a source that gave more than it could write stands now, only a
-    // seek can tell.
+    // seek can find out.
     mPosition = reported > length && mSeekable ? -1 : mPosition.load() + count;
     return count;
 }

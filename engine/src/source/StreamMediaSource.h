@@ -43,7 +43,7 @@ private:
     const bool mSeekable;
     const bool mStalling;
     ReaderCount mReaders;
-    // The source's; -1 when only a seek can tell.
+    // The source's; -1 when only a seek can find out.
     std::atomic<int64_t> mPosition{0};
     const int64_t mSize;  // -1 when unknown
 

@@ -19,7 +19,7 @@ public class ImageReader implements AutoCloseable {
         System.loadLibrary("orv_platform");
     }
 
-    /** Told when a new frame can be taken. */
+    /** Called when a new frame can be taken. */
     public interface OnImageAvailableListener {
         /**
          * Called once for one or several new frames; take the newest with
@@ -148,7 +148,7 @@ public class ImageReader implements AutoCloseable {
     }
 
     /**
-     * Sets who is told about new frames; at most one listener at a time.
+     * Sets who is notified of new frames; at most one listener at a time.
      *
      * @param listener null for none
      * @param executor runs the listener, such as {@code SwingUtilities::invokeLater}; null for the
@@ -204,7 +204,7 @@ public class ImageReader implements AutoCloseable {
                 (int) fields[STRIDE], fields[TIMESTAMP_US], pixels);
     }
 
-    /** Waits for frames and tells the listener. */
+    /** Waits for frames and notifies the listener. */
     private final class FrameNotifier extends Thread {
         private final OnImageAvailableListener mListener;
         private final Executor mExecutor;
@@ -224,12 +224,12 @@ public class ImageReader implements AutoCloseable {
                 long queued = nativeAwaitFrame(mQueue, mSeen, WAIT_SLICE_MS);
                 if (queued > mSeen) {
                     mSeen = queued;
-                    mExecutor.execute(this::tell);
+                    mExecutor.execute(this::notifyListener);
                 }
             }
         }
 
-        private void tell() {
+        private void notifyListener() {
             if (!mStopped) {
                 mListener.onImageAvailable(ImageReader.this);
             }

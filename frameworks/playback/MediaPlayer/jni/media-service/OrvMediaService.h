@@ -80,7 +80,7 @@ public:
     bool isLooping();
     status_t setVolume(float left, float right);
 
-    // Kept here; the engine is not told.
+    // Kept here; the engine does not get it.
     status_t setAudioStreamType(int type);
     status_t setAudioSessionId(int id);  // BAD_VALUE for a negative id
     int getAudioSessionId();

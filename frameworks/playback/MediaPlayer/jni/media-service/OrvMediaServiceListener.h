@@ -9,7 +9,7 @@ namespace android {
 
 class Parcel;
 
-// Where a service sends its events. Called on the thread that told the
+// Where a service sends its events. Called on the thread that notified the
 // service; obj may be null and is not owned.
 class ORV_EXPORT OrvMediaServiceListener : public virtual RefBase {
 public:

@@ -7,7 +7,7 @@ import java.nio.file.FileSystemException;
 import java.nio.file.NoSuchFileException;
 import java.nio.file.Path;
 
-/** Something the user can be told in one sentence; the message is that sentence. */
+/** A failure that one sentence explains to the user; the message is that sentence. */
 public final class Failure extends Exception {
     public Failure(String message) {
         super(message);

@@ -13,7 +13,7 @@ final class FramePump implements AutoCloseable {
     private final Thread thread = new Thread(this::run, "frames");
     private final Consumer<Image> screen;
 
-    // What the pump's thread is told, and what it tells.
+    // What the pump's thread is asked to do, and what it reports.
     private volatile double framesPerSecond;
     private volatile boolean jumped;
     private boolean hidden; // Under the lock of this object.

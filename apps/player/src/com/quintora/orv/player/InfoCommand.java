@@ -12,10 +12,10 @@ import picocli.CommandLine.Option;
 import picocli.CommandLine.Parameters;
 import picocli.CommandLine.Spec;
 
-/** Tells what media hold. */
+/** Prints what media hold. */
 @Command(
         name = "info",
-        description = "Tells the container, duration, tracks, chapters and metadata of media.")
+        description = "Prints the container, duration, tracks, chapters and metadata of media.")
 final class InfoCommand implements Callable<Integer> {
     @Parameters(paramLabel = "FILE|URL", description = "A media file or URL; - for standard input.")
     private String source;

@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: Apache-2.0
 package com.quintora.orv.player;
 
-/** Ends a playback cleanly when the program is told to stop, by Ctrl-C or otherwise. */
+/** Ends a playback cleanly when the program is asked to stop, by Ctrl-C or otherwise. */
 public final class Interruption implements AutoCloseable {
     /** What a shell says of a program that Ctrl-C ended. */
     public static final int EXIT_STATUS = 130;

@@ -9,7 +9,7 @@ import picocli.CommandLine.TypeConversionException;
 import picocli.CommandLine.UnmatchedArgumentException;
 
 /**
- * The desktop player's commands. Exit status: 0 for success, 1 for a failure told in one
+ * The desktop player's commands. Exit status: 0 for success, 1 for a failure explained in one
  * sentence, 2 for wrong arguments, 130 after Ctrl-C.
  */
 @Command(

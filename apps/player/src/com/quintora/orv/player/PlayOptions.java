@@ -86,7 +86,7 @@ public final class PlayOptions {
 
     @Option(
             names = "--stats",
-            description = "Tell afterwards how quickly and how smoothly it went.")
+            description = "Print afterwards how quickly and how smoothly it played.")
     boolean stats;
 
     /** What stands in a window's title bar: the file's name, or the whole URL. */

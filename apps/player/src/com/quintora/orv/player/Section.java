@@ -9,7 +9,7 @@ record Section(int from, int to) {
     static Section parse(String text) {
         int cut = text.indexOf('-') > 0 ? text.indexOf('-') : text.indexOf(':');
         boolean isOfSeconds = text.indexOf('-') < 0;
-        // Which of several colons parts the times, nobody can tell.
+        // Which of several colons separates the times is not known.
         if (cut <= 0 || isOfSeconds && cut != text.lastIndexOf(':')) {
             throw new TypeConversionException(
                     "'" + text + "' is not a section; write 10:20 for seconds, or 0:10-0:20");

@@ -24,7 +24,7 @@ public final class Times {
                 : String.format("%d:%02d", seconds / 60, seconds % 60);
     }
 
-    /** How long media are, as clock tells it, or dashes for 0, which means that nobody knows. */
+    /** How long media are, as a clock shows it, or dashes for 0, which means that nobody knows. */
     public static String length(long millis) {
         return millis > 0 ? clock(millis) : UNKNOWN;
     }

@@ -50,7 +50,8 @@ class PictureCommandsTest {
     @ParameterizedTest
     @CsvSource({
         "stream.ts, 7.311, 7.3", "stream.ts, 8.611, 8.6", "distant.ts, 13.311, 13.3",
-        "stream.mpg, 7.331, 7.32", "stream.vob, 7.331, 7.32"
+        "stream.mpg, 7.331, 7.32", "stream.vob, 7.331, 7.32",
+        "distant.mpg, 12.431, 12.4", "distant.mpg, 19.931, 19.92"
     })
     void aMomentOfABroadcastIsMet(String media, String at, String frame) throws Exception {
         Path out = folder.resolve("out.png");

@@ -55,6 +55,17 @@ class SessionSeekTest {
         }
     }
 
+    /** The sound begins 11 ms before the picture. */
+    @ParameterizedTest
+    @CsvSource({"stream.ts, 7.33, 7311", "distant.ts, 13.35, 13311", "distant.mpg, 19.935, 19931",
+        "stream.vob, 7.335, 7331"})
+    void aStartInABroadcastIsExact(String media, String start, int frame) throws Exception {
+        try (Session session = open(media, "--start", start)) {
+            assertEquals(frame, session.player().getCurrentPosition(), 1);
+            awaitShown(frame);
+        }
+    }
+
     @Test
     void aSeekInSoundAloneIsOne() throws Exception {
         try (Session session = open("tone.flac")) {

@@ -5,7 +5,7 @@ import com.quintora.orv.player.Snapshot;
 import com.quintora.orv.player.Times;
 import java.util.Locale;
 
-/** The words and the bar that tell how far a playback is. */
+/** The words and the bar that show how far a playback is. */
 final class ProgressLine {
     private static final int MIN_BAR = 10;
     private static final int MAX_BAR = 60;

@@ -6,7 +6,7 @@ import java.util.concurrent.CountDownLatch;
 import java.util.concurrent.TimeUnit;
 import java.util.function.Supplier;
 
-/** Tells how a playback goes, as a bar on a terminal and as a line now and then elsewhere. */
+/** Shows how a playback goes, as a bar on a terminal and as a line now and then elsewhere. */
 public final class TerminalScreen {
     private static final int DRAW_MS = 100;
     private static final int LOG_MS = 5_000;

@@ -18,7 +18,7 @@ import java.util.concurrent.atomic.AtomicInteger;
 
 /**
  * Carries out what the window's controls ask, on threads of its own, because the player's calls may
- * take their time; and tells the window how things stand. Pausing and the volume wait for nothing
+ * take their time; and shows in the window how things stand. Pausing and the volume wait for nothing
  * that takes long, such as a seek.
  */
 final class Conductor implements Controls {
@@ -51,7 +51,7 @@ final class Conductor implements Controls {
         player.addListener(new Events());
     }
 
-    /** Opens the media and plays it; the window tells what becomes of it. */
+    /** Opens the media and plays it; the window shows what becomes of it. */
     void begin() {
         workers.later(() -> failOn(this::openAndPlay));
     }
