@@ -6,7 +6,7 @@ import com.quintora.mmp.MediaStreamSource;
 import java.io.FileDescriptor;
 import java.io.FileInputStream;
 import java.io.IOException;
-import java.nio.channels.Channels;
+import java.nio.ByteBuffer;
 import java.nio.channels.FileChannel;
 import java.nio.file.Files;
 import java.nio.file.InvalidPathException;
@@ -23,6 +23,8 @@ final class StandardInput {
     private static final int PIPE = 0010000;
     private static final int SOCKET = 0140000;
     private static final int CHARACTER_DEVICE = 0020000;
+
+    private static final int COPY_BYTES = 64 * 1024;
 
     private StandardInput() {}
 
@@ -67,11 +69,23 @@ final class StandardInput {
                         StandardOpenOption.WRITE,
                         StandardOpenOption.DELETE_ON_CLOSE);
         try (FileChannel pipe = open(source)) {
-            Channels.newInputStream(pipe).transferTo(Channels.newOutputStream(kept));
+            copy(pipe, kept);
             return new ChannelStreamSource(kept.position(0));
         } catch (IOException e) {
             kept.close();
             throw e;
+        }
+    }
+
+    // The streams of Java 21 ask a pipe for its position when they copy, and fail.
+    private static void copy(FileChannel from, FileChannel to) throws IOException {
+        ByteBuffer buffer = ByteBuffer.allocateDirect(COPY_BYTES);
+        while (from.read(buffer) >= 0) {
+            buffer.flip();
+            while (buffer.hasRemaining()) {
+                to.write(buffer);
+            }
+            buffer.clear();
         }
     }
 
