@@ -18,7 +18,9 @@ target_compile_options(orv_warnings INTERFACE -Wall -Wextra)
 
 # Warnings end the build of those who change the project, by
 # CMAKE_COMPILE_WARNING_AS_ERROR; others may have a compiler that finds more.
-set(ORV_JAVA_FLAGS --release 17 -encoding UTF-8 -Xlint:all)
+# Texts are put together by plain code: what javac does otherwise is linked at each
+# start anew.
+set(ORV_JAVA_FLAGS --release 17 -encoding UTF-8 -Xlint:all -XDstringConcat=inline)
 if(CMAKE_COMPILE_WARNING_AS_ERROR)
   list(APPEND ORV_JAVA_FLAGS -Werror)
 endif()

@@ -11,11 +11,16 @@ run_player() {
     exec "${JAVA_COMMAND[@]}" "$@"
 }
 
-# Sets JAVA_COMMAND to what starts the player that is built.
+# Sets JAVA_COMMAND to what starts the player, which is built if need be.
 prepare_player() {
-    use packages build
-    need_packages "build and play" play
-    build_targets off mediaplayer_orv orv_player
+    use current
+    if ! player_is_current; then
+        use packages build
+        need_packages "build and play" play
+        begin_current
+        build_targets off mediaplayer_orv orv_player
+        end_current
+    fi
     set_java_command
     archive_classes
     use_utf8
@@ -24,30 +29,41 @@ prepare_player() {
 # A short life needs a quick start: one compiler tier, the simplest collector,
 # and the program's classes from an archive.
 set_java_command() {
-    local jars=$ORV_BUILD/java
-    # An archive is one Java's; after an update of Java another is made.
-    CLASS_ARCHIVE=$jars/player-$(stat -Lc '%Z-%s' -- "$JAVA_HOME/bin/java").jsa
-    JAVA_COMMAND=("$JAVA_HOME/bin/java" -XX:TieredStopAtLevel=1 -XX:+UseSerialGC
+    local jars=$ORV_BUILD/java kind=${DISPLAY:+window}
+    # An archive is one Java's; after an update of Java another is made. That of a
+    # machine with a display has the classes of the window, too.
+    CLASS_ARCHIVE=$jars/player-${kind:-plain}-$(stat -Lc '%Z-%s' -- "$JAVA_HOME/bin/java").jsa
+    JAVA_COMMAND=("$JAVA_HOME/bin/java" -XX:TieredStopAtLevel=1 -XX:+UseSerialGC -XX:-UsePerfData
         -Xshare:auto "-XX:SharedArchiveFile=$CLASS_ARCHIVE" -Xlog:disable -Xlog:all=error:stderr
         "-Djava.library.path=$ORV_BUILD/lib"
         "-Dorv.sample=$ORV_BUILD/media/sample.mkv" "-Dorv.make-sample=$ORV_ROOT/tools/make-sample"
         -jar "$jars/orv_player.jar")
 }
 
-# Made by a run that loads the classes; without an archive the player starts too.
+# Made by a run of all commands that shows nothing; without an archive the player
+# starts, too.
 archive_classes() {
-    [ -n "$(find "$ORV_BUILD/java" -name '*.jar' -newer "$CLASS_ARCHIVE" -print -quit 2>&1)" ] ||
-        return 0
-    rm -f -- "$ORV_BUILD"/java/player-*.jsa
-    local draft=$CLASS_ARCHIVE.$$
+    archive_is_current && return
+    rm -f -- "${CLASS_ARCHIVE%-*-*}"-*.jsa
+    local draft=$CLASS_ARCHIVE.$$ folder
+    folder=$(mktemp -d)
     # shellcheck disable=SC2064
-    trap "rm -f -- ${draft@Q}" EXIT
-    if "${JAVA_COMMAND[@]/#-XX:SharedArchiveFile=*/-XX:ArchiveClassesAtExit=$draft}" play --help \
-        >/dev/null 2>&1; then
+    trap "rm -rf -- ${draft@Q} ${folder@Q}" EXIT
+    local command=("${JAVA_COMMAND[@]/#-XX:SharedArchiveFile=*/-XX:ArchiveClassesAtExit=$draft}")
+    command[-2]=-cp
+    if ORV_LOG=silent timeout 60 "${command[@]}" com.quintora.orv.player.Rehearsal "$folder" \
+        >/dev/null 2>&1 </dev/null; then
         mv -f -- "$draft" "$CLASS_ARCHIVE"
     fi
-    rm -f -- "$draft"
+    rm -rf -- "$draft" "$folder"
     trap - EXIT
+}
+
+archive_is_current() {
+    local jar
+    for jar in "$ORV_BUILD"/java/{orv_player,mediaplayer_orv_java,orv_platform_java}.jar; do
+        [ "$CLASS_ARCHIVE" -nt "$jar" ] || return
+    done
 }
 
 # Java itself cannot find out how wide its terminal is, nor whether it has one.

@@ -2,6 +2,7 @@
 package com.quintora.orv.player;
 
 import java.io.PrintWriter;
+import java.util.List;
 import picocli.CommandLine;
 import picocli.CommandLine.Command;
 import picocli.CommandLine.ParameterException;
@@ -12,19 +13,14 @@ import picocli.CommandLine.UnmatchedArgumentException;
  * The desktop player's commands. Exit status: 0 for success, 1 for a failure explained in one
  * sentence, 2 for wrong arguments, 130 after Ctrl-C.
  */
-@Command(
-        name = "orv",
-        subcommands = {
-            PlayCommand.class,
-            InfoCommand.class,
-            ThumbnailCommand.class,
-            CoverCommand.class
-        })
+@Command(name = "orv")
 public final class Main {
+    private static final List<String> COMMANDS = List.of("play", "info", "thumbnail", "cover");
+
     private Main() {}
 
     public static void main(String[] arguments) {
-        CommandLine commands = commandLine();
+        CommandLine commands = commandLine(arguments);
         int status = commands.execute(arguments);
         commands.getOut().flush();
         System.exit(status == 0 && outputIsLost() ? CommandLine.ExitCode.SOFTWARE : status);
@@ -39,8 +35,14 @@ public final class Main {
         return true;
     }
 
-    static CommandLine commandLine() {
-        return new CommandLine(new Main())
+    /** What runs these arguments. Only their own command is read: all four take their time. */
+    static CommandLine commandLine(String... arguments) {
+        CommandLine line = new CommandLine(new Main());
+        boolean isNamed = arguments.length > 0 && COMMANDS.contains(arguments[0]);
+        for (String name : isNamed ? List.of(arguments[0]) : COMMANDS) {
+            line.addSubcommand(name, command(name));
+        }
+        return line
                 // In one piece, for readers that close a pipe after the first lines.
                 .setOut(new PrintWriter(System.out))
                 .setUsageHelpWidth(100)
@@ -49,6 +51,16 @@ public final class Main {
                 .registerConverter(double.class, Main::number)
                 .setParameterExceptionHandler(Main::tellUsage)
                 .setExecutionExceptionHandler(Main::tellFailure);
+    }
+
+    private static Object command(String name) {
+        return switch (name) {
+            case "play" -> new PlayCommand();
+            case "info" -> new InfoCommand();
+            case "thumbnail" -> new ThumbnailCommand();
+            case "cover" -> new CoverCommand();
+            default -> throw new IllegalArgumentException(name);
+        };
     }
 
     private static int wholeNumber(String text) {

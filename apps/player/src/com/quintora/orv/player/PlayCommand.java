@@ -93,7 +93,7 @@ final class PlayCommand implements Callable<Integer> {
 
     // Without asking AWT, which takes longer to load than the rest of the program. It draws on
     // X displays alone: Wayland's desktops offer one as well, and name it in DISPLAY.
-    private static boolean hasDisplay() {
+    static boolean hasDisplay() {
         String display = System.getenv("DISPLAY");
         return !Boolean.getBoolean("java.awt.headless") && display != null && !display.isEmpty();
     }

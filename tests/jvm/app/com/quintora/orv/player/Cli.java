@@ -16,7 +16,7 @@ record Cli(int status, String out, String err) {
         System.setOut(new PrintStream(outBytes, true, StandardCharsets.UTF_8));
         System.setErr(new PrintStream(errBytes, true, StandardCharsets.UTF_8));
         try {
-            int status = Main.commandLine().execute(arguments);
+            int status = Main.commandLine(arguments).execute(arguments);
             return new Cli(
                     status,
                     outBytes.toString(StandardCharsets.UTF_8),

@@ -9,6 +9,7 @@ import java.awt.AWTError;
 import java.awt.EventQueue;
 import java.awt.HeadlessException;
 import java.awt.Toolkit;
+import java.lang.reflect.InvocationTargetException;
 import java.util.concurrent.CompletableFuture;
 import java.util.concurrent.ExecutionException;
 
@@ -36,6 +37,22 @@ public final class PlayerWindow {
             }
             Failure failure = conductor.failure();
             return failure == null || interruption.happened() ? 0 : 1;
+        }
+    }
+
+    /** Plays to the end in a window that is never shown, and draws it where nobody looks. */
+    public static void rehearse(PlayOptions options) throws Failure, InterruptedException {
+        Stage stage = makeStage(options.title());
+        try (Session session = new Session(options, stage::draw)) {
+            Conductor conductor = new Conductor(session, stage, options);
+            EventQueue.invokeLater(() -> stage.build(conductor, () -> {}));
+            conductor.begin();
+            session.ended().await();
+            EventQueue.invokeAndWait(stage::drawUnseen);
+            conductor.end();
+            EventQueue.invokeAndWait(stage::close);
+        } catch (InvocationTargetException e) {
+            throw noWindow("(" + e.getCause() + ")", e.getCause());
         }
     }
 

@@ -6,12 +6,14 @@ import com.quintora.orv.player.Snapshot;
 import java.awt.Color;
 import java.awt.Component;
 import java.awt.Dimension;
+import java.awt.Graphics;
 import java.awt.GraphicsEnvironment;
 import java.awt.Rectangle;
 import java.awt.event.MouseAdapter;
 import java.awt.event.MouseEvent;
 import java.awt.event.WindowAdapter;
 import java.awt.event.WindowEvent;
+import java.awt.image.VolatileImage;
 import java.util.List;
 import java.util.Locale;
 import javax.swing.JFrame;
@@ -50,6 +52,14 @@ final class Stage {
     }
 
     void open(Conductor conductor, Runnable onClosed) {
+        build(conductor, onClosed);
+        frame.setVisible(true);
+        opening.setRepeats(false);
+        opening.start();
+    }
+
+    /** All that can be done before the window shows. */
+    void build(Conductor conductor, Runnable onClosed) {
         this.conductor = conductor;
         this.onClosed = onClosed;
         Theme.install();
@@ -69,9 +79,15 @@ final class Stage {
         frame.setMinimumSize(new Dimension(480, 300));
         frame.pack();
         frame.setLocationRelativeTo(null);
-        frame.setVisible(true);
-        opening.setRepeats(false);
-        opening.start();
+    }
+
+    /** Paints a window that is not shown, as the screen would be painted. */
+    void drawUnseen() {
+        VolatileImage target = frame.createVolatileImage(frame.getWidth(), frame.getHeight());
+        Graphics graphics = target.createGraphics();
+        frame.getRootPane().paint(graphics);
+        graphics.dispose();
+        target.flush();
     }
 
     /** Called with each frame, on the frames' thread. */

@@ -1,0 +1,68 @@
+#!/usr/bin/env bash
+# SPDX-License-Identifier: Apache-2.0
+# How the player is started: from an archive that has the classes of each command,
+# and without asking the package and build tools when nothing has changed.
+# ORV_BUILD is a build folder, ORV_MEDIA one with test media.
+set -euo pipefail
+
+root=$(dirname -- "$(dirname -- "$(dirname -- "$(readlink -f -- "$0")")")")
+folder=$(mktemp -d)
+trap 'rm -rf -- "$folder"' EXIT
+export ORV_NO_INSTALL=1 ORV_LOG=silent
+unset DISPLAY
+failures=0
+
+fail() {
+    echo "FAILED $*"
+    failures=$((failures + 1))
+}
+
+# Prints what starts the player, a word a line.
+# shellcheck disable=SC2016
+prepare() {
+    "$BASH" -c 'set -euo pipefail; ORV_ROOT=$1; . "$1/tools/shell/common.sh"; use player
+        prepare_player; printf "%s\n" "${JAVA_COMMAND[@]}"' prepare "$root"
+}
+
+# classes_outside COMMAND…: the classes of the player and its libraries that its
+# command reads from their jars.
+classes_outside() {
+    "${java[@]}" "-Xlog:class+load:file=$folder/classes" "${jar[@]}" "$@" >/dev/null 2>&1 ||
+        fail "$1: exit status $?"
+    grep 'source: file:' "$folder/classes" | sed 's/.*\] \([^ ]*\) source.*/\1/' || true
+}
+
+prepare >"$folder/command" || fail "the player cannot be started"
+mapfile -t java < <(grep -v '^-Xlog' "$folder/command" | head -n -2)
+mapfile -t jar < <(tail -n 2 "$folder/command")
+
+for command in "info $ORV_MEDIA/tracks.mkv" "info --json $ORV_MEDIA/tone.flac" \
+    "thumbnail $ORV_MEDIA/short.mp4 $folder/a.png" "cover $ORV_MEDIA/covered.mp3 $folder/a.jpg" \
+    "play --no-window $ORV_MEDIA/one-frame.mkv"; do
+    read -ra words <<<"$command"
+    outside=$(classes_outside "${words[@]}")
+    [ "$(grep -c . <<<"$outside")" -le 3 ] || fail "${words[0]}: not archived: $outside"
+done
+
+# Nobody may be asked now.
+mkdir "$folder/bin"
+for tool in dpkg-query cmake ninja; do
+    printf '#!/bin/sh\necho "%s" >>"%s/asked"\nexit 1\n' "$tool" "$folder" >"$folder/bin/$tool"
+    chmod +x "$folder/bin/$tool"
+done
+PATH=$folder/bin:$PATH
+prepare >/dev/null || fail "a start without changes"
+[ ! -e "$folder/asked" ] || fail "a start without changes asked $(paste -sd' ' "$folder/asked")"
+
+# As if all sources had been changed since.
+touch -d 2000-01-01 "$ORV_BUILD/player-is-current"
+! prepare >/dev/null 2>&1 || fail "a change is not built"
+grep -qx ninja "$folder/asked" || fail "a change is not noticed"
+
+# What failed is tried again.
+: >"$folder/asked"
+! prepare >/dev/null 2>&1 || fail "a failed build is forgotten"
+[ -s "$folder/asked" ] || fail "a failed build is not tried again"
+
+[ $failures -eq 0 ] && echo "all as expected"
+exit $((failures > 0))
