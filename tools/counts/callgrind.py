@@ -31,8 +31,10 @@ ENVIRONMENT = {
     "PATH": "/usr/bin:/bin",
     "LC_ALL": "C",
     "LD_BIND_NOW": "1",
-    "GLIBC_TUNABLES": "glibc.cpu.hwcaps=-AVX_Fast_Unaligned_Load,-AVX512VL,-AVX2,-SSE4_2,-SSE4_1"
-                      ",-SSSE3,-ERMS,-FSRM:glibc.cpu.x86_non_temporal_threshold=0x400000",
+    "GLIBC_TUNABLES": ":".join((
+        "glibc.cpu.hwcaps=-AVX_Fast_Unaligned_Load,-AVX512VL,-AVX2,-SSE4_2,-SSE4_1,-SSSE3,-ERMS,-FSRM",
+        *(f"glibc.cpu.x86_{threshold}_threshold=0x400000" for threshold in (
+            "non_temporal", "memset_non_temporal", "rep_movsb", "rep_stosb")))),
 }
 
 VALGRIND = ["valgrind", "--tool=callgrind", "--quiet", "--toggle-collect=orv_counted",
