@@ -172,16 +172,53 @@ class ProfileTest(unittest.TestCase):
 
     def test_a_machine_without_valgrind_is_refused(self):
         with mock.patch.object(callgrind, "VALGRIND", ["no-such-valgrind"]), \
-                self.assertRaisesRegex(Refusal, "valgrind is not installed"):
+                self.assertRaisesRegex(Refusal, "no-such-valgrind is not installed"):
             callgrind.profile_of(["true"])
 
 
+class MeasureTest(unittest.TestCase):
+    def test_a_path_without_its_counterpart_is_refused(self):
+        with self.assertRaisesRegex(Refusal, "track/10 has no track/0"):
+            callgrind.rows_of({"track/10": 1})
+
+    def test_a_program_that_cannot_be_run_is_refused(self):
+        with self.assertRaisesRegex(Refusal, "Permission denied"):
+            callgrind.measure("/dev/null", "/dev/null")
+
+
 class CommandTest(unittest.TestCase):
-    def test_a_file_that_is_no_library_is_refused(self):
-        done = subprocess.run([TOOLS / "counts/counts.py", "check", "none", "library", __file__],
+    def setUp(self):
+        folder = tempfile.TemporaryDirectory()
+        self.addCleanup(folder.cleanup)
+        self.path = os.path.join(folder.name, "counts.txt")
+
+    def run_tool(self, mode, library=os.environ["ORV_PRODUCT"]):
+        """(status, lines of standard error)"""
+        done = subprocess.run([TOOLS / "counts/counts.py", mode, self.path, "library", library],
                               capture_output=True, text=True)
-        self.assertEqual((done.returncode, done.stderr),
-                         (2, f"orv: {__file__}: not an ELF library\n"))
+        return done.returncode, done.stderr.splitlines()
+
+    def test_a_library_that_has_grown_since_it_was_accepted_fails(self):
+        self.assertEqual(self.run_tool("accept"), (0, []))
+        self.assertEqual(self.run_tool("check"), (0, []))
+        held = table.read(self.path)
+        (column, rows), = held.items()
+        now = rows["relocations"]
+        rows["relocations"] = then = now * 100 // 104
+        table.write(self.path, held)
+        status, said = self.run_tool("check")
+        self.assertEqual((status, said[0]), (
+            1, f"orv: relocations has grown from {then} to {now}, by more than 3 %"))
+        table.write(self.path, {"another compiler": rows})
+        self.assertEqual(self.run_tool("check"), (77, [
+            f"orv: not held here: there are no counts of {column} to compare with"]))
+
+    def test_unfit_input_is_refused(self):
+        self.assertEqual(self.run_tool("check"), (2, [
+            f"orv: {self.path}: No such file or directory"]))
+        self.assertEqual(self.run_tool("accept", __file__), (2, [
+            f"orv: {__file__}: not an ELF library"]))
+        self.assertFalse(os.path.exists(self.path))
 
 
 if __name__ == "__main__":

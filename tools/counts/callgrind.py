@@ -32,7 +32,8 @@ ENVIRONMENT = {
     "LC_ALL": "C",
     "LD_BIND_NOW": "1",
     "GLIBC_TUNABLES": ":".join((
-        "glibc.cpu.hwcaps=-AVX_Fast_Unaligned_Load,-AVX512VL,-AVX2,-SSE4_2,-SSE4_1,-SSSE3,-ERMS,-FSRM",
+        "glibc.cpu.hwcaps=-AVX_Fast_Unaligned_Load,-AVX512VL,-AVX2,-SSE4_2,-SSE4_1,-SSSE3,-ERMS"
+        ",-FSRM",
         *(f"glibc.cpu.x86_{threshold}_threshold=0x400000" for threshold in (
             "non_temporal", "memset_non_temporal", "rep_movsb", "rep_stosb")))),
 }
@@ -67,18 +68,25 @@ def count(profile, product):
     return total
 
 
+def output_of(command, **options):
+    """What a program writes that succeeds."""
+    try:
+        done = subprocess.run(command, capture_output=True, text=True, **options)
+    except FileNotFoundError:
+        raise Refusal(f"{command[0]} is not installed") from None
+    except OSError as error:
+        raise Refusal(f"{command[0]}: {error.strerror}") from None
+    if done.returncode != 0:
+        said = (done.stderr + done.stdout).strip().splitlines()
+        raise Refusal(f"{' '.join(command)} failed: {said[-1] if said else done.returncode}")
+    return done.stdout
+
+
 def profile_of(command):
-    """What callgrind writes about a program that succeeds."""
+    """What callgrind writes about a program."""
     with tempfile.TemporaryDirectory() as folder:
         out = os.path.join(folder, "profile")
-        try:
-            done = subprocess.run([*VALGRIND, f"--callgrind-out-file={out}", *command],
-                                  env=ENVIRONMENT, cwd=folder, capture_output=True, text=True)
-        except FileNotFoundError:
-            raise Refusal("valgrind is not installed") from None
-        if done.returncode != 0:
-            said = (done.stderr + done.stdout).strip().splitlines()
-            raise Refusal(f"{' '.join(command)} failed: {said[-1] if said else done.returncode}")
+        output_of([*VALGRIND, f"--callgrind-out-file={out}", *command], env=ENVIRONMENT, cwd=folder)
         with open(out, encoding="utf-8", errors="replace") as file:
             return file.read()
 
@@ -90,6 +98,8 @@ def rows_of(counts):
     for path, instructions in counts.items():
         name, _, entries = path.partition("/")
         if entries == "10":
+            if f"{name}/0" not in counts:
+                raise Refusal(f"{path} has no {name}/0 beside it")
             rows[name] = round((instructions - counts[f"{name}/0"]) / 10 / TIMES)
         elif not entries:
             rows[name] = round(instructions / TIMES)
@@ -100,7 +110,7 @@ def measure(program, product):
     """{row: instructions} of all paths of the program, a run of valgrind each."""
     product = os.path.realpath(product)
     program = os.path.realpath(program)
-    paths = subprocess.run([program], check=True, capture_output=True, text=True).stdout.split()
+    paths = output_of([program]).split()
 
     def count_path(path):
         return count(profile_of([program, path, str(TIMES)]), product)
