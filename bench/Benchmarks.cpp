@@ -5,51 +5,26 @@
 
 #include <android/log.h>
 #include <benchmark/benchmark.h>
-#include <fcntl.h>
+#include <stdint.h>
 #include <stdio.h>
 #include <stdlib.h>
-#include <unistd.h>
 
 #include <string>
+#include <utility>
 #include <vector>
 
+#include "ByHand.h"
+#include "Failure.h"
 #include "JavaMachine.h"
 #include "JavaWorkload.h"
+#include "LibraryBenchmarks.h"
+#include "LogToNowhere.h"
 #include "stream/JavaInputStream.h"
 
 namespace orvbench {
 namespace {
 
-// Makes the program fail, too.
-bool gFailed = false;
-
-void fail(benchmark::State& state, const std::string& why) {
-    state.SkipWithError(why.c_str());
-    gFailed = true;
-}
-
-// While it lives, the log is written as ever, to where nobody reads it.
-class LogToNowhere {
-public:
-    LogToNowhere() : mStandardError(dup(STDERR_FILENO)) {
-        const int nowhere = open("/dev/null", O_WRONLY | O_CLOEXEC);
-        dup2(nowhere, STDERR_FILENO);
-        close(nowhere);
-        __android_log_set_minimum_priority(ANDROID_LOG_INFO);
-    }
-    ~LogToNowhere() {
-        __android_log_set_minimum_priority(ANDROID_LOG_SILENT);
-        dup2(mStandardError, STDERR_FILENO);
-        close(mStandardError);
-    }
-    LogToNowhere(const LogToNowhere&) = delete;
-    LogToNowhere& operator=(const LogToNowhere&) = delete;
-
-private:
-    const int mStandardError;
-};
-
-// Short calls are made in batches; long ones one by one, each after a rewind.
+// Short calls are made in batches, long ones one by one, some of them each after a rewind.
 constexpr int kBatch = 1000;
 
 void measureCalls(benchmark::State& state, JavaWorkload& workload) {
@@ -59,6 +34,10 @@ void measureCalls(benchmark::State& state, JavaWorkload& workload) {
 void measureCallsWithLog(benchmark::State& state, JavaWorkload& workload) {
     const LogToNowhere log;
     measureCalls(state, workload);
+}
+
+void measureLongCalls(benchmark::State& state, JavaWorkload& workload) {
+    while (!workload.failed() && state.KeepRunningBatch(1)) workload.run(1);
 }
 
 void measureEach(benchmark::State& state, JavaWorkload& workload) {
@@ -82,26 +61,39 @@ void benchmarkWorkload(benchmark::State& state, const char* factory, Measure mea
     if (workload.failed()) fail(state, workload.failure());
 }
 
-// What the engine does to read, on a thread that Java does not know yet.
-void readAll(benchmark::State& state, JavaInputStream& stream) {
+// Each read is on a thread that Java does not know, or no more.
+template <typename Read>
+void readAll(benchmark::State& state, Read read) {
     std::vector<char> buffer(state.range(0));
     const int length = static_cast<int>(buffer.size());
     for (auto _ : state) {
-        int count = 0;
-        stream.read(buffer.data(), length, count);
+        const int count = read(buffer.data(), length);
         if (count != length || buffer.back() != 'm') return fail(state, "too few bytes came");
         buffer.back() = 0;
     }
     state.SetBytesProcessed(state.iterations() * length);
 }
 
-void benchmarkStream(benchmark::State& state) {
+// What the engine does to read.
+void readByLibrary(benchmark::State& state, jobject player) {
+    JavaInputStream stream(javaEnv(), player);
+    readAll(state, [&](char* buffer, int length) {
+        int count = 0;
+        stream.read(buffer, length, count);
+        return count;
+    });
+    javaEnv();  // Reading has detached this thread, and the stream needs it.
+}
+
+void readWithoutLibrary(benchmark::State& state, jobject player) {
+    JavaVM* java = javaMachine();
+    readAll(state,
+            [&](char* buffer, int length) { return readByHand(java, player, buffer, length); });
+}
+
+void benchmarkStream(benchmark::State& state, void (*readAllOf)(benchmark::State&, jobject)) {
     JavaWorkload workload("stream");
-    if (!workload.failed()) {
-        JavaInputStream stream(javaEnv(), workload.player());
-        readAll(state, stream);
-        javaEnv();  // Reading has detached this thread.
-    }
+    if (!workload.failed()) readAllOf(state, workload.player());
     workload.close();
     if (workload.failed()) fail(state, workload.failure());
 }
@@ -114,10 +106,16 @@ struct Benchmark {
 };
 
 constexpr Benchmark kBenchmarks[] = {
+    {"by_hand/empty_native", "emptyNative", measureCalls, benchmark::kNanosecond},
+    {"by_hand/empty_jna", "emptyJna", measureCalls, benchmark::kNanosecond},
+    {"by_hand/empty_foreign", "emptyForeign", measureCalls, benchmark::kNanosecond},
     {"call/current_position", "currentPosition", measureCalls, benchmark::kNanosecond},
     {"call/duration/log:silent", "duration", measureCalls, benchmark::kNanosecond},
     {"call/duration/log:info", "duration", measureCallsWithLog, benchmark::kNanosecond},
     {"call/audio_tracks", "audioTracks", measureCalls, benchmark::kNanosecond},
+    {"call/tracks:1", "oneTrack", measureLongCalls, benchmark::kNanosecond},
+    {"call/tracks:8", "eightTracks", measureLongCalls, benchmark::kNanosecond},
+    {"call/tracks:64", "sixtyFourTracks", measureLongCalls, benchmark::kNanosecond},
     {"call/pcm_description", "pcmDescription", measureCalls, benchmark::kNanosecond},
     {"player/create_and_release", "createAndRelease", measureEach, benchmark::kMillisecond},
     {"player/open", "open", measureEach, benchmark::kMillisecond},
@@ -132,18 +130,24 @@ void registerAll() {
             ->MeasureProcessCPUTime()
             ->UseRealTime();
     }
-    benchmark::RegisterBenchmark("stream/read", benchmarkStream)
-        ->Arg(4 << 10)
-        ->Arg(64 << 10)
-        ->MeasureProcessCPUTime()
-        ->UseRealTime();
+    for (auto [name, readAllOf] :
+         {std::pair("stream/read", readByLibrary), std::pair("by_hand/read", readWithoutLibrary)}) {
+        benchmark::RegisterBenchmark(name, benchmarkStream, readAllOf)
+            ->Arg(4 << 10)
+            ->Arg(64 << 10)
+            ->MeasureProcessCPUTime()
+            ->UseRealTime();
+    }
+    registerLibraryBenchmarks();
 }
 
 // The log's priority is this program's affair.
 bool startJavaSilently() {
     unsetenv("ORV_LOG");
     __android_log_set_minimum_priority(ANDROID_LOG_SILENT);
+    const auto nothing = reinterpret_cast<uintptr_t>(orv_bench_nothing);
     return startJava({"-Djava.class.path=" ORV_BENCH_CLASS_PATH,
+                      "-Dorv.bench.nothing=" + std::to_string(nothing),
                       "--enable-native-access=ALL-UNNAMED",
                       "-Djava.library.path=" ORV_BENCH_LIBRARY_PATH,
                       "-Dorv.bench.media=" ORV_BENCH_MEDIA, "-XX:+UseSerialGC"}) == JNI_OK;
@@ -159,8 +163,12 @@ int main(int argc, char** argv) {
         fprintf(stderr, "orv_bench: the Java virtual machine does not start\n");
         return 1;
     }
+    if (!orvbench::prepareByHand(orvbench::javaEnv())) {
+        fprintf(stderr, "orv_bench: %s\n", orvbench::takeException().c_str());
+        return 1;
+    }
     orvbench::registerAll();
     const size_t count = benchmark::RunSpecifiedBenchmarks();
     orvbench::endJava();
-    return count > 0 && !orvbench::gFailed ? 0 : 1;
+    return count > 0 && !orvbench::anyFailed() ? 0 : 1;
 }

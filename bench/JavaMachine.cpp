@@ -20,6 +20,8 @@ jint startJava(const std::vector<std::string>& options) {
 
 void endJava() { gJava->DestroyJavaVM(); }
 
+JavaVM* javaMachine() { return gJava; }
+
 JNIEnv* javaEnv() {
     JNIEnv* env = nullptr;
     gJava->AttachCurrentThread(&env, nullptr);

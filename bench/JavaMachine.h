@@ -16,6 +16,9 @@ jint startJava(const std::vector<std::string>& options);
 // Waits for Java's threads, but for its daemons, and ends it.
 void endJava();
 
+// Null before it is started.
+JavaVM* javaMachine();
+
 // Of the calling thread, which is attached if it is not yet.
 JNIEnv* javaEnv();
 

@@ -1,21 +1,21 @@
 # SPDX-License-Identifier: Apache-2.0
 # shellcheck shell=bash
-# help: bench [--filter REGEX]       what calls, players, pictures and streams cost here
+# help: bench [--rows REGEX] [--rounds N] [--json FILE] [--plot FILE.svg] [--list]    what calls, players, pictures and streams cost, each beside its floor or its peer
 use packages build player
 
-filter=
+options=("$@")
 while [ $# -gt 0 ]; do
     case $1 in
-    --filter) filter=${2:-} && shift ;;
-    --filter=*) filter=${1#*=} ;;
+    --rows | --rounds | --json | --plot) shift ;;
+    --rows=* | --rounds=* | --json=* | --plot=* | --list) ;;
     *) die_usage "bench does not know '$1'." ;;
     esac
     shift || die_usage "an option of bench lacks its value."
 done
 
-need_packages "build and run the benchmarks" play test
-build_targets on orv_bench
-"$ORV_ROOT/tests/media/make-media.sh" "$ORV_BUILD/media" feature.mkv tone-s16le.pcm
+need_packages "measure, and compare with other programs" play test bench
+build_targets on orv_bench orv_player mediaplayer_orv
+set_java_command
+archive_classes
 use_utf8
-say "these figures are this machine's: compare those of one run with each other"
-exec "$ORV_BUILD/bin/orv_bench" ${filter:+"--benchmark_filter=$filter"}
+exec "$ORV_ROOT/tools/bench/bench.py" "${options[@]}" -- "${JAVA_COMMAND[@]}"

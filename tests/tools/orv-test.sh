@@ -48,8 +48,8 @@ expect "an option first" 2 "options come after one" "$root/orv" --json info
 expect "another target" 2 "not 'mips'" "$root/orv" test --target mips
 expect "a target without a name" 2 "lacks its value" "$root/orv" test --target
 expect "another option of bench" 2 "bench does not know '--fast'" "$root/orv" bench --fast
-expect "a filter of bench without a pattern" 2 "lacks its value" "$root/orv" bench --filter
 expect "another option of counts" 2 "counts does not know '--all'" "$root/orv" counts --all
+expect "rows of bench without a pattern" 2 "lacks its value" "$root/orv" bench --rows
 expect "another doctor" 2 "doctor does not know '--spell'" "$root/orv" doctor --spell x
 ORV_NO_INSTALL=1 expect "a tree that is not there" 2 "none: there is no such folder" \
     "$root/orv" doctor --tree "$folder/none"

@@ -16,6 +16,30 @@ final class Workloads {
 
     private Workloads() {}
 
+    /** What a call into native code and back costs at least. */
+    static Workload emptyNative() {
+        EmptyNative empty = new EmptyNative();
+        return new Workload() {
+            @Override
+            void run(int times) {
+                for (int i = 0; i < times; i++) {
+                    empty.nothing();
+                }
+            }
+        };
+    }
+
+    /** A call of a C function that does nothing, by Java's own interface for such. */
+    static Workload emptyForeign() throws Exception {
+        return new ForeignWorkload();
+    }
+
+    /** The same by JNA, whose classes may be missing. */
+    static Workload emptyJna() throws Exception {
+        return (Workload)
+                Class.forName("com.quintora.mmp.JnaWorkload").getDeclaredConstructor().newInstance();
+    }
+
     /** A getter that logs nothing. */
     static Workload currentPosition() throws Exception {
         return new FilmWorkload() {
@@ -51,6 +75,18 @@ final class Workloads {
                 }
             }
         };
+    }
+
+    static Workload oneTrack() throws Exception {
+        return new TracksWorkload(1);
+    }
+
+    static Workload eightTracks() throws Exception {
+        return new TracksWorkload(8);
+    }
+
+    static Workload sixtyFourTracks() throws Exception {
+        return new TracksWorkload(64);
     }
 
     /** A call that reads two Java objects, field by field. */
@@ -177,6 +213,25 @@ final class Workloads {
                         "the samples last " + millis + " ms: the description was not taken");
             } finally {
                 super.close();
+            }
+        }
+    }
+
+    /** As many tracks as the film has are described. */
+    private static final class TracksWorkload extends Workload {
+        private final int count;
+
+        TracksWorkload(int count) throws Exception {
+            this.count = count;
+            player.setDataSource(media("bench/tracks-" + count + ".mka"));
+            player.prepare();
+        }
+
+        @Override
+        void run(int times) {
+            for (int i = 0; i < times; i++) {
+                int tracks = player.tracks().audio().size();
+                require(tracks == count, "the media has " + tracks + " tracks");
             }
         }
     }
