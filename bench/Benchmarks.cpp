@@ -10,7 +10,6 @@
 #include <stdlib.h>
 
 #include <string>
-#include <utility>
 #include <vector>
 
 #include "ByHand.h"
@@ -91,7 +90,9 @@ void readWithoutLibrary(benchmark::State& state, jobject player) {
             [&](char* buffer, int length) { return readByHand(java, player, buffer, length); });
 }
 
-void benchmarkStream(benchmark::State& state, void (*readAllOf)(benchmark::State&, jobject)) {
+using ReadAllOf = void (*)(benchmark::State& state, jobject player);
+
+void benchmarkStream(benchmark::State& state, ReadAllOf readAllOf) {
     JavaWorkload workload("stream");
     if (!workload.failed()) readAllOf(state, workload.player());
     workload.close();
@@ -123,6 +124,14 @@ constexpr Benchmark kBenchmarks[] = {
     {"player/thumbnail", "thumbnail", measureEach, benchmark::kMillisecond},
 };
 
+void registerStream(const char* name, ReadAllOf readAllOf) {
+    benchmark::RegisterBenchmark(name, benchmarkStream, readAllOf)
+        ->Arg(4 << 10)
+        ->Arg(64 << 10)
+        ->MeasureProcessCPUTime()
+        ->UseRealTime();
+}
+
 void registerAll() {
     for (const Benchmark& each : kBenchmarks) {
         benchmark::RegisterBenchmark(each.name, benchmarkWorkload, each.factory, each.measure)
@@ -130,14 +139,8 @@ void registerAll() {
             ->MeasureProcessCPUTime()
             ->UseRealTime();
     }
-    for (auto [name, readAllOf] :
-         {std::pair("stream/read", readByLibrary), std::pair("by_hand/read", readWithoutLibrary)}) {
-        benchmark::RegisterBenchmark(name, benchmarkStream, readAllOf)
-            ->Arg(4 << 10)
-            ->Arg(64 << 10)
-            ->MeasureProcessCPUTime()
-            ->UseRealTime();
-    }
+    registerStream("stream/read", readByLibrary);
+    registerStream("by_hand/read", readWithoutLibrary);
     registerLibraryBenchmarks();
 }
 

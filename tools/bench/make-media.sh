@@ -7,12 +7,13 @@ set -euo pipefail
 quiet_ffmpeg() { ffmpeg -nostdin -v error -y "$@"; }
 
 # Fifteen seconds that show where they are: a box in the middle, half as wide and high as
-# the picture, is magenta until a second before the end, then green. The
+# the picture, is magenta until a second before the end, then green, in a black frame. The
 # arguments: size, rate, file.
 film() {
     local box="x=iw/4:y=ih/4:w=iw/2:h=ih/2:t=fill"
+    local frame="x=iw/4-16:y=ih/4-16:w=iw/2+32:h=ih/2+32:color=black:t=fill"
     quiet_ffmpeg -f lavfi \
-        -i "testsrc2=size=$1:rate=$2:duration=15,drawbox=$box:color=magenta:enable='lt(t,14)',drawbox=$box:color=lime:enable='gte(t,14)'" \
+        -i "testsrc2=size=$1:rate=$2:duration=15,drawbox=$frame,drawbox=$box:color=magenta:enable='lt(t,14)',drawbox=$box:color=lime:enable='gte(t,14)'" \
         -f lavfi -i "sine=440:duration=15:sample_rate=48000" \
         -c:v libx264 -preset veryfast -crf 20 -g $((2 * $2)) -pix_fmt yuv420p -c:a aac -ac 2 "$3"
 }

@@ -16,6 +16,7 @@ final class Players {
 
     public static void main(String[] arguments) throws InterruptedException {
         int count = Integer.parseInt(arguments[0]);
+        new OrvMediaPlayer().release(); // Loads what the first one alone has to.
         List<OrvMediaPlayer> players = new ArrayList<>(count);
         long begin = System.nanoTime();
         for (int i = 0; i < count; i++) {
