@@ -51,18 +51,21 @@ TarnPlayer::Engine::Engine(orvtarn::Notifier::Deliver deliver)
             [&](orvtarn::MediaFile& file) { found = orvtarn::keyFrameBefore(file, seconds); });
         return found;
     });
-    if (!create()) {
-        release();
-        return;
-    }
     loader.setBeforeLoad([this] { beforeLoad(); });
     loader.setOnUnload([this] { speed.reset(); });
     loader.setOnForget([this] { subtitles.reset(); });
 }
 
-bool TarnPlayer::Engine::create() {
+bool TarnPlayer::Engine::requireCore() {
+    std::lock_guard<std::mutex> lock(coreMutex);
+    if (!hasCore) hasCore = createCore();
+    return *hasCore;
+}
+
+bool TarnPlayer::Engine::createCore() {
     if (!mpv.create()) return false;
     subtitles.readUsualLook();
+    notifier.start();
     return protocol.install(mpv.get()) && video.create(mpv.get()) && events.start();
 }
 

@@ -3,6 +3,9 @@
 
 #include <orvtarn/TarnPlayer.h>
 
+#include <mutex>
+#include <optional>
+
 #include "Gate.h"
 #include "base/EngineLog.h"
 #include "core/EventLoop.h"
@@ -55,6 +58,23 @@ public:
         return call(name, false, operation);
     }
 
+    // The same for operations that need mpv, with the first of which it is made, and
+    // its threads are. Where that fails the player is released.
+    template <class Result, class Operation>
+    Result callWithCore(const char* name, Result closed, Operation operation) {
+        bool made = true;
+        const Result result = call(name, closed, [&] {
+            made = requireCore();
+            return made ? operation() : closed;
+        });
+        if (!made) release();  // outside of the gate, which it waits for
+        return result;
+    }
+    template <class Operation>
+    status_t statusWithCore(const char* name, Operation operation) {
+        return callWithCore(name, status_t{INVALID_OPERATION}, operation);
+    }
+
     // Ends the operations under way and takes the units apart. Once; later
     // calls wait for the first.
     void release();
@@ -97,8 +117,12 @@ public:
     MediaAlbumArt* copyAlbumArt();
 
 private:
-    bool create();
+    bool requireCore();
+    bool createCore();
     void beforeLoad();
+
+    std::mutex coreMutex;
+    std::optional<bool> hasCore;  // nothing before it was tried
 };
 
 }  // namespace android

@@ -52,15 +52,17 @@ MediaAlbumArt* TarnPlayer::extractAlbumArt() {
 }
 
 status_t TarnPlayer::setDataSource(const char* url, const KeyedVector<String8, String8>* headers) {
-    return mEngine->status(__func__, [&] { return mEngine->loader.setUrl(url, pairsOf(headers)); });
+    return mEngine->statusWithCore(__func__,
+                                   [&] { return mEngine->loader.setUrl(url, pairsOf(headers)); });
 }
 
 status_t TarnPlayer::setDataSource(IOrvStreamSource* source) {
-    return mEngine->status(__func__, [&] { return mEngine->loader.setStream(source); });
+    return mEngine->statusWithCore(__func__, [&] { return mEngine->loader.setStream(source); });
 }
 
 status_t TarnPlayer::setDataSource(int fd, int64_t offset, int64_t length) {
-    return mEngine->status(__func__, [&] { return mEngine->loader.setFd(fd, offset, length); });
+    return mEngine->statusWithCore(__func__,
+                                   [&] { return mEngine->loader.setFd(fd, offset, length); });
 }
 
 status_t TarnPlayer::setVideoSurfaceTexture(const sp<IGraphicBufferProducer>& bufferProducer) {
@@ -121,11 +123,11 @@ status_t TarnPlayer::setLooping(int loop) {
 }
 
 status_t TarnPlayer::setParameter(int key, const Parcel& request) {
-    return mEngine->status(__func__, [&] { return mEngine->parameters.set(key, request); });
+    return mEngine->statusWithCore(__func__, [&] { return mEngine->parameters.set(key, request); });
 }
 
 status_t TarnPlayer::getParameter(int key, Parcel* reply) {
-    return mEngine->status(__func__, [&] { return mEngine->parameters.get(key, reply); });
+    return mEngine->statusWithCore(__func__, [&] { return mEngine->parameters.get(key, reply); });
 }
 
 status_t TarnPlayer::invoke(const Parcel& request, Parcel* reply) {
@@ -137,7 +139,7 @@ status_t TarnPlayer::getMetadata(const SortedVector<int>& ids, Parcel* records) 
 }
 
 status_t TarnPlayer::setVolume(float left, float right) {
-    return mEngine->status(__func__, [&] { return mEngine->audio.setVolume(left, right); });
+    return mEngine->statusWithCore(__func__, [&] { return mEngine->audio.setVolume(left, right); });
 }
 
 status_t TarnPlayer::getVideoWidth(int* w) {
@@ -272,11 +274,11 @@ bool TarnPlayer::setSubtitleAttr(int type, void* attr) {
 }
 
 bool TarnPlayer::flushSubtitleAttr() {
-    return mEngine->flag(__func__, [&] { return mEngine->subtitles.flush(); });
+    return mEngine->callWithCore(__func__, false, [&] { return mEngine->subtitles.flush(); });
 }
 
 status_t TarnPlayer::setPlayerRole(E_Orv_Player_Role_Type role) {
-    return mEngine->status(__func__, [&] { return mEngine->audio.setRole(role); });
+    return mEngine->statusWithCore(__func__, [&] { return mEngine->audio.setRole(role); });
 }
 
 status_t TarnPlayer::setPCMMediaInfo(IORV_PB_CTRL_SET_MEDIA_INFO_T* info) {

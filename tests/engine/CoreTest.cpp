@@ -45,31 +45,37 @@ TEST_F(CoreTest, RenderingAsksTheCoreNothing) {
     EXPECT_EQ(0, questionsWhileRendering());
 }
 
+status_t setMedia(TarnPlayer& player) {
+    return player.setDataSource(mediaPath("feature.mkv").c_str(), nullptr);
+}
+
 bool playsMedia(TarnPlayer& player) {
-    return player.setDataSource(mediaPath("feature.mkv").c_str(), nullptr) == NO_ERROR &&
-           player.prepare() == NO_ERROR;
+    return setMedia(player) == NO_ERROR && player.prepare() == NO_ERROR;
 }
 
 TEST_F(CoreTest, ThisMachinesCoreTakesEveryOption) {
     LogCapture log;
     sp<TarnPlayer> other = new TarnPlayer(-1);
+    EXPECT_EQ(NO_ERROR, setMedia(*other));
     EXPECT_THAT(log.lines("TarnPlayer"), testing::IsEmpty());
-    EXPECT_TRUE(playsMedia(*other));
+    EXPECT_EQ(NO_ERROR, other->prepare());
 }
 
 TEST_F(CoreTest, AnOptionThatIsOnlyWishedForCostsALine) {
     LogCapture log;
     UnknownOption unknown("ytdl");
     sp<TarnPlayer> other = new TarnPlayer(-1);
+    EXPECT_EQ(NO_ERROR, setMedia(*other));
     EXPECT_THAT(log.lines("TarnPlayer"),
                 LinesAre({warning("create: mpv refuses ytdl=no: option not found")}));
-    EXPECT_TRUE(playsMedia(*other));
+    EXPECT_EQ(NO_ERROR, other->prepare());
 }
 
 TEST_F(CoreTest, WithoutAnOptionThatIsNeededAPlayerIsAsReleased) {
     LogCapture log;
     UnknownOption unknown("keep-open");
     sp<TarnPlayer> other = new TarnPlayer(-1);
+    EXPECT_EQ(INVALID_OPERATION, setMedia(*other));
     EXPECT_THAT(log.lines("TarnPlayer"),
                 LinesAre({error("create: mpv refuses keep-open=yes, which is needed: option not "
                                 "found")}));
@@ -120,9 +126,10 @@ TEST_F(CoreTest, WithoutACoreAPlayerIsAsReleased) {
     LogCapture log;
     NoNewCore failure;
     sp<TarnPlayer> other = new TarnPlayer(-1);
+    EXPECT_EQ(INVALID_OPERATION, setMedia(*other));
     EXPECT_THAT(log.lines("TarnPlayer"), LinesAre({error("create: no playback core")}));
-    EXPECT_EQ(INVALID_OPERATION, other->setDataSource(mediaPath("feature.mkv").c_str(), nullptr));
     EXPECT_EQ(INVALID_OPERATION, other->reset());
+    EXPECT_EQ(INVALID_OPERATION, setMedia(*other)) << "it is not tried again";
     EXPECT_EQ(NO_ERROR, other->release());
 }
 

@@ -40,9 +40,12 @@ class TarnPlayer : public MediaPlayerBase {
 public:
     // decoder: the number of the hardware decoder to use, -1 for any. This engine
     // chooses by itself, whatever the number: a decoder of the machine's that
-    // copies its pictures back, or software where there is none. Sets the
-    // process's LC_NUMERIC to "C". A player whose mpv cannot start, as
-    // without memory, is as a released one.
+    // copies its pictures back, or software where there is none.
+    // A new player has neither threads nor an mpv: both come with the first data
+    // source, volume, role, parameter or look of subtitles, which takes some
+    // milliseconds, sets the process's LC_NUMERIC to "C", and fails with
+    // INVALID_OPERATION where mpv cannot start, as without memory: the player is
+    // then as a released one.
     explicit TarnPlayer(int decoder);
 
     // Before the data source: whether it is a stereoscopic stream file. On the

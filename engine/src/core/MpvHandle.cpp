@@ -106,52 +106,66 @@ mpv_handle* createWithPointInNumbers() {
     return mpv_create();
 }
 
-}  // namespace
-
-bool MpvHandle::create() {
-    mHandle = createWithPointInNumbers();
-    if (mHandle == nullptr) return refused(__func__, "no playback core");
-    if (setOptions() && initialize()) return true;
-    destroy();
-    return false;
-}
-
-bool MpvHandle::setOptions() {
+bool setOptions(mpv_handle* mpv) {
     for (const Option& option : kNeeded) {
-        if (!setNeeded(mHandle, option)) return false;
+        if (!setNeeded(mpv, option)) return false;
     }
-    for (const Option& option : kWished) setWished(mHandle, option);
-    setWished(mHandle, {"hwdec", hardwareDecoder()});
-    setWished(mHandle, {"ao", audioOutputs().c_str()});
-    setNetwork(mHandle);
+    for (const Option& option : kWished) setWished(mpv, option);
+    setWished(mpv, {"hwdec", hardwareDecoder()});
+    setWished(mpv, {"ao", audioOutputs().c_str()});
+    setNetwork(mpv);
     return true;
 }
 
-bool MpvHandle::initialize() {
-    const int error = mpv_initialize(mHandle);
+bool initialize(mpv_handle* mpv) {
+    const int error = mpv_initialize(mpv);
     return error == 0 || refused("create", mpv_error_string(error));
 }
 
+}  // namespace
+
+bool MpvHandle::create() {
+    mpv_handle* mpv = createWithPointInNumbers();
+    if (mpv == nullptr) return refused(__func__, "no playback core");
+    if (setOptions(mpv) && initialize(mpv)) {
+        mHandle = mpv;
+        return true;
+    }
+    mpv_terminate_destroy(mpv);
+    return false;
+}
+
 void MpvHandle::destroy() {
-    if (mHandle != nullptr) mpv_terminate_destroy(mHandle);
-    mHandle = nullptr;
+    mpv_handle* mpv = mHandle.exchange(nullptr);
+    if (mpv != nullptr) mpv_terminate_destroy(mpv);
+}
+
+int MpvHandle::setProperty(const char* property, mpv_format format, void* value) {
+    mpv_handle* mpv = mHandle;
+    if (mpv == nullptr) return MPV_ERROR_UNINITIALIZED;
+    return mpv_set_property(mpv, property, format, value);
+}
+
+bool MpvHandle::getProperty(const char* property, mpv_format format, void* value) const {
+    mpv_handle* mpv = mHandle;
+    return mpv != nullptr && mpv_get_property(mpv, property, format, value) >= 0;
 }
 
 int MpvHandle::set(const char* property, bool value) {
     int flag = value;
-    return mpv_set_property(mHandle, property, MPV_FORMAT_FLAG, &flag);
+    return setProperty(property, MPV_FORMAT_FLAG, &flag);
 }
 
 int MpvHandle::set(const char* property, int64_t value) {
-    return mpv_set_property(mHandle, property, MPV_FORMAT_INT64, &value);
+    return setProperty(property, MPV_FORMAT_INT64, &value);
 }
 
 int MpvHandle::set(const char* property, double value) {
-    return mpv_set_property(mHandle, property, MPV_FORMAT_DOUBLE, &value);
+    return setProperty(property, MPV_FORMAT_DOUBLE, &value);
 }
 
 int MpvHandle::set(const char* property, const char* value) {
-    return mpv_set_property_string(mHandle, property, value);
+    return setProperty(property, MPV_FORMAT_STRING, &value);
 }
 
 int MpvHandle::set(const char* property, const std::vector<std::string>& values) {
@@ -164,40 +178,41 @@ int MpvHandle::set(const char* property, const std::vector<std::string>& values)
     mpv_node node;
     node.format = MPV_FORMAT_NODE_ARRAY;
     node.u.list = &list;
-    return mpv_set_property(mHandle, property, MPV_FORMAT_NODE, &node);
+    return setProperty(property, MPV_FORMAT_NODE, &node);
 }
 
 std::optional<bool> MpvHandle::getFlag(const char* property) const {
     int flag = 0;
-    if (mpv_get_property(mHandle, property, MPV_FORMAT_FLAG, &flag) < 0) return {};
+    if (!getProperty(property, MPV_FORMAT_FLAG, &flag)) return {};
     return flag != 0;
 }
 
 std::optional<int64_t> MpvHandle::getInt(const char* property) const {
     int64_t value = 0;
-    if (mpv_get_property(mHandle, property, MPV_FORMAT_INT64, &value) < 0) return {};
+    if (!getProperty(property, MPV_FORMAT_INT64, &value)) return {};
     return value;
 }
 
 std::optional<double> MpvHandle::getDouble(const char* property) const {
     double value = 0;
-    if (mpv_get_property(mHandle, property, MPV_FORMAT_DOUBLE, &value) < 0) return {};
+    if (!getProperty(property, MPV_FORMAT_DOUBLE, &value)) return {};
     return value;
 }
 
 std::optional<std::string> MpvHandle::getString(const char* property) const {
-    char* value = mpv_get_property_string(mHandle, property);
-    if (value == nullptr) return {};
+    char* value = nullptr;
+    if (!getProperty(property, MPV_FORMAT_STRING, &value)) return {};
     std::string copy(value);
     mpv_free(value);
     return copy;
 }
 
 bool MpvHandle::getNode(const char* property, MpvNode& node) const {
-    return mpv_get_property(mHandle, property, MPV_FORMAT_NODE, node.get()) >= 0;
+    return getProperty(property, MPV_FORMAT_NODE, node.get());
 }
 
 int MpvHandle::setBackward(bool backward) {
+    if (mHandle == nullptr) return MPV_ERROR_UNINITIALIZED;
     return assign(mHandle, {kDirection, std::string(backward ? kBackward : "forward")});
 }
 

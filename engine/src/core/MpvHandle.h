@@ -4,6 +4,7 @@
 #include <mpv/client.h>
 #include <stdint.h>
 
+#include <atomic>
 #include <initializer_list>
 #include <optional>
 #include <string>
@@ -26,8 +27,9 @@ private:
     mpv_node mNode;
 };
 
-// One mpv handle, a core of its own. Any thread may use properties and commands at any time; only
-// the event loop waits for events. Results are 0 or an mpv_error.
+// One mpv handle, a core of its own. Any thread may use properties and commands while there is
+// one; only the event loop waits for events. Results are 0 or an mpv_error. Until there is a core,
+// properties have no values and cannot be set: one that is made later has its usual settings.
 class MpvHandle {
 public:
     // Creates and initialises mpv with the options every player has.
@@ -35,6 +37,7 @@ public:
     bool create();
     // Ends mpv; its streams are closed and its threads gone afterwards.
     void destroy();
+    // Null until there is one.
     mpv_handle* get() const { return mHandle; }
 
     int set(const char* property, bool value);
@@ -61,10 +64,10 @@ public:
     int seek(double seconds, const char* flags);
 
 private:
-    bool setOptions();
-    bool initialize();
+    int setProperty(const char* property, mpv_format format, void* value);
+    bool getProperty(const char* property, mpv_format format, void* value) const;
 
-    mpv_handle* mHandle = nullptr;
+    std::atomic<mpv_handle*> mHandle{nullptr};
 };
 
 }  // namespace orvtarn

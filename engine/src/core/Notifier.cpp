@@ -28,8 +28,9 @@ struct Notifier::Queue {
 
 Notifier::Notifier(Deliver deliver) : mQueue(std::make_shared<Queue>()) {
     mQueue->deliver = std::move(deliver);
-    mThread = std::thread(run, mQueue);
 }
+
+void Notifier::start() { mThread = std::thread(run, mQueue); }
 
 void Notifier::post(int msg, int ext1, int ext2) {
     std::lock_guard<std::mutex> lock(mQueue->mutex);

@@ -16,6 +16,8 @@ public:
     explicit Notifier(Deliver deliver);
     ~Notifier() { stop(); }
 
+    // Once, before anything is posted.
+    void start();
     // Any thread; never blocks.
     void post(int msg, int ext1 = 0, int ext2 = 0);
     // Drops what was not delivered yet. Waits for a delivery under way, unless it

@@ -26,24 +26,29 @@ bool VideoOutput::create(mpv_handle* mpv) {
     };
     const int error = mpv_render_context_create(&mContext, mpv, parameters);
     if (error < 0) return refused("VideoOutput", mpv_error_string(error));
+    // mpv calls at once, and then when it has a picture.
     mpv_render_context_set_update_callback(mContext, onUpdate, this);
-    mThread = std::thread(&VideoOutput::run, this);
+    std::lock_guard<std::mutex> lock(mWakeMutex);
+    mMayStart = true;
     return true;
 }
 
 void VideoOutput::destroy() {
-    if (mContext == nullptr) return;
+    if (mContext != nullptr) stopRendering();
+    mProducer.clear();
+}
+
+void VideoOutput::stopRendering() {
     mpv_render_context_set_update_callback(mContext, nullptr, nullptr);
     {
         std::lock_guard<std::mutex> lock(mWakeMutex);
         mQuit = true;
         mWakeUp.notify_one();
     }
-    mThread.join();
+    if (mThread.joinable()) mThread.join();
     dropHeld();
     mpv_render_context_free(mContext);
     mContext = nullptr;
-    mProducer.clear();
 }
 
 void VideoOutput::setProducer(const android::sp<android::IGraphicBufferProducer>& producer) {
@@ -73,7 +78,16 @@ void VideoOutput::setFrameTime(uint64_t frame, int64_t microseconds) {
     wake(false);
 }
 
-void VideoOutput::onUpdate(void* self) { static_cast<VideoOutput*>(self)->wake(false); }
+void VideoOutput::onUpdate(void* self) {
+    auto& output = *static_cast<VideoOutput*>(self);
+    output.wake(false);
+    output.startRendering();
+}
+
+void VideoOutput::startRendering() {
+    std::lock_guard<std::mutex> lock(mWakeMutex);
+    if (mMayStart && !mThread.joinable()) mThread = std::thread(&VideoOutput::run, this);
+}
 
 void VideoOutput::wake(bool redraw) {
     std::lock_guard<std::mutex> lock(mWakeMutex);

@@ -16,8 +16,8 @@
 namespace orvtarn {
 
 // Draws mpv's video frames into the surface's buffers, on a thread of its
-// own, the only one that renders. Never holds up playback: a surface without a
-// free buffer misses a frame, and gets the newest one when it has.
+// own, the only one that renders, which begins with the first picture. Never holds up playback: a
+// surface without a free buffer misses a frame, and gets the newest one when it has.
 class VideoOutput {
 public:
     struct Counters {
@@ -36,6 +36,7 @@ public:
         : mOnFrame(std::move(onFrame)), mFrameTime(std::move(frameTime)) {}
     ~VideoOutput() { destroy(); }
 
+    // Once; the surface may be there before.
     bool create(mpv_handle* mpv);
     // Before mpv goes, and quicker when no media is open.
     void destroy();
@@ -62,6 +63,8 @@ private:
 
     static void onUpdate(void* self);
     void wake(bool redraw);
+    void startRendering();
+    void stopRendering();
     void run();
     bool takeFrame();
     bool render(bool newFrame);
@@ -86,6 +89,7 @@ private:
     std::condition_variable mWakeUp;
     bool mWoken = false;
     bool mRedraw = false;
+    bool mMayStart = false;
     bool mQuit = false;
     uint64_t mToldFrame = 0;
     int64_t mToldTimeUs = 0;
