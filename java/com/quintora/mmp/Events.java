@@ -162,6 +162,9 @@ final class Events {
     }
 
     private void queue(int epoch, Consumer<PlayerListener> call) {
+        if (listeners.isEmpty()) {
+            return; // No thread starts for nobody.
+        }
         queue.add(epoch, () -> listeners.forEach(listener -> tellOne(epoch, listener, call)));
     }
 

@@ -59,7 +59,8 @@ public final class OrvMediaPlayer extends Playback {
     private final EngineCommands engine = new EngineCommands(this);
 
     /**
-     * A player whose listeners are called on a daemon thread of its own.
+     * A player whose listeners are called on a daemon thread of its own, which starts with the
+     * first event. Players without media cost next to nothing.
      *
      * @throws RuntimeException when the native half has no memory
      * @throws UnsatisfiedLinkError when the native library is not on java.library.path

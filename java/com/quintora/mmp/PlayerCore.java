@@ -7,6 +7,7 @@ import java.lang.ref.WeakReference;
 import java.util.EnumSet;
 import java.util.Set;
 import java.util.concurrent.Executor;
+import java.util.concurrent.ExecutorService;
 import java.util.concurrent.TimeUnit;
 import java.util.concurrent.atomic.AtomicReference;
 import java.util.concurrent.locks.ReentrantLock;
@@ -26,13 +27,14 @@ abstract sealed class PlayerCore permits DataSources {
 
     final OrvMediaPlayer peer = (OrvMediaPlayer) this;
     private final Watcher watcher = new Watcher(new WeakReference<>(peer));
+    private final ExecutorService listening = PlayerThreads.forListeners();
     private final Events events;
     private final AtomicReference<StreamAdapter> stream =
             new AtomicReference<>(StreamAdapter.none());
     private volatile String source = "";
 
     PlayerCore(Executor executor) {
-        events = new Events(peer, watcher, executor == null ? watcher::execute : executor);
+        events = new Events(peer, watcher, executor == null ? listening : executor);
     }
 
     final Events events() {
@@ -67,13 +69,18 @@ abstract sealed class PlayerCore permits DataSources {
 
     final void stopWatching() {
         events.listeners.clear();
-        watcher.stop();
+        stopThreads();
     }
 
     /** Ends the Java side's threads; for a player that nobody refers to any more. */
     final void abandon() {
         states.endEpoch(PlayerState.RELEASED);
+        stopThreads();
+    }
+
+    private void stopThreads() {
         watcher.stop();
+        listening.shutdown();
     }
 
     final void wake() {

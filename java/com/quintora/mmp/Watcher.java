@@ -4,15 +4,13 @@ package com.quintora.mmp;
 import java.io.IOException;
 import java.lang.ref.WeakReference;
 import java.util.OptionalInt;
-import java.util.concurrent.RejectedExecutionException;
-import java.util.concurrent.ScheduledThreadPoolExecutor;
-import java.util.concurrent.TimeUnit;
+import java.util.concurrent.Future;
 import java.util.concurrent.atomic.AtomicInteger;
 
 /**
  * Looks at a player from time to time and tells what happened: the engine's own events do not come
- * through. Runs on a daemon thread of its own, which starts with the first look and does not keep
- * the player from being collected.
+ * through. Runs on the threads that all players share, one look after the other, and only while
+ * the player has media. Does not keep the player from being collected.
  */
 final class Watcher {
     // Milliseconds between looks.
@@ -26,31 +24,24 @@ final class Watcher {
     // Every how many looks at a playing player the slow values are asked for.
     private static final int SLOW_EVERY = 10;
 
-    private static final AtomicInteger NUMBER = new AtomicInteger();
-
     private final WeakReference<OrvMediaPlayer> watched;
-    private final ScheduledThreadPoolExecutor thread;
+    private final Turns turns = new Turns(PlayerThreads::run);
     private final AtomicInteger round = new AtomicInteger();
     private volatile int preparingEpoch = -1;
+    private volatile Future<?> nextLook;
 
-    // Used on the watching thread only.
+    // Used in a turn only.
     private int looks;
     private int lastPosition;
     private int lastPercent;
 
     Watcher(WeakReference<OrvMediaPlayer> watched) {
         this.watched = watched;
-        thread = new ScheduledThreadPoolExecutor(1, Watcher::newThread);
-        thread.setExecuteExistingDelayedTasksAfterShutdownPolicy(false);
     }
 
-    /** Runs something on the watching thread, after what was given before; not once stopped. */
+    /** Runs something between the looks, after what was given before; not once stopped. */
     void execute(Runnable action) {
-        try {
-            thread.execute(action);
-        } catch (RejectedExecutionException e) {
-            // The player was released: nobody is to be told.
-        }
+        turns.execute(action);
     }
 
     /** Looks for the end of an asynchronous prepare. */
@@ -62,20 +53,23 @@ final class Watcher {
     /** Looks at once, and from then on as often as the player's state needs. */
     void wake() {
         int mine = round.incrementAndGet();
-        execute(() -> {
+        turns.execute(() -> {
             looks = 0;
+            cancelNext();
             look(mine);
         });
     }
 
     void stop() {
-        thread.shutdown();
+        turns.stop();
+        cancelNext();
     }
 
-    private static Thread newThread(Runnable work) {
-        Thread thread = new Thread(work, "OrvMediaPlayer-" + NUMBER.incrementAndGet());
-        thread.setDaemon(true);
-        return thread;
+    private void cancelNext() {
+        Future<?> next = nextLook;
+        if (next != null) {
+            next.cancel(false);
+        }
     }
 
     private void look(int mine) {
@@ -85,15 +79,7 @@ final class Watcher {
         }
         int delay = observe(player);
         if (delay != NO_MORE) {
-            later(mine, delay);
-        }
-    }
-
-    private void later(int mine, int delay) {
-        try {
-            thread.schedule(() -> look(mine), delay, TimeUnit.MILLISECONDS);
-        } catch (RejectedExecutionException e) {
-            // The player was released meanwhile.
+            nextLook = PlayerThreads.later(() -> turns.execute(() -> look(mine)), delay);
         }
     }
 
@@ -110,6 +96,8 @@ final class Watcher {
                 case PREPARED, PAUSED, COMPLETED -> observeResting(player, epoch);
                 default -> NO_MORE;
             };
+        } catch (IllegalStateException e) {
+            return PLAYING; // The media failed or went just now, which the next look finds.
         } finally {
             player.commands.unlock();
             player.events().flush();
