@@ -164,7 +164,9 @@ TEST_F(IdleTest, OnlyOneOfManyDataSourcesIsTaken) {
         EXPECT_EQ(1, std::count(results.begin(), results.end(), NO_ERROR));
         EXPECT_EQ(3, std::count(results.begin(), results.end(), INVALID_OPERATION));
         EXPECT_TRUE(eventually([] { return waitsOf(kEvents).size() == 1; }));
-        if (round % 10 == 0) EXPECT_EQ(NO_ERROR, other->prepare());
+        if (round % 10 == 0) {
+            EXPECT_EQ(NO_ERROR, other->prepare());
+        }
         ASSERT_EQ(NO_ERROR, other->release());
     }
     EXPECT_TRUE(noThreadsAreLeft());
