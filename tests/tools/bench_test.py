@@ -194,8 +194,7 @@ class BenchTest(unittest.TestCase):
         script = self.program("two", f"{hold} <{ready} & {hold} <{ready} & wait")
         process = tree.Tree([script])
         with open(ready, "w", encoding="ascii"):
-            while process.largest < 128 << 20:
-                self.assertFalse(process.has_ended())
+            watching.await_true(lambda: process.largest > 128 << 20, process, 60, "its size", 0.05)
         self.assertGreater(process.finish(60).demand_success().memory, 128)
 
     def test_what_takes_too_long_is_ended(self):
