@@ -125,6 +125,14 @@ TEST_F(SpeedTest, PromisesOnlyWhatItCanDo) {
     EXPECT_TRUE(player->canDoTrick(-32000));
 }
 
+TEST_F(SpeedTest, StaysBackwardAtTheStartUntilItPlays) {
+    open("long.mkv");
+    ASSERT_EQ(NO_ERROR, player->setSpeed(-250));
+    EXPECT_TRUE(remains([&] { return speed() == -250; }));
+    ASSERT_EQ(NO_ERROR, player->start());
+    EXPECT_TRUE(eventually([&] { return speed() == 1000 && position() > 100; }));
+}
+
 TEST_F(SpeedTest, NewMediaPlaysAtTheNormalSpeed) {
     open("short.mp4");
     ASSERT_EQ(NO_ERROR, player->setSpeed(-2000));

@@ -80,7 +80,8 @@ bool Speed::canPlay(int speed) const {
 }
 
 bool Speed::onEndReached() {
-    if (mSpeed >= 0) return false;
+    // What was set while paused at the start holds until it plays.
+    if (mSpeed >= 0 || mState.phase() != Phase::Started) return false;
     mEvents.seekUnattended([this] {
         becomeNormal();
         return mMpv.seek(0, "absolute");
