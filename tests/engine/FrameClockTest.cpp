@@ -2,6 +2,7 @@
 #include <gtest/gtest.h>
 
 #include "core/FrameClock.h"
+#include "core/FrameTiming.h"
 
 namespace orvtarn {
 namespace {
@@ -107,6 +108,15 @@ TEST_F(FrameClockTest, AFrameAtAnotherDistanceIsOfBeyondAJump) {
     // The jump is known late.
     clock.leave(at(32));
     EXPECT_NEAR(0, frameFor(31.6, 0, 0.1), 1e-6);
+}
+
+TEST(FrameTiming, MomentsInNanosecondsAreMicroseconds) {
+    for (const int64_t now : {int64_t{5000}, int64_t{2000000}, int64_t{3600000000}}) {
+        EXPECT_EQ(now + 20000, dueInMicroseconds(now + 20000, now));
+        EXPECT_EQ(now - 3000, dueInMicroseconds(now - 3000, now)) << "late";
+        EXPECT_EQ(now + 20000, dueInMicroseconds((now + 20000) * 1000, now));
+        EXPECT_EQ(now - 3000, dueInMicroseconds((now - 3000) * 1000 + 7, now));
+    }
 }
 
 TEST_F(FrameClockTest, NothingFollowsFromAFrameThatStandsStill) {

@@ -8,13 +8,20 @@
 namespace orvtarn {
 namespace {
 
+constexpr int64_t kFarAhead = 1000000;
+
 int64_t toMicroseconds(double seconds) { return llround(std::max(seconds, 0.0) * 1e6); }
 
 }  // namespace
 
+int64_t dueInMicroseconds(int64_t due, int64_t now) {
+    return due > now + kFarAhead ? due / 1000 : due;
+}
+
 std::optional<int64_t> FrameTiming::begin(uint64_t frame, int64_t due) {
     const PlayerState::Values now = mState.read([](const PlayerState::Values& v) { return v; });
-    const std::optional<double> expected = mClock.begin(due);
+    const std::optional<double> expected =
+        mClock.begin(dueInMicroseconds(due, mpv_get_time_us(mMpv.get())));
     mAsked = frame;
     mpv_wakeup(mMpv.get());
     if (!expected || now.phase != Phase::Started || now.seeking) return {};

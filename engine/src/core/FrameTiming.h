@@ -13,6 +13,11 @@
 
 namespace orvtarn {
 
+// A frame's moment as mpv gives it, on a clock that shows that time now; all but the
+// moment are microseconds. mpv's header says microseconds of the moment, too, but
+// some releases (0.40) give nanoseconds. No frame is due far ahead.
+int64_t dueInMicroseconds(int64_t due, int64_t now);
+
 // Asks mpv for the media time of each frame on the thread of its events, since
 // the drawing thread must not wait for mpv, and gives it to the video output.
 class FrameTiming {
