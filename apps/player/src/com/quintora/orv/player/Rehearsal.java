@@ -53,7 +53,7 @@ public final class Rehearsal {
         Main.commandLine(arguments).execute(arguments);
     }
 
-    /** Grey frames as YUV4MPEG2, a format that needs no encoder. */
+    /** Frames of one colour as YUV4MPEG2, a format that needs no encoder. */
     private static Path makeVideo(Path path) throws IOException {
         var bytes = new ByteArrayOutputStream();
         write(bytes, "YUV4MPEG2 W" + SIDE + " H" + SIDE + " F25:1 Ip A1:1 C420jpeg\n");
