@@ -57,6 +57,7 @@ int MemorySource::read(uint8_t* buffer, int length) {
     if (count <= 0) return 0;
     memcpy(buffer, mBytes.data() + mPosition, static_cast<size_t>(count));
     mPosition += count;
+    mBytesRead += count;
     return static_cast<int>(count);
 }
 

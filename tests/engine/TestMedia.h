@@ -38,7 +38,8 @@ public:
     bool mIsSeekable = true;
     bool mHasSize = true;
     int mLongestRead = 1 << 20;
-    int64_t mFailsAt = -1;  // reads from this position on fail
+    int64_t mFailsAt = -1;   // reads from this position on fail
+    int64_t mBytesRead = 0;  // in all
 
 private:
     std::vector<uint8_t> mBytes;

@@ -3,6 +3,7 @@
 
 #include <cmath>
 
+#include "TestMedia.h"
 #include "ThumbnailPictures.h"
 
 namespace orvtarn {
@@ -54,6 +55,66 @@ INSTANTIATE_TEST_SUITE_P(Broadcast, ThumbnailTimes, testing::ValuesIn(kMedia),
                              name[name.find('.')] = '_';
                              return name;
                          });
+
+// Frame by frame, in leaps, in one place, back and on again.
+const std::vector<int64_t> kWalk = {0,    0,    20,   40,   80,   81,   700,  700,
+                                    1960, 2000, 2040, 2041, 3900, 1300, 1340, 1380,
+                                    5300, 8560, 9960, 9990, 9999, 8000};
+
+class ThumbnailsInOrder : public testing::TestWithParam<const char*> {};
+
+TEST_P(ThumbnailsInOrder, AreThoseThatAreDrawnOnTheirOwn) {
+    const auto thumbnailer = openThumbnailer(GetParam());
+    ASSERT_NE(thumbnailer, nullptr);
+    for (const int64_t position : kWalk) {
+        const auto alone = openThumbnailer(GetParam());
+        ASSERT_NE(alone, nullptr);
+        EXPECT_EQ(thumbnailAt(*thumbnailer, position, 160, 90),
+                  thumbnailAt(*alone, position, 160, 90))
+            << GetParam() << " at " << position;
+    }
+}
+
+INSTANTIATE_TEST_SUITE_P(All, ThumbnailsInOrder,
+                         testing::Values("video.mp4", "video.mkv", "video.avi", "stream.ts",
+                                         "stream.mpg", "counted-varying.mkv", "slides.mkv",
+                                         "still.png"),
+                         [](const auto& info) { return orvtest::testName(info.param); });
+
+// A thumbnailer of a file in memory, and what it reads from.
+struct InMemory {
+    explicit InMemory(const std::string& name) : bytes(orvtest::bytesOf(orvtest::mediaPath(name))) {
+        auto memory = std::make_unique<orvtest::MemorySource>(bytes);
+        source = memory.get();
+        std::unique_ptr<MediaFile> file;
+        EXPECT_EQ(MediaFile::open(std::move(memory), {}, file), 0);
+        EXPECT_EQ(Thumbnailer::create(std::move(file), -1, thumbnailer), 0);
+    }
+
+    const std::vector<uint8_t> bytes;
+    orvtest::MemorySource* source;  // the thumbnailer's
+    std::unique_ptr<Thumbnailer> thumbnailer;
+};
+
+TEST(ThumbnailTimes, InOrderReadTheMediaOnce) {
+    const InMemory media("distant.mkv");
+    ASSERT_NE(media.thumbnailer, nullptr);
+    // Before the second key frame; each on its own reads half of that.
+    for (int64_t position = 0; position < 14000; position += 250) {
+        thumbnailAt(*media.thumbnailer, position, 160, 90);
+    }
+    EXPECT_LT(media.source->mBytesRead, 2 * static_cast<int64_t>(media.bytes.size()));
+}
+
+TEST(ThumbnailTimes, AreRightAgainWhenTheMediaCanBeReadAgain) {
+    const InMemory media("distant.mkv");
+    ASSERT_NE(media.thumbnailer, nullptr);
+    media.source->mFailsAt = static_cast<int64_t>(media.bytes.size() / 4);
+    thumbnailAt(*media.thumbnailer, 12000, 160, 90);
+    media.source->mFailsAt = -1;
+    EXPECT_EQ(thumbnailAt(*media.thumbnailer, 12500, 160, 90),
+              thumbnailAt(*openThumbnailer("distant.mkv"), 12500, 160, 90));
+}
 
 }  // namespace
 }  // namespace orvtarn

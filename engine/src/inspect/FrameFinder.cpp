@@ -22,6 +22,7 @@ namespace {
 const int64_t kToleranceUs = 1000;
 const int64_t kNextFrameUs = 100 * 1000;
 const int64_t kFirstSeekBackUs = 1000 * 1000;
+const int64_t kNearUs = 2000 * 1000;
 
 bool isEmbeddedPicture(const AVStream& stream) {
     return (stream.disposition & AV_DISPOSITION_ATTACHED_PIC) != 0;
@@ -99,7 +100,7 @@ const AVFrame* FrameFinder::before() const {
 
 const AVFrame* FrameFinder::after() {
     if (isEmbeddedPicture(*mStream)) return nullptr;
-    return (mRead->width > 0 || readFrame()) && isLike(*mRead) ? mRead : nullptr;
+    return nextFrame() && isLike(*mRead) ? mRead : nullptr;
 }
 
 int64_t FrameFinder::startTimeUs() const {
@@ -111,6 +112,10 @@ int64_t FrameFinder::startTimeUs() const {
 int64_t FrameFinder::timeUs(int64_t timestamp) const {
     if (timestamp == AV_NOPTS_VALUE) return 0;
     return av_rescale_q(timestamp, mStream->time_base, AV_TIME_BASE_Q) - startTimeUs();
+}
+
+int64_t FrameFinder::timestamp(int64_t timeUs) const {
+    return av_rescale_q(timeUs + startTimeUs(), AV_TIME_BASE_Q, mStream->time_base);
 }
 
 const AVFrame* FrameFinder::find(int64_t positionMs) {
@@ -130,13 +135,29 @@ const AVFrame* FrameFinder::find(int64_t positionMs) {
 // key frame before the time: this goes further and further back until a frame at
 // or before the time comes out.
 void FrameFinder::search(int64_t positionUs) {
+    const bool canGoOn = positionUs >= mWantedUs && isOnTheWayTo(positionUs);
     mWantedUs = positionUs;
+    if (canGoOn) {
+        if (!isReached(*mFound)) decodeUpTo(true, true);
+        return;
+    }
     for (int64_t back = 0;; back = std::max(4 * back, kFirstSeekBackUs)) {
         const int64_t from = std::max<int64_t>(positionUs - back, 0);
         // Reading goes on from where it stands in media that cannot be sought.
         const bool isLast = !seek(from) || from == 0;
-        if (decodeUpTo(positionUs, isLast) || isLast || mFile.isInterrupted()) return;
+        if (decodeUpTo(isLast, false) || isLast || mFile.isInterrupted()) return;
     }
+}
+
+// Whether decoding comes to the time from the frame that was found last no later
+// than from the key frame before the time: pictures that are asked for in order
+// cost their own frames then, and not those since the key frame again.
+bool FrameFinder::isOnTheWayTo(int64_t positionUs) const {
+    if (!mIsInOrder || mIsAtEnd) return false;
+    const int key = av_index_search_timestamp(mStream, timestamp(positionUs), AVSEEK_FLAG_BACKWARD);
+    if (key < 0) return positionUs - timeUs(mFound->best_effort_timestamp) < kNearUs;
+    const AVIndexEntry* entry = avformat_index_get_entry(mStream, key);
+    return entry != nullptr && entry->timestamp <= mFound->best_effort_timestamp;
 }
 
 bool FrameFinder::seek(int64_t positionUs) {
@@ -144,32 +165,38 @@ bool FrameFinder::seek(int64_t positionUs) {
     // Broadcast formats are searched by decoding times, which misses the first
     // key frame.
     const bool isToFirstByte = positionUs == 0 && (media->iformat->flags & AVFMT_TS_DISCONT) != 0;
-    const int64_t time =
-        av_rescale_q(positionUs + startTimeUs(), AV_TIME_BASE_Q, mStream->time_base);
-    const int error = isToFirstByte
-                          ? av_seek_frame(media, -1, 0, AVSEEK_FLAG_BYTE)
-                          : av_seek_frame(media, mStream->index, time, AVSEEK_FLAG_BACKWARD);
+    const int error = isToFirstByte ? av_seek_frame(media, -1, 0, AVSEEK_FLAG_BYTE)
+                                    : av_seek_frame(media, mStream->index, timestamp(positionUs),
+                                                    AVSEEK_FLAG_BACKWARD);
     if (error < 0) return false;
     avcodec_flush_buffers(mCodec);
+    av_frame_unref(mRead);
+    mIsInOrder = false;
+    mIsAtEnd = false;
     // What depends on frames before the place would come out damaged.
     mAwaitsKey = positionUs > 0;
     return true;
 }
 
-// takeLater: also takes a first frame that is past the time.
-bool FrameFinder::decodeUpTo(int64_t positionUs, bool takeLater) {
-    bool hasEarlier = false;
-    av_frame_unref(mBefore);
-    while (readFrame()) {
-        const int64_t late = timeUs(mRead->best_effort_timestamp) - positionUs;
-        const bool isReached = late > -kToleranceUs;
+// A frame counts as at the time a little earlier, too, since times are rounded.
+bool FrameFinder::isReached(const AVFrame& frame) const {
+    return timeUs(frame.best_effort_timestamp) - mWantedUs > -kToleranceUs;
+}
+
+// takeLater: also takes a first frame that is past the time. hasEarlier: the frame
+// that was found last is before the time, and decoding goes on from there.
+bool FrameFinder::decodeUpTo(bool takeLater, bool hasEarlier) {
+    if (!hasEarlier) av_frame_unref(mBefore);
+    while (nextFrame()) {
+        const int64_t late = timeUs(mRead->best_effort_timestamp) - mWantedUs;
         if (!hasEarlier && late >= kToleranceUs && !takeLater) return false;
         if (hasEarlier && late > kNextFrameUs) return true;
         av_frame_unref(mBefore);
         if (hasEarlier) av_frame_move_ref(mBefore, mFound);
         av_frame_unref(mFound);
         av_frame_move_ref(mFound, mRead);
-        if (isReached) return true;
+        mIsInOrder = true;
+        if (isReached(*mFound)) return true;
         hasEarlier = true;
     }
     return hasEarlier && !mFile.isInterrupted();
@@ -179,6 +206,9 @@ bool FrameFinder::decodePicture() {
     return avcodec_send_packet(mCodec, &mStream->attached_pic) >= 0 &&
            avcodec_send_packet(mCodec, nullptr) >= 0 && avcodec_receive_frame(mCodec, mFound) >= 0;
 }
+
+// The one that was looked at but not taken, or another one.
+bool FrameFinder::nextFrame() { return mRead->width > 0 || readFrame(); }
 
 bool FrameFinder::readFrame() {
     for (;;) {
@@ -201,6 +231,7 @@ bool FrameFinder::sendPacket() {
         if (isWanted) return true;
         if (mAwaitsKey && isPast) return false;
     }
+    mIsAtEnd = true;
     return !mFile.isInterrupted() && avcodec_send_packet(mCodec, nullptr) >= 0;
 }
 

@@ -48,22 +48,28 @@ private:
     void search(int64_t positionUs);
     bool seek(int64_t positionUs);
     bool isLike(const AVFrame& frame) const;
-    bool decodeUpTo(int64_t positionUs, bool takeLater);
+    bool isOnTheWayTo(int64_t positionUs) const;
+    bool isReached(const AVFrame& frame) const;
+    bool decodeUpTo(bool takeLater, bool hasEarlier);
     bool decodePicture();
+    bool nextFrame();
     bool readFrame();
     bool sendPacket();
     int64_t startTimeUs() const;
     int64_t timeUs(int64_t timestamp) const;
+    int64_t timestamp(int64_t timeUs) const;
 
     MediaFile& mFile;
     AVStream* mStream = nullptr;
     AVCodecContext* mCodec = nullptr;
     AVPacket* mPacket;
-    AVFrame* mRead;           // the one just decoded
+    AVFrame* mRead;           // the one just decoded, unless it was taken
     AVFrame* mFound;          // the one to show
     AVFrame* mBefore;         // the one that was decoded before that
     int64_t mWantedUs = 0;    // the time that is searched for
     bool mAwaitsKey = false;  // packets before a key frame are not decoded
+    bool mIsInOrder = false;  // the found one was decoded since the last seek
+    bool mIsAtEnd = false;    // no packet is left, or reading failed
 };
 
 }  // namespace orvtarn
