@@ -8,6 +8,7 @@
 #include "CountedFrames.h"
 #include "HttpServer.h"
 #include "PlayerTest.h"
+#include "inspect/PictureCanvas.h"
 
 using namespace android;
 using namespace orvtest;
@@ -22,6 +23,7 @@ struct Counted {
 };
 
 const Counted kSixty = {"counted-60.mkv", 60, 239};
+const Counted kSound = {"counted-sound.mkv", 60, 239};
 const Counted kFilm = {"counted-film.mp4", 24000 / 1001.0, 95};
 const Counted kVarying = {"counted-varying.mkv", 60, 239};
 const Counted kTransport = {"counted.ts", 25, 99};
@@ -67,6 +69,19 @@ protected:
         return player->seekTo(msec, MediaTrack::ReadOptions::SEEK_CLOSEST);
     }
 
+    // Of the frame that a thumbnail shows.
+    int thumbnailNumber() {
+        const int stride = orvtarn::thumbnailStride(ORV_COLOR_MODE_XRGB8888, kWidth);
+        Picture picture = {kWidth, kHeight, 0, std::vector<uint8_t>(stride * kHeight)};
+        _Media_Thumbnail_Info_T thumbnail = {picture.pixels.data(),
+                                             static_cast<uint32_t>(picture.pixels.size()),
+                                             ORV_COLOR_MODE_XRGB8888, kWidth, kHeight};
+        EXPECT_TRUE(player->getThumbnailInfo(&thumbnail));
+        return numberIn(picture);
+    }
+
+    static constexpr int kWidth = 128;
+    static constexpr int kHeight = 32;
     sp<CountingSink> frames = new CountingSink;
 };
 
@@ -160,6 +175,22 @@ TEST_F(TimeTest, StepsCountFramesOfAVaryingRate) {
     expectAt(kVarying, 62);
     ASSERT_TRUE(player->step(-28));
     expectAt(kVarying, 9);
+}
+
+// Beside sound the frames of a file need not begin at its time zero.
+TEST_F(TimeTest, StepsAndThumbnailsBesideSoundAreOfThoseFrames) {
+    open(kSound.file);
+    ASSERT_TRUE(player->step(40));
+    expectAt(kSound, 40);
+    EXPECT_EQ(40, thumbnailNumber());
+    ASSERT_TRUE(player->step(-17));
+    expectAt(kSound, 23);
+    EXPECT_EQ(23, thumbnailNumber());
+    ASSERT_EQ(NO_ERROR, player->seekTo(2500, MediaTrack::ReadOptions::SEEK_PREVIOUS_SYNC));
+    expectAt(kSound, 120);
+    EXPECT_EQ(120, thumbnailNumber());
+    ASSERT_EQ(NO_ERROR, player->seekTo(2900, MediaTrack::ReadOptions::SEEK_CLOSEST_SYNC));
+    expectAt(kSound, 180);
 }
 
 TEST_F(TimeTest, StepsFromAServerCountByTheRate) {

@@ -20,7 +20,7 @@ FILES="video.mp4 lying.mp4 video.mkv video.ts video.avi slides.mkv rotated.mp4 h
        yuv420p10.mkv yuv422p.mkv yuv422p10.mkv yuv444p.mkv yuv444p12.mkv
        bt601.mkv bt601-full.mkv bt709.mkv bt709-full.mkv bt2020.mkv pq.mkv hlg.mkv
        top-first.ts bottom-first.ts one-frame.mkv
-       counted-60.mkv counted-film.mp4 counted-varying.mkv counted.ts
+       counted-60.mkv counted-sound.mkv counted-film.mp4 counted-varying.mkv counted.ts
        stream.ts stream.m2ts stream.mpg stream.vob distant.ts distant.m2ts distant.mpg distant.vob
        lying90.mp4 lying180.mp4 lying270.mp4 mirrored.mp4 flipped.mp4 lying90mirrored.mp4
        wide-pixels.mkv deep-422.mkv full-444.mkv hdr-pq.mkv hdr-hlg.mkv hdr10.mp4 fields-top.mkv
@@ -526,13 +526,19 @@ make_one_frame_mkv() {
 }
 
 # Frames that show their numbers: eight stripes are the binary digits, the lowest
-# one first, white for one. The argument after the file: the rate.
+# one first, white for one. The arguments after the file: the rate, frames from one
+# key frame to the next, more filters, and more options of the file.
 counted() {
-    # shellcheck disable=SC2046
+    # shellcheck disable=SC2046,SC2086
     quiet_ffmpeg -f lavfi -i "nullsrc=size=128x32:rate=$2:duration=4,format=yuv420p,geq=lum='if(bitand(N\,pow(2\,floor(X/16)))\,235\,16)':cb=128:cr=128${4-}" \
-        $(fast_h264) -crf 12 -g "$3" -vsync passthrough "$1"
+        $(fast_h264) -crf 12 -g "$3" -vsync passthrough ${5-} "$1"
 }
 make_counted_60_mkv() { counted "$1" 60 60; }
+# AAC begins before time zero, so that all times are moved on: the container's begin
+# with the sound's, while the first block is a frame, 21 ms later.
+make_counted_sound_mkv() {
+    counted "$1" 60 60 "[out0];sine=duration=4:sample_rate=48000[out1]" "-c:a aac -bf 2"
+}
 make_counted_ts() { counted "$1" 25 25; }
 make_counted_film_mp4() { counted "$1" 24000/1001 24; }
 # Of each ten frames five are left.

@@ -5,6 +5,7 @@
 #include <string.h>
 
 #include <algorithm>
+#include <cmath>
 #include <string>
 #include <utility>
 
@@ -163,6 +164,9 @@ void EventLoop::onLogMessage(const mpv_event_log_message& message) {
 void EventLoop::onLoaded() {
     const bool indexed = mMpv.getString("file-format").value_or("").find("mpeg") != 0;
     mMpv.set("hr-seek-demuxer-offset", indexed ? 0.0 : 2.0);
+    if (const auto start = mMpv.getDouble("demuxer-start-time")) {
+        mState.update([&](PlayerState::Values& v) { v.startUs = std::llround(*start * 1e6); });
+    }
     mMedia.onLoaded();
 }
 

@@ -35,6 +35,7 @@ void PlayerState::Values::forgetMedia() {
     const Values fresh;
     fileStarted = restarted = framed = hasVideo = seekable = buffering = false;
     if (!attended) seeking = false;  // who attends it ends it
+    startUs.reset();
     position = fresh.position;
     duration = fresh.duration;
     width = height = 0;

@@ -8,6 +8,7 @@
 #include <condition_variable>
 #include <initializer_list>
 #include <mutex>
+#include <optional>
 
 namespace orvtarn {
 
@@ -51,9 +52,10 @@ public:
         uint64_t restarts = 0;  // playback gone on after a seek or the load
         uint64_t seeksOf = 0;   // the two numbers when the seek under way was begun
         uint64_t restartsOf = 0;
-        double position = 0;  // seconds
-        double duration = 0;  // seconds, 0 when unknown
-        int width = 0;        // of the picture as it is meant to be seen, pixels
+        std::optional<int64_t> startUs;  // the timestamp that times count from
+        double position = 0;             // seconds
+        double duration = 0;             // seconds, 0 when unknown
+        int width = 0;                   // of the picture as it is meant to be seen, pixels
         int height = 0;
         int bufferPercent = 0;
 

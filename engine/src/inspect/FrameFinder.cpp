@@ -103,19 +103,14 @@ const AVFrame* FrameFinder::after() {
     return nextFrame() && isLike(*mRead) ? mRead : nullptr;
 }
 
-int64_t FrameFinder::startTimeUs() const {
-    const int64_t start = mFile.context()->start_time;
-    return start == AV_NOPTS_VALUE ? 0 : start;
-}
-
 // From the media's start. What has no time counts as at the start.
 int64_t FrameFinder::timeUs(int64_t timestamp) const {
     if (timestamp == AV_NOPTS_VALUE) return 0;
-    return av_rescale_q(timestamp, mStream->time_base, AV_TIME_BASE_Q) - startTimeUs();
+    return av_rescale_q(timestamp, mStream->time_base, AV_TIME_BASE_Q) - mFile.startUs();
 }
 
 int64_t FrameFinder::timestamp(int64_t timeUs) const {
-    return av_rescale_q(timeUs + startTimeUs(), AV_TIME_BASE_Q, mStream->time_base);
+    return av_rescale_q(timeUs + mFile.startUs(), AV_TIME_BASE_Q, mStream->time_base);
 }
 
 const AVFrame* FrameFinder::find(int64_t positionMs) {

@@ -55,7 +55,6 @@ private:
     bool nextFrame();
     bool readFrame();
     bool sendPacket();
-    int64_t startTimeUs() const;
     int64_t timeUs(int64_t timestamp) const;
     int64_t timestamp(int64_t timeUs) const;
 

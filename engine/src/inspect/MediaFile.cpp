@@ -162,6 +162,11 @@ const AVStream* MediaFile::stream(int index) const {
     return mContext->streams[index];
 }
 
+int64_t MediaFile::startUs() const {
+    const int64_t byContainer = mContext->start_time == AV_NOPTS_VALUE ? 0 : mContext->start_time;
+    return mStartUs.value_or(byContainer);
+}
+
 bool MediaFile::isInterrupted() const {
     return (mCancel != nullptr && mCancel->load(std::memory_order_relaxed)) ||
            std::chrono::steady_clock::now() >= mDeadline;

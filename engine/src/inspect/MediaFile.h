@@ -7,6 +7,7 @@
 #include <atomic>
 #include <chrono>
 #include <memory>
+#include <optional>
 #include <string>
 #include <utility>
 #include <vector>
@@ -55,6 +56,10 @@ public:
 
     AVFormatContext* context() { return mContext; }
     const AVFormatContext* context() const { return mContext; }
+    // What times count from, as a timestamp in microseconds: the container's start
+    // unless another was set. Players need not agree with libavformat about it.
+    int64_t startUs() const;
+    void setStartUs(int64_t startUs) { mStartUs = startUs; }
     // Null for an index that is not one.
     const AVStream* stream(int index) const;
 
@@ -74,6 +79,7 @@ private:
     const std::atomic<bool>* mCancel;
     std::chrono::milliseconds mTimeLimit;
     std::chrono::steady_clock::time_point mDeadline;
+    std::optional<int64_t> mStartUs;
     std::string mHeaders;
     std::unique_ptr<ByteSource> mSource;
     AVIOContext* mSourceContext = nullptr;

@@ -26,10 +26,7 @@ const AVStream* leadingStream(MediaFile& file) {
     return index >= 0 ? file.stream(index) : nullptr;
 }
 
-double startOf(const MediaFile& file) {
-    const int64_t start = file.context()->start_time;
-    return start == AV_NOPTS_VALUE ? 0 : static_cast<double>(start) / AV_TIME_BASE;
-}
+double startOf(const MediaFile& file) { return static_cast<double>(file.startUs()) / AV_TIME_BASE; }
 
 // Calls the visitor with each packet of the stream from here on, until it says
 // false.

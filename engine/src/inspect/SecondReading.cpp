@@ -14,6 +14,7 @@ bool SecondReading::withFile(const std::function<void(MediaFile&)>& task) {
     const std::shared_ptr<MediaFile> opened = file();
     if (opened == nullptr) return false;
     opened->restartTimeLimit();
+    setStart(*opened);
     task(*opened);
     return true;
 }
@@ -63,6 +64,10 @@ android::status_t SecondReading::openAgain(std::unique_ptr<MediaFile>& opened) {
                              : android::NO_ERROR;
 }
 
+void SecondReading::setStart(MediaFile& opened) const {
+    if (mStartUs != INT64_MIN) opened.setStartUs(mStartUs);
+}
+
 std::shared_ptr<MediaFile> SecondReading::file() {
     {
         std::lock_guard<std::mutex> keep(mKeepMutex);
@@ -80,6 +85,7 @@ std::shared_ptr<Thumbnailer> SecondReading::thumbnailer(int streamIndex) {
     if (mUndrawable == streamIndex) return nullptr;
     std::unique_ptr<MediaFile> opened = open();
     if (opened == nullptr) return nullptr;
+    setStart(*opened);
     std::unique_ptr<Thumbnailer> created;
     Thumbnailer::create(std::move(opened), streamIndex, created);
     if (created == nullptr) mUndrawable = streamIndex;

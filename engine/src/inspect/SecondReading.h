@@ -35,6 +35,8 @@ public:
 
     // Media whose bytes say nothing about their format: nothing is opened.
     void setRaw() { mRaw = true; }
+    // The timestamp that the player's times count from, in microseconds.
+    void setStartUs(int64_t startUs) { mStartUs = startUs; }
     // The media are loaded anew.
     void tryAgain();
     // Refuses tasks from now on and ends the one under way. What it has open is
@@ -43,6 +45,7 @@ public:
 
 private:
     std::unique_ptr<MediaFile> open();
+    void setStart(MediaFile& opened) const;
     std::shared_ptr<MediaFile> file();
     android::status_t openAgain(std::unique_ptr<MediaFile>& opened);
     std::shared_ptr<Thumbnailer> thumbnailer(int streamIndex);
@@ -55,10 +58,11 @@ private:
     const std::shared_ptr<MediaSource> mSource;
     std::atomic<bool> mRaw{false};
     std::atomic<bool> mClosed{false};
-    std::atomic<bool> mUnreadable{false};     // cannot be opened
-    std::atomic<int> mUndrawable{kNoStream};  // cannot be decoded
-    std::mutex mUseMutex;                     // one task at a time
-    std::mutex mKeepMutex;                    // the pointers; never held while the source is read
+    std::atomic<int64_t> mStartUs{INT64_MIN};  // by the container then
+    std::atomic<bool> mUnreadable{false};      // cannot be opened
+    std::atomic<int> mUndrawable{kNoStream};   // cannot be decoded
+    std::mutex mUseMutex;                      // one task at a time
+    std::mutex mKeepMutex;                     // the pointers; never held while the source is read
     std::shared_ptr<MediaFile> mFile;
     std::shared_ptr<Thumbnailer> mThumbnailer;
     int mThumbnailerStream = kNoStream;

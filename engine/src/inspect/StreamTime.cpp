@@ -7,13 +7,8 @@ extern "C" {
 
 namespace orvtarn {
 
-StreamTime::StreamTime(MediaFile& file, const AVStream& stream)
-    : mFile(file), mStream(stream), mStartUs(file.context()->start_time) {
-    if (mStartUs == AV_NOPTS_VALUE) mStartUs = 0;
-}
-
 int64_t StreamTime::of(int64_t timestamp) const {
-    return av_rescale_q(timestamp, mStream.time_base, AV_TIME_BASE_Q) - mStartUs;
+    return av_rescale_q(timestamp, mStream.time_base, AV_TIME_BASE_Q) - mFile.startUs();
 }
 
 // Formats without an index search by decoding times, and miss the first key frame.
@@ -22,7 +17,7 @@ bool StreamTime::seek(int64_t us) {
     if (us == 0 && (media->iformat->flags & AVFMT_TS_DISCONT) != 0) {
         return av_seek_frame(media, -1, 0, AVSEEK_FLAG_BYTE) >= 0;
     }
-    const int64_t time = av_rescale_q(us + mStartUs, AV_TIME_BASE_Q, mStream.time_base);
+    const int64_t time = av_rescale_q(us + mFile.startUs(), AV_TIME_BASE_Q, mStream.time_base);
     return av_seek_frame(media, mStream.index, time, AVSEEK_FLAG_BACKWARD) >= 0;
 }
 

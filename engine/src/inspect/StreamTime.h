@@ -13,7 +13,7 @@ public:
     // A time that a frame misses by no more than this, by rounding, is the frame's.
     static constexpr int64_t kRoundingUs = 1000;
 
-    StreamTime(MediaFile& file, const AVStream& stream);
+    StreamTime(MediaFile& file, const AVStream& stream) : mFile(file), mStream(stream) {}
 
     int64_t of(int64_t timestamp) const;
     // Has packets read from about that time on; they may begin before or after it.
@@ -22,7 +22,6 @@ public:
 private:
     MediaFile& mFile;
     const AVStream& mStream;
-    int64_t mStartUs;
 };
 
 }  // namespace orvtarn

@@ -109,8 +109,11 @@ std::shared_ptr<MediaSource> Loader::source() const {
 }
 
 std::shared_ptr<SecondReading> Loader::secondReading() const {
+    const auto startUs = mState.read([](const PlayerState::Values& v) { return v.startUs; });
     std::lock_guard<std::mutex> lock(mSourceMutex);
-    return mSecondReading != nullptr ? mSecondReading : std::make_shared<SecondReading>(nullptr);
+    if (mSecondReading == nullptr) return std::make_shared<SecondReading>(nullptr);
+    if (startUs) mSecondReading->setStartUs(*startUs);
+    return mSecondReading;
 }
 
 android::status_t Loader::setRawFormat(const char* operation,
