@@ -13,6 +13,8 @@ LONG = "three-hours.mkv"
 NEAR_THE_END = 7199  # seconds: 1:59:59
 THUMBNAILS = 100
 PROCESSES = 10  # of which a thumbnail's share is taken
+FILM_MILLIS = 15000
+KEY_FRAME_MILLIS = 2000
 
 
 def costs(goal=None):
@@ -53,9 +55,14 @@ def _orv_thumbnail(place, media, at, out):
 
 
 def _thumbnailer(place, media, at, out):
-    hours, minutes, seconds = at // 3600, at // 60 % 60, at % 60
+    hours, minutes, seconds = int(at) // 3600, int(at) // 60 % 60, int(at) % 60
     return ["ffmpegthumbnailer", "-i", place.media(media), "-s", "320",
             "-t", f"{hours:02}:{minutes:02}:{seconds:02}", "-o", out]
+
+
+def _ffmpeg_picture(place, media, at, out):
+    return ["ffmpeg", "-nostdin", "-v", "error", "-y", "-ss", str(at), "-i", place.media(media),
+            "-frames:v", "1", "-s", "320x180", out]
 
 
 def _picture_side(name, place, command):
@@ -68,25 +75,31 @@ def _picture_side(name, place, command):
 
 # The share of one in a program that draws a hundred, its start included.
 def _thumbnails(place):
-    quantities = (Quantity("time", "ms", Goal(0.04)), Quantity("cpu", "ms"))
-    film = place.media(FILM)
-    program = place.java("com.quintora.mmp.Thumbnails", film, str(THUMBNAILS))
-    here = Side("100 in a Java program", lambda: _share(
-        [run(program, environment=place.environment())], THUMBNAILS))
-    peers = (("thumbnails-100", "./orv thumbnail each", _orv_thumbnail),
-             ("thumbnails-100-thumbnailer", "ffmpegthumbnailer each", _thumbnailer))
-    for name, peer, command in peers:
-        yield Comparison(name, quantities, here, _each_side(peer, place, command),
+    spread = [FILM_MILLIS * i // THUMBNAILS for i in range(THUMBNAILS)]
+    keys = list(itertools.islice(
+        itertools.cycle(range(0, FILM_MILLIS, KEY_FRAME_MILLIS)), THUMBNAILS))
+    rows = (("thumbnails-100", "ffmpeg each", _ffmpeg_picture, spread, None),
+            ("thumbnails-100-key-frames", "ffmpegthumbnailer each", _thumbnailer, keys,
+             Goal(0.04)))
+    for name, peer, command, times, goal in rows:
+        yield Comparison(name, (Quantity("time", "ms", goal), Quantity("cpu", "ms")),
+                         _together(place, times), _each(peer, place, command, times),
                          lambda: place.make_media(FILM))
 
 
-def _each_side(name, place, command):
+def _together(place, times):
+    program = place.java("com.quintora.mmp.Thumbnails", place.media(FILM), *map(str, times))
+    return Side(f"{THUMBNAILS} in a Java program", lambda: _share(
+        [run(program, environment=place.environment())], THUMBNAILS))
+
+
+def _each(name, place, command, times):
+    some = times[::THUMBNAILS // PROCESSES]
     def take():
         with tempfile.TemporaryDirectory() as folder:
             out = os.path.join(folder, "out.png")
-            times = itertools.islice(itertools.cycle(range(14)), PROCESSES)
-            return _share([run(command(place, FILM, at, out), environment=place.environment())
-                           for at in times], PROCESSES)
+            return _share([run(command(place, FILM, at / 1000, out),
+                               environment=place.environment()) for at in some], PROCESSES)
     return Side(name, take)
 
 

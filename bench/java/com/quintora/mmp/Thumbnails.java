@@ -1,18 +1,16 @@
 // SPDX-License-Identifier: Apache-2.0
 package com.quintora.mmp;
 
-/** Draws thumbnails of a film: a program with two arguments, the film and how many. */
+/** Draws thumbnails of a film: a program whose arguments are the film and times in milliseconds. */
 final class Thumbnails {
     private Thumbnails() {}
 
     public static void main(String[] arguments) throws Exception {
-        int count = Integer.parseInt(arguments[1]);
         try (OrvMediaPlayer player = new OrvMediaPlayer()) {
             player.setDataSource(arguments[0]);
             player.prepare();
-            int duration = player.getDuration();
-            for (int i = 0; i < count; i++) {
-                player.seekTo(duration * i / count);
+            for (int i = 1; i < arguments.length; i++) {
+                player.seekTo(Integer.parseInt(arguments[i]));
                 player.pictures().thumbnail(320, 180, ColorMode.XRGB8888).orElseThrow();
             }
         }
