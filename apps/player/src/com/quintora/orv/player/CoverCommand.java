@@ -4,22 +4,37 @@ package com.quintora.orv.player;
 import com.quintora.mmp.OrvMediaPlayer;
 import java.nio.file.Path;
 import java.util.concurrent.Callable;
-import picocli.CommandLine.Command;
-import picocli.CommandLine.Mixin;
-import picocli.CommandLine.Parameters;
+import picocli.CommandLine.Model.CommandSpec;
 
 /** Writes the picture inside a media file. */
-@Command(
-        name = "cover",
-        description = "Writes the picture inside a file, such as an album's cover, byte for byte.")
 final class CoverCommand implements Callable<Integer> {
-    @Parameters(paramLabel = "FILE", description = "A media file or URL; - for standard input.")
+    private final CommandSpec spec;
     private String source;
-
-    @Parameters(paramLabel = "OUT", description = "Where to write the picture; - for standard output.")
     private Path out;
 
-    @Mixin private CommonOptions common;
+    CoverCommand() {
+        var arguments =
+                Arguments.ofCommand(
+                        this,
+                        "cover",
+                        "Writes the picture inside a file, such as an album's cover, byte for"
+                                + " byte.");
+        arguments.add(
+                Arguments.parameter(0, String.class, value -> source = value)
+                        .paramLabel("FILE")
+                        .description("A media file or URL; - for standard input.")
+                        .build());
+        arguments.add(
+                Arguments.parameter(1, Path.class, value -> out = value)
+                        .paramLabel("OUT")
+                        .description("Where to write the picture; - for standard output.")
+                        .build());
+        spec = arguments.spec();
+    }
+
+    CommandSpec spec() {
+        return spec;
+    }
 
     @Override
     public Integer call() throws Failure {

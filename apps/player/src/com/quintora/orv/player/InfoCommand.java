@@ -5,26 +5,32 @@ import com.google.gson.GsonBuilder;
 import com.quintora.mmp.OrvMediaPlayer;
 import java.io.PrintWriter;
 import java.util.concurrent.Callable;
-import picocli.CommandLine.Command;
-import picocli.CommandLine.Mixin;
 import picocli.CommandLine.Model.CommandSpec;
-import picocli.CommandLine.Option;
-import picocli.CommandLine.Parameters;
-import picocli.CommandLine.Spec;
 
 /** Prints what media hold. */
-@Command(
-        name = "info",
-        description = "Prints the container, duration, tracks, chapters and metadata of media.")
 final class InfoCommand implements Callable<Integer> {
-    @Parameters(paramLabel = "FILE|URL", description = "A media file or URL; - for standard input.")
+    private final CommandSpec spec;
     private String source;
-
-    @Option(names = "--json", description = "For programs: one JSON object.")
     private boolean json;
 
-    @Mixin private CommonOptions common;
-    @Spec private CommandSpec spec;
+    InfoCommand() {
+        var arguments =
+                Arguments.ofCommand(
+                        this,
+                        "info",
+                        "Prints the container, duration, tracks, chapters and metadata of media.");
+        arguments.add(
+                Arguments.parameter(0, String.class, value -> source = value)
+                        .paramLabel("FILE|URL")
+                        .description("A media file or URL; - for standard input.")
+                        .build());
+        arguments.addFlag("--json", value -> json = value, "For programs: one JSON object.");
+        spec = arguments.spec();
+    }
+
+    CommandSpec spec() {
+        return spec;
+    }
 
     @Override
     public Integer call() throws Failure {

@@ -4,7 +4,7 @@ package com.quintora.orv.player;
 import java.io.PrintWriter;
 import java.util.List;
 import picocli.CommandLine;
-import picocli.CommandLine.Command;
+import picocli.CommandLine.Model.CommandSpec;
 import picocli.CommandLine.ParameterException;
 import picocli.CommandLine.TypeConversionException;
 import picocli.CommandLine.UnmatchedArgumentException;
@@ -13,7 +13,6 @@ import picocli.CommandLine.UnmatchedArgumentException;
  * The desktop player's commands. Exit status: 0 for success, 1 for a failure explained in one
  * sentence, 2 for wrong arguments, 130 after Ctrl-C.
  */
-@Command(name = "orv")
 public final class Main {
     private static final List<String> COMMANDS = List.of("play", "info", "thumbnail", "cover");
 
@@ -35,12 +34,12 @@ public final class Main {
         return true;
     }
 
-    /** What runs these arguments. Only their own command is read: all four take their time. */
+    /** What runs these arguments. Only their own command is described: all four take their time. */
     static CommandLine commandLine(String... arguments) {
-        CommandLine line = new CommandLine(new Main());
+        CommandLine line = new CommandLine(CommandSpec.create().name("orv"));
         boolean isNamed = arguments.length > 0 && COMMANDS.contains(arguments[0]);
         for (String name : isNamed ? List.of(arguments[0]) : COMMANDS) {
-            line.addSubcommand(name, command(name));
+            line.addSubcommand(name, new CommandLine(command(name)));
         }
         return line
                 // In one piece, for readers that close a pipe after the first lines.
@@ -53,12 +52,12 @@ public final class Main {
                 .setExecutionExceptionHandler(Main::tellFailure);
     }
 
-    private static Object command(String name) {
+    private static CommandSpec command(String name) {
         return switch (name) {
-            case "play" -> new PlayCommand();
-            case "info" -> new InfoCommand();
-            case "thumbnail" -> new ThumbnailCommand();
-            case "cover" -> new CoverCommand();
+            case "play" -> new PlayCommand().spec();
+            case "info" -> new InfoCommand().spec();
+            case "thumbnail" -> new ThumbnailCommand().spec();
+            case "cover" -> new CoverCommand().spec();
             default -> throw new IllegalArgumentException(name);
         };
     }

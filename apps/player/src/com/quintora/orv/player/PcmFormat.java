@@ -5,7 +5,6 @@ import com.quintora.mmp.util.PcmMediaInfo;
 import com.quintora.mmp.util.PcmMediaInfo.AudioPcmInfo;
 import java.util.regex.Matcher;
 import java.util.regex.Pattern;
-import picocli.CommandLine.ITypeConverter;
 import picocli.CommandLine.TypeConversionException;
 
 /** The description of raw PCM, written RATE:CHANNELS:FORMAT as in 44100:2:s16le. */
@@ -53,12 +52,5 @@ final class PcmFormat {
             case "f" -> AudioPcmInfo.FLOAT;
             default -> AudioPcmInfo.SIGNED;
         };
-    }
-
-    static final class Converter implements ITypeConverter<PcmMediaInfo> {
-        @Override
-        public PcmMediaInfo convert(String value) {
-            return parse(value);
-        }
     }
 }

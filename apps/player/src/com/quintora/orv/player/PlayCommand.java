@@ -6,22 +6,29 @@ import com.quintora.orv.player.terminal.Terminal;
 import com.quintora.orv.player.terminal.TerminalScreen;
 import com.quintora.orv.player.window.PlayerWindow;
 import java.util.concurrent.Callable;
-import picocli.CommandLine.Command;
-import picocli.CommandLine.Mixin;
 import picocli.CommandLine.Model.CommandSpec;
 import picocli.CommandLine.ParameterException;
-import picocli.CommandLine.Spec;
 
 /** Plays in a window, or in the terminal where there is no display. */
-@Command(
-        name = "play",
-        description = "Plays a file or URL: in a window, or in the terminal where there is no"
-                + " display.",
-        footer = "In the window, H lists the keyboard shortcuts.")
 final class PlayCommand implements Callable<Integer> {
-    @Mixin private CommonOptions common;
-    @Mixin private PlayOptions options;
-    @Spec private CommandSpec spec;
+    private final PlayOptions options = new PlayOptions();
+    private final CommandSpec spec;
+
+    PlayCommand() {
+        var arguments =
+                Arguments.ofCommand(
+                        this,
+                        "play",
+                        "Plays a file or URL: in a window, or in the terminal where there is no"
+                                + " display.");
+        options.addTo(arguments);
+        spec = arguments.spec();
+        spec.usageMessage().footer("In the window, H lists the keyboard shortcuts.");
+    }
+
+    CommandSpec spec() {
+        return spec;
+    }
 
     @Override
     public Integer call() throws Failure, InterruptedException {

@@ -14,7 +14,6 @@ import javax.sound.sampled.AudioFileFormat;
 import javax.sound.sampled.AudioFormat;
 import javax.sound.sampled.AudioInputStream;
 import javax.sound.sampled.AudioSystem;
-import picocli.CommandLine;
 
 /**
  * Runs each command once and shows nothing, for the virtual machine to archive the classes that
@@ -42,9 +41,7 @@ public final class Rehearsal {
         run("play", "--help");
         run("play", "--no-window", "--stats", media);
         if (PlayCommand.hasDisplay()) {
-            var options = new PlayOptions();
-            CommandLine.populateCommand(options, media);
-            PlayerWindow.rehearse(options);
+            PlayerWindow.rehearse(PlayOptions.of(media));
         }
         System.exit(0);
     }

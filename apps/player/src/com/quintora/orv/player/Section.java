@@ -1,7 +1,6 @@
 // SPDX-License-Identifier: Apache-2.0
 package com.quintora.orv.player;
 
-import picocli.CommandLine.ITypeConverter;
 import picocli.CommandLine.TypeConversionException;
 
 /** A section to repeat, in milliseconds: written A-B or, with plain seconds, A:B. */
@@ -23,12 +22,5 @@ record Section(int from, int to) {
                     "the section '" + text + "' ends before it begins");
         }
         return section;
-    }
-
-    static final class Converter implements ITypeConverter<Section> {
-        @Override
-        public Section convert(String value) {
-            return parse(value);
-        }
     }
 }

@@ -3,7 +3,6 @@ package com.quintora.orv.player;
 
 import java.util.regex.Matcher;
 import java.util.regex.Pattern;
-import picocli.CommandLine.ITypeConverter;
 import picocli.CommandLine.TypeConversionException;
 
 /** A picture's size in pixels, written WxH. */
@@ -20,12 +19,5 @@ record Size(int width, int height) {
             throw new TypeConversionException("a picture of " + text + " has no pixels");
         }
         return size;
-    }
-
-    static final class Converter implements ITypeConverter<Size> {
-        @Override
-        public Size convert(String value) {
-            return parse(value);
-        }
     }
 }

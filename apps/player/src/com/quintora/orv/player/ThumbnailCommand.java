@@ -20,44 +20,54 @@ import java.util.List;
 import java.util.Optional;
 import java.util.concurrent.Callable;
 import javax.imageio.ImageIO;
-import picocli.CommandLine.Command;
-import picocli.CommandLine.Mixin;
 import picocli.CommandLine.Model.CommandSpec;
-import picocli.CommandLine.Option;
 import picocli.CommandLine.ParameterException;
-import picocli.CommandLine.Parameters;
-import picocli.CommandLine.Spec;
 
 /** Writes one picture of a video. */
-@Command(
-        name = "thumbnail",
-        description = "Writes one picture of a video as a PNG file.")
 final class ThumbnailCommand implements Callable<Integer> {
     private static final int USUAL_HEIGHT = 180;
 
-    @Parameters(paramLabel = "FILE", description = "A media file or URL; - for standard input.")
+    private final CommandSpec spec;
     private String source;
-
-    @Parameters(paramLabel = "OUT.png", description = "Where to write the picture; - for standard output.")
     private Path out;
-
-    @Option(
-            names = "--at",
-            paramLabel = "TIME",
-            defaultValue = "0",
-            converter = Times.Converter.class,
-            description = "Of which moment: seconds, or h:mm:ss.")
     private int at;
-
-    @Option(
-            names = "--size",
-            paramLabel = "WxH",
-            converter = Size.Converter.class,
-            description = "How large, at most 8192x255; without it, 180 rows in the video's shape.")
     private Size size;
 
-    @Mixin private CommonOptions common;
-    @Spec private CommandSpec spec;
+    ThumbnailCommand() {
+        var arguments =
+                Arguments.ofCommand(
+                        this, "thumbnail", "Writes one picture of a video as a PNG file.");
+        arguments.add(
+                Arguments.parameter(0, String.class, value -> source = value)
+                        .paramLabel("FILE")
+                        .description("A media file or URL; - for standard input.")
+                        .build());
+        arguments.add(
+                Arguments.parameter(1, Path.class, value -> out = value)
+                        .paramLabel("OUT.png")
+                        .description("Where to write the picture; - for standard output.")
+                        .build());
+        arguments.add(
+                Arguments.option("--at", int.class, value -> at = value)
+                        .paramLabel("TIME")
+                        .defaultValue("0")
+                        .converters(Times::parseMillis)
+                        .description("Of which moment: seconds, or h:mm:ss.")
+                        .build());
+        arguments.add(
+                Arguments.option("--size", Size.class, value -> size = value)
+                        .paramLabel("WxH")
+                        .converters(Size::parse)
+                        .description(
+                                "How large, at most 8192x255; without it, 180 rows in the video's"
+                                        + " shape.")
+                        .build());
+        spec = arguments.spec();
+    }
+
+    CommandSpec spec() {
+        return spec;
+    }
 
     @Override
     public Integer call() throws Failure {

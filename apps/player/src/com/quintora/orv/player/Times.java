@@ -3,7 +3,6 @@ package com.quintora.orv.player;
 
 import java.util.regex.Matcher;
 import java.util.regex.Pattern;
-import picocli.CommandLine.ITypeConverter;
 import picocli.CommandLine.TypeConversionException;
 
 /** Times of media as people write them: seconds, or [h:]mm:ss with an optional fraction. */
@@ -46,13 +45,5 @@ public final class Times {
 
     private static int number(String group) {
         return group == null ? 0 : Integer.parseInt(group);
-    }
-
-    /** For options that take a time; gives milliseconds. */
-    public static final class Converter implements ITypeConverter<Integer> {
-        @Override
-        public Integer convert(String value) {
-            return parseMillis(value);
-        }
     }
 }

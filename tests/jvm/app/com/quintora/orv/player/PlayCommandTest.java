@@ -14,7 +14,6 @@ import org.junit.jupiter.api.Test;
 import org.junit.jupiter.api.io.TempDir;
 import org.junit.jupiter.params.ParameterizedTest;
 import org.junit.jupiter.params.provider.CsvSource;
-import picocli.CommandLine;
 
 /** Playing in the terminal, with its options, to the end of the media. */
 class PlayCommandTest {
@@ -63,8 +62,7 @@ class PlayCommandTest {
 
     @Test
     void backwardBeginsAtTheEnd() throws Exception {
-        PlayOptions options = new PlayOptions();
-        new CommandLine(options).parseArgs("--speed", "-1", Media.path("short.mp4"));
+        PlayOptions options = PlayOptions.of("--speed", "-1", Media.path("short.mp4"));
         try (Session session = new Session(options, image -> {})) {
             session.open();
             assertTrue(session.player().getCurrentPosition() >= 1_900);

@@ -7,7 +7,6 @@ import static org.junit.jupiter.api.Assertions.assertTrue;
 import com.quintora.mmp.Media;
 import com.quintora.mmp.Wait;
 import org.junit.jupiter.api.Test;
-import picocli.CommandLine;
 
 /** Media, and sections of them, that play again and again. */
 class RepeatTest {
@@ -44,8 +43,7 @@ class RepeatTest {
 
     private static Session open(String... arguments) throws Exception {
         arguments[0] = Media.path(arguments[0]);
-        PlayOptions options = new PlayOptions();
-        new CommandLine(options).parseArgs(arguments);
+        PlayOptions options = PlayOptions.of(arguments);
         Session session = new Session(options, image -> {});
         session.open();
         return session;

@@ -15,7 +15,6 @@ import java.util.concurrent.atomic.AtomicLong;
 import org.junit.jupiter.api.Test;
 import org.junit.jupiter.params.ParameterizedTest;
 import org.junit.jupiter.params.provider.CsvSource;
-import picocli.CommandLine;
 
 /** Where seeks and steps of a session end, what shows then, and who waits for them. */
 class SessionSeekTest {
@@ -135,11 +134,10 @@ class SessionSeekTest {
     }
 
     private Session openUrl(String source, String... arguments) throws Exception {
-        PlayOptions options = new PlayOptions();
         String[] all = new String[arguments.length + 1];
         System.arraycopy(arguments, 0, all, 1, arguments.length);
         all[0] = source;
-        new CommandLine(options).parseArgs(all);
+        PlayOptions options = PlayOptions.of(all);
         Session session = new Session(options, image -> shownNs.set(image.getTimestamp()));
         session.open();
         return session;

@@ -18,7 +18,6 @@ import javax.swing.plaf.ComponentUI;
 import javax.swing.plaf.basic.BasicRootPaneUI;
 import org.junit.jupiter.api.AfterEach;
 import org.junit.jupiter.api.Test;
-import picocli.CommandLine;
 
 /** A window that cannot be opened although there is a display. */
 class BrokenWindowTest {
@@ -42,8 +41,7 @@ class BrokenWindowTest {
     @Test
     void itEndsThePlaybackInASentence() throws Exception {
         UIManager.put("RootPaneUI", TornCanvas.class.getName());
-        PlayOptions options = new PlayOptions();
-        new CommandLine(options).parseArgs(Media.path("short.mp4"));
+        PlayOptions options = PlayOptions.of(Media.path("short.mp4"));
         FutureTask<Integer> playing = new FutureTask<>(() -> PlayerWindow.play(options));
         new Thread(playing, "main").start();
         var thrown =

@@ -14,7 +14,6 @@ import javax.swing.SwingUtilities;
 import org.junit.jupiter.api.AfterEach;
 import org.junit.jupiter.api.BeforeEach;
 import org.junit.jupiter.api.Test;
-import picocli.CommandLine;
 
 /** What becomes of the player's refusals. */
 class ConductorWindowTest {
@@ -24,8 +23,7 @@ class ConductorWindowTest {
 
     @BeforeEach
     void open() throws Exception {
-        PlayOptions options = new PlayOptions();
-        new CommandLine(options).parseArgs(Media.path("short.mp4"));
+        PlayOptions options = PlayOptions.of(Media.path("short.mp4"));
         session = new Session(options, stage::draw);
         conductor = new Conductor(session, stage, options);
         SwingUtilities.invokeAndWait(() -> stage.open(conductor, () -> {}));

@@ -21,7 +21,6 @@ import javax.swing.JLabel;
 import javax.swing.KeyStroke;
 import javax.swing.SwingUtilities;
 import org.junit.jupiter.api.AfterEach;
-import picocli.CommandLine;
 
 /** A window, on a display, that plays real media; its test ends by closing it. */
 abstract class WindowFixture {
@@ -46,10 +45,10 @@ abstract class WindowFixture {
 
     /** Of a path or a URL. */
     final void openSource(String source, String... options) throws Exception {
-        PlayOptions parsed = new PlayOptions();
-        CommandLine parser = new CommandLine(parsed);
-        parser.parseArgs(
-                Stream.concat(Stream.of(options), Stream.of(source)).toArray(String[]::new));
+        PlayOptions parsed =
+                PlayOptions.of(
+                        Stream.concat(Stream.of(options), Stream.of(source))
+                                .toArray(String[]::new));
         playing = new FutureTask<>(() -> PlayerWindow.play(parsed));
         new Thread(playing, "main").start();
         Wait.until("the window is open", () -> openFrame() != null);
