@@ -44,6 +44,21 @@ for command in "info $ORV_MEDIA/tracks.mkv" "info --json $ORV_MEDIA/tone.flac" \
     [ "$(grep -c . <<<"$outside")" -le 3 ] || fail "${words[0]}: not archived: $outside"
 done
 
+# The native libraries are loaded by a thread of their own, the log's sixth word. Help needs none.
+ORV_LOG=verbose "${java[@]}" "${jar[@]}" info "$ORV_MEDIA/short.mp4" >"$folder/log" 2>&1 || fail "info"
+thread_of() { grep -a -m 1 -F "$1" "$folder/log" | cut -d' ' -f6; }
+[ -n "$(thread_of 'JNI_OnLoad()')" ] || fail "no log of the native libraries"
+[ "$(thread_of 'JNI_OnLoad()')" != "$(thread_of '_setup(): Enter')" ] ||
+    fail "the native libraries are loaded while nothing else is done"
+ORV_LOG=verbose "${java[@]}" "${jar[@]}" info --help >"$folder/log" 2>&1 || fail "info --help"
+[ -z "$(thread_of 'JNI_OnLoad()')" ] || fail "help loads the native libraries"
+
+# What they lack is said as if they were loaded by whom they are for.
+! "${java[@]/#-Djava.library.path=*/-Djava.library.path=$folder}" "${jar[@]}" \
+    info "$ORV_MEDIA/short.mp4" >"$folder/log" 2>&1 || fail "no library: exit status 0"
+grep -q "UnsatisfiedLinkError: the player's native library .* did not load" "$folder/log" ||
+    fail "no library: $(head -n 3 "$folder/log")"
+
 # Nobody may be asked now.
 mkdir "$folder/bin"
 for tool in dpkg-query cmake ninja; do

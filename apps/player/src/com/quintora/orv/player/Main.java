@@ -19,10 +19,20 @@ public final class Main {
     private Main() {}
 
     public static void main(String[] arguments) {
+        if (needsPlayer(arguments)) {
+            NativeHalf.beginLoading();
+        }
         CommandLine commands = commandLine(arguments);
         int status = commands.execute(arguments);
         commands.getOut().flush();
+        NativeHalf.endLoading();
         System.exit(status == 0 && outputIsLost() ? CommandLine.ExitCode.SOFTWARE : status);
+    }
+
+    // Before they are read: a wrong guess costs time, no more.
+    private static boolean needsPlayer(String... arguments) {
+        List<String> words = List.of(arguments);
+        return words.size() > 1 && !words.contains("--help") && !words.contains("-h");
     }
 
     // Streams of characters swallow what goes wrong, such as a full disk.

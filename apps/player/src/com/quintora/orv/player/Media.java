@@ -11,7 +11,7 @@ final class Media {
     /** Gives a prepared player, which the caller closes. Blocks until the media is open, and before
      * that until a pipe has been read to its end. */
     static OrvMediaPlayer open(String source) throws Failure {
-        OrvMediaPlayer player = new OrvMediaPlayer();
+        OrvMediaPlayer player = NativeHalf.newPlayer();
         try {
             if (StandardInput.isPipe(source)) {
                 player.setDataSource(StandardInput.kept(source));

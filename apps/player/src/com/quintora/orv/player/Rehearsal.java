@@ -33,6 +33,7 @@ public final class Rehearsal {
         String sound = makeSound(folder.resolve("rehearsal.wav")).toString();
         System.setOut(new PrintStream(OutputStream.nullOutputStream()));
         System.setErr(System.out);
+        NativeHalf.beginLoading();
         run("info", media);
         run("info", "--json", media);
         run("info", sound);

@@ -22,7 +22,7 @@ import java.util.function.Consumer;
  */
 public final class Session implements AutoCloseable {
     private final PlayOptions options;
-    private final OrvMediaPlayer player = new OrvMediaPlayer();
+    private final OrvMediaPlayer player = NativeHalf.newPlayer();
     private final FramePump frames;
     private final Playhead playhead;
     private final CountDownLatch ended = new CountDownLatch(1);
