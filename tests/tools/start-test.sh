@@ -59,6 +59,25 @@ ORV_LOG=verbose "${java[@]}" "${jar[@]}" info --help >"$folder/log" 2>&1 || fail
 grep -q "UnsatisfiedLinkError: the player's native library .* did not load" "$folder/log" ||
     fail "no library: $(head -n 3 "$folder/log")"
 
+# Where no archive can be made, only the first start of a build tries. It needs no Java
+# for anything else.
+archive=$(sed -n 's/^-XX:SharedArchiveFile=//p' "$folder/command")
+rm -f -- "$archive"
+JDK_JAVA_OPTIONS=-XX:+NoSuchOption prepare >/dev/null || fail "a start without an archive"
+[ ! -e "$archive" ] || fail "the planted failure is none"
+grep -q "classes could not be archived" "$ORV_BUILD/log/class-archive.log" ||
+    fail "no word in the log: $(cat "$ORV_BUILD/log/class-archive.log")"
+prepare >/dev/null || fail "a second start without an archive"
+[ ! -e "$archive" ] || fail "each start tries again"
+touch "$ORV_BUILD/java/orv_player.jar"
+prepare >/dev/null || fail "a start after a build"
+[ -s "$archive" ] || fail "a build does not try again"
+[ ! -e "$archive.failed" ] || fail "the mark of an earlier build stays"
+
+# The jar names the libraries that it needs: it is made anew with that list.
+ninja -C "$ORV_BUILD" -t query java/orv_player.jar | grep -q 'player/manifest\.txt$' ||
+    fail "a new list of libraries does not reach the jar"
+
 # Nobody may be asked now.
 mkdir "$folder/bin"
 for tool in dpkg-query cmake ninja; do

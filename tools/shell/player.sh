@@ -40,29 +40,36 @@ set_java_command() {
         -jar "$jars/orv_player.jar")
 }
 
-# Made by a run of all commands that shows nothing; without an archive the player
-# starts, too.
+# Made by a run of all commands that shows nothing. Without an archive the player
+# starts, too, only slower: where making it fails, it is left at that for this build.
 archive_classes() {
-    archive_is_current && return
-    rm -f -- "${CLASS_ARCHIVE%-*-*}"-*.jsa
-    local draft=$CLASS_ARCHIVE.$$ folder
+    local failed=$CLASS_ARCHIVE.failed
+    { is_of_this_build "$CLASS_ARCHIVE" || is_of_this_build "$failed"; } && return
+    rm -f -- "${CLASS_ARCHIVE%-*-*}"-*.jsa{,.failed}
+    local draft=$CLASS_ARCHIVE.$$ log=$ORV_BUILD/log/class-archive.log folder status=0
+    mkdir -p -- "${log%/*}"
     folder=$(mktemp -d)
     # shellcheck disable=SC2064
     trap "rm -rf -- ${draft@Q} ${folder@Q}" EXIT
     local command=("${JAVA_COMMAND[@]/#-XX:SharedArchiveFile=*/-XX:ArchiveClassesAtExit=$draft}")
     command[-2]=-cp
-    if ORV_LOG=silent timeout 60 "${command[@]}" com.quintora.orv.player.Rehearsal "$folder" \
-        >/dev/null 2>&1 </dev/null; then
-        mv -f -- "$draft" "$CLASS_ARCHIVE"
+    ORV_LOG=silent timeout -k 5 60 "${command[@]}" com.quintora.orv.player.Rehearsal "$folder" \
+        >"$log" 2>&1 </dev/null || status=$?
+    if [ $status -ne 0 ] || ! mv -f -- "$draft" "$CLASS_ARCHIVE" 2>>"$log"; then
+        echo "The player's classes could not be archived (exit status $status, 124 and 137 for" \
+            "more than a minute); until the next build it starts without." >>"$log"
+        : >"$failed"
     fi
     rm -rf -- "$draft" "$folder"
     trap - EXIT
 }
 
-archive_is_current() {
-    local jar
-    for jar in "$ORV_BUILD"/java/{orv_player,mediaplayer_orv_java,orv_platform_java}.jar; do
-        [ "$CLASS_ARCHIVE" -nt "$jar" ] || return
+# is_of_this_build FILE: whether it was made after what an archive depends on.
+is_of_this_build() {
+    local part
+    for part in "$ORV_BUILD"/java/{orv_player,mediaplayer_orv_java,orv_platform_java}.jar \
+        "$ORV_ROOT/tools/shell/player.sh"; do
+        [ "$1" -nt "$part" ] || return
     done
 }
 
