@@ -1,6 +1,7 @@
 // SPDX-License-Identifier: Apache-2.0
 package com.quintora.orv.player;
 
+import com.quintora.orv.player.window.PlayerWindow;
 import java.io.PrintWriter;
 import java.util.List;
 import picocli.CommandLine;
@@ -20,6 +21,9 @@ public final class Main {
 
     public static void main(String[] arguments) {
         if (needsPlayer(arguments)) {
+            if (PlayCommand.needsWindow(arguments)) {
+                PlayerWindow.begin();
+            }
             NativeHalf.beginLoading();
         }
         CommandLine commands = commandLine(arguments);

@@ -5,6 +5,7 @@ import com.quintora.mmp.TrickPlay;
 import com.quintora.orv.player.terminal.Terminal;
 import com.quintora.orv.player.terminal.TerminalScreen;
 import com.quintora.orv.player.window.PlayerWindow;
+import java.util.List;
 import java.util.concurrent.Callable;
 import picocli.CommandLine.Model.CommandSpec;
 import picocli.CommandLine.ParameterException;
@@ -96,6 +97,12 @@ final class PlayCommand implements Callable<Integer> {
         if (options.stats) {
             terminal.line(session.report());
         }
+    }
+
+    /** Whether these arguments, which nobody has read yet, look as if there will be a window. */
+    static boolean needsWindow(String... arguments) {
+        List<String> words = List.of(arguments);
+        return words.get(0).equals("play") && !words.contains("--no-window") && hasDisplay();
     }
 
     // Without asking AWT, which takes longer to load than the rest of the program. It draws on

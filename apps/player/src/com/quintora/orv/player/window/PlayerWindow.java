@@ -8,7 +8,6 @@ import com.quintora.orv.player.Session;
 import java.awt.AWTError;
 import java.awt.EventQueue;
 import java.awt.HeadlessException;
-import java.awt.Toolkit;
 import java.lang.reflect.InvocationTargetException;
 import java.util.concurrent.CompletableFuture;
 import java.util.concurrent.ExecutionException;
@@ -16,6 +15,11 @@ import java.util.concurrent.ExecutionException;
 /** Plays in a window until it is closed. */
 public final class PlayerWindow {
     private PlayerWindow() {}
+
+    /** Begins what any window needs, for one that is going to be opened; returns at once. */
+    public static void begin() {
+        Desktop.begin();
+    }
 
     /**
      * Returns the exit status: 0, or 1 when the media could not be played.
@@ -58,7 +62,7 @@ public final class PlayerWindow {
 
     private static Stage makeStage(String title) throws Failure {
         try {
-            Toolkit.getDefaultToolkit().getScreenSize();
+            Desktop.await();
             return new Stage(title);
         } catch (AWTError | HeadlessException e) {
             throw noWindow("on display " + System.getenv("DISPLAY"), e);
