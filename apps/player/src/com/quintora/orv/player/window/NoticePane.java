@@ -55,16 +55,24 @@ final class NoticePane extends JPanel {
         return notice.isEmpty() ? lasting : notice;
     }
 
+    boolean hasWords() {
+        return !words().isEmpty();
+    }
+
     /** A new frame is painted from here on, or it would cover the words. */
     @Override
     protected boolean isPaintingOrigin() {
-        return true;
+        return hasWords();
     }
+
+    /** What is shown covers all of it. */
+    @Override
+    protected void paintComponent(Graphics graphics) {}
 
     @Override
     public void paint(Graphics graphics) {
         super.paint(graphics);
-        if (!words().isEmpty()) {
+        if (hasWords()) {
             paintWords(graphics, words());
         }
     }

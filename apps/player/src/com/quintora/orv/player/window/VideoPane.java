@@ -12,6 +12,8 @@ import java.awt.geom.Rectangle2D;
 import java.awt.image.BufferedImage;
 import java.awt.image.DataBufferInt;
 import java.nio.ByteBuffer;
+import java.util.concurrent.atomic.AtomicBoolean;
+import java.util.concurrent.atomic.AtomicLong;
 import javax.swing.JPanel;
 
 /**
@@ -24,8 +26,15 @@ final class VideoPane extends JPanel {
     private BufferedImage front;
     private BufferedImage back;
 
+    private final AtomicBoolean awaitsPainting = new AtomicBoolean();
     private final Runnable onRoomChanged;
     private Dimension room = new Dimension();
+    private final AtomicLong copies = new AtomicLong();
+    private long paintings;
+    private long scalings;
+
+    /** How often a frame was copied, the picture painted, and of those painted in another size. */
+    record Work(long copies, long paintings, long scalings) {}
 
     /** Calls back when there is more or less room than before, on the window's thread. */
     VideoPane(Runnable onRoomChanged) {
@@ -48,6 +57,7 @@ final class VideoPane extends JPanel {
         for (int y = 0; y < height; y++) {
             source.get(y * (stride / 4), target, y * width, width);
         }
+        copies.incrementAndGet();
         draw(back);
     }
 
@@ -57,7 +67,34 @@ final class VideoPane extends JPanel {
             back = front;
             front = picture;
         }
-        repaint();
+        if (!awaitsPainting.getAndSet(true)) {
+            EventQueue.invokeLater(this::paintNewest);
+        }
+    }
+
+    /** Straight onto the screen, if nothing lies over it: there is nothing to flicker. */
+    private void paintNewest() {
+        awaitsPainting.set(false);
+        if (!isShowing()) {
+            return; // It is painted when it shows again.
+        }
+        if (Covering.isOver(this)) {
+            repaint();
+            return;
+        }
+        // Asking for it also ends that Swing keeps the window's content to put it back where
+        // the window was covered: that would be an older picture.
+        Graphics graphics = getGraphics();
+        if (graphics != null) {
+            paintComponent(graphics);
+            graphics.dispose();
+            getToolkit().sync();
+        }
+    }
+
+    /** What was done since the pane was made; on the window's thread. */
+    Work work() {
+        return new Work(copies.get(), paintings, scalings);
     }
 
     @Override
@@ -85,8 +122,6 @@ final class VideoPane extends JPanel {
         Graphics2D g = (Graphics2D) graphics.create();
         Rectangle pixels = pixelsOf(g.getTransform());
         g.setTransform(new AffineTransform());
-        g.setColor(Theme.STAGE);
-        g.fill(pixels);
         synchronized (lock) {
             paintFrame(g, pixels);
         }
@@ -112,14 +147,35 @@ final class VideoPane extends JPanel {
     }
 
     private void paintFrame(Graphics2D g, Rectangle pixels) {
+        g.setColor(Theme.STAGE);
         if (front == null || pixels.isEmpty()) {
+            g.fill(pixels);
             return;
         }
         Rectangle place = fit(front.getWidth(), front.getHeight(), pixels.width, pixels.height);
+        place.translate(pixels.x, pixels.y);
+        fillAround(g, pixels, place);
+        paintings++;
+        if (place.width == front.getWidth() && place.height == front.getHeight()) {
+            g.drawImage(front, place.x, place.y, null);
+            return;
+        }
+        scalings++;
         g.setRenderingHint(
                 RenderingHints.KEY_INTERPOLATION, RenderingHints.VALUE_INTERPOLATION_BILINEAR);
-        g.drawImage(
-                front, pixels.x + place.x, pixels.y + place.y, place.width, place.height, null);
+        g.drawImage(front, place.x, place.y, place.width, place.height, null);
+    }
+
+    // Nothing is painted twice, which would flicker.
+    private static void fillAround(Graphics2D g, Rectangle whole, Rectangle inner) {
+        int above = inner.y - whole.y;
+        int left = inner.x - whole.x;
+        int below = whole.height - above - inner.height;
+        int right = whole.width - left - inner.width;
+        g.fillRect(whole.x, whole.y, whole.width, above);
+        g.fillRect(whole.x, inner.y + inner.height, whole.width, below);
+        g.fillRect(whole.x, inner.y, left, inner.height);
+        g.fillRect(inner.x + inner.width, inner.y, right, inner.height);
     }
 
     /** The largest centred place of those proportions in a room. */

@@ -7,6 +7,7 @@ import java.awt.Dimension;
 import java.awt.Graphics2D;
 import java.awt.Rectangle;
 import java.awt.image.BufferedImage;
+import java.nio.ByteBuffer;
 import java.util.concurrent.atomic.AtomicInteger;
 import javax.swing.SwingUtilities;
 import org.junit.jupiter.api.Test;
@@ -75,6 +76,34 @@ class PictureWindowTest {
         paint(2, 0, 0);
         assertEquals(2, changes.get());
         assertEquals(new Dimension(640, 360), pane.room());
+    }
+
+    @Test
+    void aFrameIsCopiedOnceHoweverOftenItIsPainted() throws Exception {
+        pane.setSize(64, 36);
+        for (int frame = 1; frame <= 3; frame++) {
+            pane.draw(ByteBuffer.allocateDirect(256 * 36), 64, 36, 256);
+            paint(1, 0, 0);
+            paint(1, 0, 0);
+            assertEquals(new VideoPane.Work(frame, 2 * frame, 0), work());
+        }
+    }
+
+    @Test
+    void onlyAFrameOfAnotherSizeIsScaled() throws Exception {
+        pane.setSize(64, 36);
+        pane.draw(checkered(64, 36));
+        paint(1, 0, 0);
+        assertEquals(new VideoPane.Work(0, 1, 0), work());
+        paint(2, 0, 0);
+        assertEquals(new VideoPane.Work(0, 2, 1), work());
+        pane.draw(checkered(128, 72));
+        paint(2, 0, 0);
+        assertEquals(new VideoPane.Work(0, 3, 1), work());
+    }
+
+    private VideoPane.Work work() throws Exception {
+        return WindowFixture.onWindow(pane::work);
     }
 
     private static BufferedImage checkered(int width, int height) {
