@@ -26,9 +26,11 @@ final class FlatButton extends JButton {
     }
 
     void show(Glyph glyph, String tip) {
-        this.glyph = glyph;
+        if (glyph != this.glyph) {
+            this.glyph = glyph;
+            repaint();
+        }
         describe(tip);
-        repaint();
     }
 
     private void describe(String tip) {

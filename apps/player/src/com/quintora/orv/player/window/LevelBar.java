@@ -60,14 +60,24 @@ class LevelBar extends JComponent {
         if (!dragged) {
             changeLevel(clamp(level));
         }
-        this.behind = clamp(behind);
-        repaint();
+        changeBehind(clamp(behind));
+    }
+
+    private void changeBehind(double behind) {
+        boolean isSeen = widthOf(behind) != widthOf(this.behind);
+        this.behind = behind;
+        if (isSeen) {
+            repaint();
+        }
     }
 
     private void changeLevel(double level) {
         int before = value();
+        boolean isSeen = widthOf(level) != widthOf(this.level);
         this.level = level;
-        repaint();
+        if (isSeen) {
+            repaint();
+        }
         if (value() != before) {
             getAccessibleContext()
                     .firePropertyChange(
@@ -116,7 +126,7 @@ class LevelBar extends JComponent {
         paintMarks(g);
         if (isEnabled() && (hovered || dragged || isFocusOwner())) {
             g.setColor(Theme.TEXT);
-            g.fillOval((int) (xOf(level) - KNOB / 2.0), (getHeight() - KNOB) / 2, KNOB, KNOB);
+            g.fillOval(lengthOf(level), (getHeight() - KNOB) / 2, KNOB, KNOB);
         }
         Theme.paintFocus(g, this);
         g.dispose();
@@ -131,9 +141,17 @@ class LevelBar extends JComponent {
         }
         g.setColor(color);
         int left = KNOB / 2 - THICKNESS / 2;
-        int width = (int) Math.round(end * (getWidth() - KNOB)) + THICKNESS;
         g.fillRoundRect(
-                left, (getHeight() - THICKNESS) / 2, width, THICKNESS, THICKNESS, THICKNESS);
+                left, (getHeight() - THICKNESS) / 2, widthOf(end), THICKNESS, THICKNESS, THICKNESS);
+    }
+
+    /** In pixels of the window; 0 for an empty bar. */
+    private int widthOf(double end) {
+        return end <= 0 ? 0 : lengthOf(end) + THICKNESS;
+    }
+
+    private int lengthOf(double level) {
+        return (int) Math.round(level * (getWidth() - KNOB));
     }
 
     private static double clamp(double value) {

@@ -41,7 +41,10 @@ final class SeekBar extends LevelBar {
     }
 
     void showPosition(int positionMs, int durationMs, int bufferedPercent) {
-        this.durationMs = durationMs;
+        if (durationMs != this.durationMs) {
+            this.durationMs = durationMs;
+            repaint(); // The marks move.
+        }
         setEnabled(durationMs > 0);
         showLevel(
                 durationMs > 0 ? (double) positionMs / durationMs : 0, bufferedPercent / 100.0);
