@@ -6,6 +6,7 @@ import com.quintora.mmp.ChannelStreamSource;
 import com.quintora.mmp.MediaException;
 import com.quintora.mmp.OrvMediaPlayer;
 import com.quintora.mmp.PlayerListener;
+import com.quintora.mmp.PlayerRole;
 import com.quintora.mmp.VideoTrack;
 import java.io.IOException;
 import java.nio.file.AccessDeniedException;
@@ -45,6 +46,12 @@ public final class Session implements AutoCloseable {
     /** Asks for frames of that size from now on; 0 x 0 for the video's own. */
     public void requestFrameSize(int width, int height) {
         frames.reader().setDefaultSize(width, height);
+    }
+
+    /** Whether anybody sees the frames: otherwise none is drawn, and afterwards the newest is. */
+    public void setWatched(boolean watched) {
+        frames.expectJump();
+        player.engine().setRole(watched ? PlayerRole.MAIN : PlayerRole.BACKGROUND);
     }
 
     /** Opens the media and brings it to where it shall begin. */

@@ -228,6 +228,11 @@ final class Conductor implements Controls {
         session.requestFrameSize(width, height);
     }
 
+    /** Whether the window is seen. */
+    void setWatched(boolean watched) {
+        soon(() -> session.setWatched(watched));
+    }
+
     private void tell(String words) {
         EventQueue.invokeLater(() -> stage.tell(words));
     }

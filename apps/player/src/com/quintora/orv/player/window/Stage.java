@@ -247,6 +247,16 @@ final class Stage {
                     public void windowClosing(WindowEvent event) {
                         close();
                     }
+
+                    @Override
+                    public void windowIconified(WindowEvent event) {
+                        conductor.setWatched(false);
+                    }
+
+                    @Override
+                    public void windowDeiconified(WindowEvent event) {
+                        conductor.setWatched(true);
+                    }
                 });
         room.addMouseListener(
                 new MouseAdapter() {
