@@ -270,7 +270,7 @@ TEST_P(PositionTest, StaysWhenTheDirectionTurns) {
     expectAt(media, number);
 }
 
-INSTANTIATE_TEST_SUITE_P(Media, PositionTest, testing::Values(kSixty, kFilm, kTransport),
+INSTANTIATE_TEST_SUITE_P(Media, PositionTest, testing::Values(kSixty, kSound, kFilm, kTransport),
                          [](const auto& info) { return testName(info.param.file); });
 
 }  // namespace

@@ -17,7 +17,8 @@ using android::status_t;
 // mpv does not report a step's end: it is asked.
 constexpr std::chrono::milliseconds kPollInterval{2};
 constexpr std::chrono::seconds kStepLimit{5};
-// A seek takes about as long as this many steps.
+// A seek takes about as long as this many steps forward. mpv's step back is a longer
+// seek: it decodes from further ahead.
 constexpr int kFewestToJump = 4;
 
 }  // namespace
@@ -40,7 +41,7 @@ bool Stepper::step(int amount) {
 }
 
 bool Stepper::move(int amount) {
-    if (abs(amount) >= kFewestToJump) {
+    if (amount < 0 || amount >= kFewestToJump) {
         const double now = mMpv.getDouble("time-pos").value_or(0);
         std::optional<FrameAt> target = mFrameFrom(now, amount);
         if (!target) target = frameByRate(now, amount);
