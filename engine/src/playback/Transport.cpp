@@ -2,6 +2,7 @@
 #include "playback/Transport.h"
 
 #include <algorithm>
+#include <optional>
 
 #include "base/EngineLog.h"
 #include "base/Milliseconds.h"
@@ -59,10 +60,21 @@ status_t Transport::pause() {
         if (phase == Phase::Started) v.phase = Phase::Paused;
         return phase;
     });
-    if (before == Phase::Started) mMpv.set("pause", true);
+    if (before == Phase::Started) {
+        mMpv.set("pause", true);
+        keepPosition();
+    }
     const bool allowed =
         before == Phase::Started || before == Phase::Paused || before == Phase::Completed;
     return allowed ? android::NO_ERROR : PlayerState::wrongPhase("pause", before);
+}
+
+// The report of the frame that is shown may still be on its way.
+void Transport::keepPosition() {
+    const std::optional<double> now = mMpv.getDouble("time-pos");
+    mState.update([now](PlayerState::Values& v) {
+        if (now && v.phase == Phase::Paused && !v.seeking) v.position = std::max(*now, 0.0);
+    });
 }
 
 void Transport::setTrick(bool coreHeld, bool backward) {

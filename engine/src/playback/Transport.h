@@ -44,6 +44,7 @@ public:
 
 private:
     void applyPause();
+    void keepPosition();
     android::status_t getSize(const char* operation, int PlayerState::Values::* member,
                               int* pixels) const;
 

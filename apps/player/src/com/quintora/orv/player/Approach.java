@@ -6,9 +6,9 @@ import com.quintora.mmp.PlayerState;
 import com.quintora.mmp.VideoTrack;
 
 /**
- * The way from the key frame, at which a seek ends, to the frame that is shown at the time that was
- * asked for: its own time is not after that, the next frame's is. Times are in milliseconds. For
- * one thread at a time.
+ * The way to the frame that is shown at a time: its own time is not after that, the next frame's
+ * is. It leads from the frame that is shown now where that is near, otherwise from the key frame at
+ * which a seek ends. Times are in milliseconds. For one thread at a time.
  */
 final class Approach {
     /** What is moved; it rests meanwhile. */
@@ -24,6 +24,9 @@ final class Approach {
 
         /** The time of the frame that is shown. */
         int position();
+
+        /** Whether it is that of a frame, as after the end of the media it is not. */
+        boolean isAtFrame();
     }
 
     private enum Pace {
@@ -38,8 +41,15 @@ final class Approach {
     // Rates are rounded, too.
     private static final double RATE_PRECISION = 1e-4;
 
+    // In frames: a whole number of them is one.
+    private static final double COUNT_PRECISION = 0.01;
+
     // For pictures of which nobody knows how often they come.
     private static final double USUAL_RATE = 25;
+
+    // A step over all frames on the way is one exact seek, but their packets are counted: as
+    // many as are just behind or ahead of what plays, and so have been read.
+    private static final int NEAR_MS = 15_000;
 
     // Far more than any way needs; none shall go on for ever.
     private static final int MOST_STEPS = 60;
@@ -66,14 +76,27 @@ final class Approach {
      * @throws IllegalStateException when the media cannot seek
      */
     void to(int millis) {
-        film.seekTo(millis);
         int latest = millis + ROUNDING_MS;
+        boolean isFromHere = isNear(latest);
+        if (!isFromHere) {
+            film.seekTo(millis);
+        }
+        walkTo(latest, isFromHere);
+    }
+
+    private boolean isNear(int latest) {
+        return pace != Pace.VARIABLE
+                && film.isAtFrame()
+                && Math.abs(latest - film.position()) <= NEAR_MS;
+    }
+
+    private void walkTo(int latest, boolean isFromHere) {
         int most = Integer.MAX_VALUE;
         boolean isLast = false;
         for (int i = 0; i < MOST_STEPS && !isArrived(latest, isLast); i++) {
             int before = film.position();
             int frames = framesTo(latest, before, most);
-            boolean found = step(frames);
+            boolean found = step(frames, isFromHere && i == 0);
             boolean isPast = film.position() > latest;
             if (!found && frames < 0 && isPast) {
                 return; // The first frame of all.
@@ -96,12 +119,14 @@ final class Approach {
     /** How many frames to step: at least one, forward or back, and not more than so many. */
     private int framesTo(int latest, int position, int most) {
         int left = latest - position;
-        double frames = left >= 0 ? Math.floor(left / periodMs) : Math.ceil(-left / periodMs);
+        double periods = Math.abs(left) / periodMs;
+        double frames = left >= 0 ? Math.floor(periods + COUNT_PRECISION) : Math.ceil(periods);
         int count = (int) Math.max(1, Math.min(frames, most));
         return left >= 0 ? count : -count;
     }
 
-    private boolean step(int frames) {
+    /** A long step may meet frames that were left out and does not say how the others come. */
+    private boolean step(int frames, boolean isLong) {
         int before = film.position();
         boolean found = film.step(frames);
         if (found && pace != Pace.VARIABLE) {
@@ -109,7 +134,9 @@ final class Approach {
             double error = Math.abs(film.position() - before - expected);
             boolean isAsExpected =
                     error <= 2 * ROUNDING_MS + Math.abs(expected) * RATE_PRECISION;
-            pace = isAsExpected ? Pace.STEADY : Pace.VARIABLE;
+            if (isAsExpected || !isLong) {
+                pace = isAsExpected ? Pace.STEADY : Pace.VARIABLE;
+            }
         }
         return found;
     }
@@ -137,6 +164,12 @@ final class Approach {
         @Override
         public int position() {
             return player.getCurrentPosition();
+        }
+
+        @Override
+        public boolean isAtFrame() {
+            PlayerState state = player.getState();
+            return state == PlayerState.PREPARED || state == PlayerState.PAUSED;
         }
     }
 }

@@ -33,6 +33,8 @@ class ApproachTest {
         private final Steps steps;
         private int at;
         private int calls;
+        private int seeks;
+        private boolean isAtFrame = true;
 
         Frames(int[] times, double rate, int keyFrames, Steps steps) {
             this.times = times;
@@ -43,6 +45,7 @@ class ApproachTest {
 
         @Override
         public void seekTo(int millis) {
+            seeks++;
             at = shownAt(millis);
             at -= at % keyFrames;
         }
@@ -63,6 +66,11 @@ class ApproachTest {
         @Override
         public int position() {
             return times[at];
+        }
+
+        @Override
+        public boolean isAtFrame() {
+            return isAtFrame;
         }
 
         int shownAt(int millis) {
@@ -108,6 +116,33 @@ class ApproachTest {
                     millis + " led to " + frames.position());
             assertTrue(frames.calls <= 2, frames.calls + " steps to " + millis);
         }
+    }
+
+    @ParameterizedTest
+    @ValueSource(ints = {10_000, 9_999, 9_960, 13_777, 24_900, 25_100, 5, 40_000})
+    void whatIsNearIsOneStepWithoutASeek(int millis) {
+        var frames = new Frames(steady(25, 2_000), 25, 250, Steps.COUNTED);
+        Approach approach = new Approach(frames, 25);
+        approach.to(10_000);
+        frames.calls = 0;
+        frames.seeks = 0;
+        approach.to(millis);
+        assertEquals(frames.shownAt(millis + 1), frames.at);
+        boolean isNear = Math.abs(millis - 10_000) < 15_000;
+        assertEquals(isNear ? 0 : 1, frames.seeks);
+        assertTrue(frames.calls <= 1, frames.calls + " steps");
+    }
+
+    /** As at the end of the media, where the position is the duration. */
+    @Test
+    void noStepBeginsWhereNoFrameIs() {
+        var frames = new Frames(steady(25, 2_000), 25, 250, Steps.COUNTED);
+        frames.isAtFrame = false;
+        Approach approach = new Approach(frames, 25);
+        approach.to(10_000);
+        approach.to(11_000);
+        assertEquals(11_000, frames.position());
+        assertEquals(2, frames.seeks);
     }
 
     @ParameterizedTest
@@ -159,6 +194,11 @@ class ApproachTest {
             public int position() {
                 return frames.position();
             }
+
+            @Override
+            public boolean isAtFrame() {
+                return false;
+            }
         };
         new Approach(late, 25).to(millis);
         assertEquals(frames.shownAt(millis + 1), frames.at);
@@ -176,6 +216,7 @@ class ApproachTest {
     @Test
     void aSeekThatIsExactNeedsNoStep() {
         var frames = new Frames(steady(25, 100), 25, 50, Steps.COUNTED);
+        frames.isAtFrame = false;
         Approach approach = new Approach(frames, 25);
         approach.to(0);
         approach.to(2_000);
