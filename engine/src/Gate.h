@@ -1,13 +1,16 @@
 // SPDX-License-Identifier: Apache-2.0
 #pragma once
 
+#include <stdint.h>
+
+#include <atomic>
 #include <condition_variable>
 #include <mutex>
 
 namespace orvtarn {
 
 // Counts the operations under way, so that the player can be taken apart when
-// none is left.
+// none is left. Coming and going take no lock while the gate is open.
 class Gate {
 public:
     // An operation's stay inside. False when the gate is closed.
@@ -27,17 +30,12 @@ public:
     };
 
     // Lets nobody in from now on. True for the one who closed it.
-    bool close() {
-        std::lock_guard<std::mutex> lock(mMutex);
-        const bool first = !mClosed;
-        mClosed = true;
-        return first;
-    }
+    bool close() { return (mState.fetch_or(kClosed) & kClosed) == 0; }
 
-    // Blocks until everybody who was inside has left.
+    // Blocks until everybody who was inside has left. Of a closed gate.
     void awaitEmpty() {
         std::unique_lock<std::mutex> lock(mMutex);
-        mChanged.wait(lock, [this] { return mInside == 0; });
+        mChanged.wait(lock, [this] { return mState == kClosed; });
     }
 
     // What the gate was closed for has been done, or is awaited.
@@ -53,21 +51,31 @@ public:
 
 private:
     bool enter() {
-        std::lock_guard<std::mutex> lock(mMutex);
-        if (mClosed) return false;
-        mInside++;
-        return true;
+        uint32_t state = mState;
+        while ((state & kClosed) == 0) {
+            if (mState.compare_exchange_weak(state, state + kOneInside)) return true;
+        }
+        return false;
     }
 
     void leave() {
+        uint32_t state = mState;
+        while ((state & kClosed) == 0) {
+            if (mState.compare_exchange_weak(state, state - kOneInside)) return;
+        }
+        // Under the lock, without which the gate may be gone before this returns.
         std::lock_guard<std::mutex> lock(mMutex);
-        if (--mInside == 0) mChanged.notify_all();
+        mState -= kOneInside;
+        mChanged.notify_all();
     }
 
+    // Whether it is closed, and above that how many are inside.
+    static constexpr uint32_t kClosed = 1;
+    static constexpr uint32_t kOneInside = 2;
+
+    std::atomic<uint32_t> mState{0};
     std::mutex mMutex;
     std::condition_variable mChanged;
-    int mInside = 0;
-    bool mClosed = false;
     bool mDone = false;
 };
 

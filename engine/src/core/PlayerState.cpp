@@ -4,6 +4,7 @@
 #include <algorithm>
 
 #include "base/EngineLog.h"
+#include "base/Milliseconds.h"
 
 namespace orvtarn {
 
@@ -20,6 +21,13 @@ bool PlayerState::Values::isOneOf(std::initializer_list<Phase> phases) const {
 
 bool PlayerState::Values::isOpen() const {
     return isOneOf({Phase::Prepared, Phase::Started, Phase::Paused, Phase::Completed});
+}
+
+PlayerState::Position PlayerState::Values::currentPosition() const {
+    if (phase == Phase::Error) return {error, 0};
+    if (!isOpen()) return {};
+    const double reached = duration > 0 ? std::min(position, duration) : position;
+    return {android::NO_ERROR, toMilliseconds(phase == Phase::Completed ? duration : reached)};
 }
 
 void PlayerState::Values::beginSeek() {

@@ -4,6 +4,7 @@
 #include <stdint.h>
 #include <utils/Errors.h>
 
+#include <atomic>
 #include <chrono>
 #include <condition_variable>
 #include <initializer_list>
@@ -31,6 +32,12 @@ const char* phaseName(Phase phase);
 // loop, read and waited for by anybody.
 class PlayerState {
 public:
+    // What programs ask for again and again, as getCurrentPosition answers it.
+    struct Position {
+        android::status_t status = android::INVALID_OPERATION;
+        int32_t msec = 0;
+    };
+
     struct Values {
         Phase phase = Phase::Idle;
         android::status_t error = android::NO_ERROR;  // in the error phase
@@ -66,6 +73,7 @@ public:
         bool isOpen() const;
         // A seek or the load goes on with mpv paused.
         bool isHeld() const { return attended || phase == Phase::Preparing; }
+        Position currentPosition() const;
         // A seek is about to be given to mpv.
         void beginSeek();
         // It is under way and mpv has not gone on from where it leads.
@@ -85,9 +93,13 @@ public:
     template <class Writer>
     auto update(Writer writer) {
         std::lock_guard<std::mutex> lock(mMutex);
+        const Publication publication(*this);
         mChanged.notify_all();
         return writer(mValues);
     }
+
+    // Takes no lock.
+    Position currentPosition() const { return mPosition.load(std::memory_order_acquire); }
 
     // Blocks until the condition holds. False when the time was over first.
     template <class Condition>
@@ -98,6 +110,7 @@ public:
     template <class Condition>
     bool waitUntil(std::chrono::steady_clock::time_point deadline, Condition condition) {
         std::unique_lock<std::mutex> lock(mMutex);
+        const Publication publication(*this);
         return mChanged.wait_until(lock, deadline, [&] { return condition(mValues); });
     }
 
@@ -112,6 +125,21 @@ public:
     static android::status_t wrongPhase(const char* operation, Phase phase);
 
 private:
+    // Publishes what can be read without a lock when a change is done, under the lock.
+    class Publication {
+    public:
+        explicit Publication(PlayerState& state) : mState(state) {}
+        ~Publication() {
+            mState.mPosition.store(mState.mValues.currentPosition(), std::memory_order_release);
+        }
+        Publication(const Publication&) = delete;
+        Publication& operator=(const Publication&) = delete;
+
+    private:
+        PlayerState& mState;
+    };
+
+    std::atomic<Position> mPosition{Position()};
     mutable std::mutex mMutex;
     std::condition_variable mChanged;
     Values mValues;

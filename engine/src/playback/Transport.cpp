@@ -114,14 +114,10 @@ bool Transport::isPlaying() const {
 
 status_t Transport::getCurrentPosition(int* msec) const {
     if (msec == nullptr) return failed(android::BAD_VALUE, "getCurrentPosition", "null argument");
-    const PlayerState::Values now = mState.read([](const PlayerState::Values& v) { return v; });
-    *msec = 0;
-    if (now.phase == Phase::Error) return now.error;
     // Programs ask for this again and again: no log line.
-    if (!now.isOpen()) return android::INVALID_OPERATION;
-    const double position = now.duration > 0 ? std::min(now.position, now.duration) : now.position;
-    *msec = toMilliseconds(now.phase == Phase::Completed ? now.duration : position);
-    return android::NO_ERROR;
+    const PlayerState::Position now = mState.currentPosition();
+    *msec = now.msec;
+    return now.status;
 }
 
 status_t Transport::getDuration(int* msec) const {
