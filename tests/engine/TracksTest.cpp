@@ -115,6 +115,32 @@ TEST_F(TracksTest, NumbersRunOverAllKinds) {
     EXPECT_EQ(0, audioIndex());
 }
 
+// What was described before has changed by then.
+TEST_F(TracksTest, DescriptionsFollowChoicesFilesAndMedia) {
+    open("feature.mkv");
+    const auto isSelected = [this](int index) {
+        AudioTrackInfo audio;
+        EXPECT_TRUE(player->getAudioTrackInfo(false, index, audio));
+        return (audio.mFlags & ORV_TRACK_FLAG_SELECTED) != 0;
+    };
+    EXPECT_TRUE(isSelected(0));
+    ASSERT_TRUE(player->selectAudioTrack(1));
+    EXPECT_FALSE(isSelected(0));
+    EXPECT_TRUE(isSelected(1));
+    ASSERT_TRUE(player->deselectTrack(2));
+    EXPECT_FALSE(isSelected(1));
+    SubtitleTrackInfo subtitle;
+    EXPECT_FALSE(player->getSubtitleTrackInfo(2, subtitle));
+    ASSERT_TRUE(player->addTimedTextSource(mediaPath("words.idx").c_str()));
+    EXPECT_TRUE(player->getSubtitleTrackInfo(2, subtitle));
+    ASSERT_EQ(NO_ERROR, player->reset());
+    open("video.mp4");
+    AudioTrackInfo audio;
+    EXPECT_FALSE(player->getAudioTrackInfo(false, 1, audio));
+    ASSERT_TRUE(player->getAudioTrackInfo(false, 0, audio));
+    EXPECT_STRNE("fra", audio.mLanguage);
+}
+
 TEST_F(TracksTest, BeforeTheMediaNothingIsKnown) {
     int count = 5;
     int index = 5;

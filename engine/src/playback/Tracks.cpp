@@ -54,12 +54,42 @@ bool Tracks::countOf(const char* operation, Table TrackTables::* table, int& cou
     return true;
 }
 
+bool Tracks::Stand::operator==(const Stand& other) const {
+    return session == other.session && count == other.count && video == other.video &&
+           audio == other.audio && subtitle == other.subtitle;
+}
+
+Tracks::Stand Tracks::stand() const {
+    return {mState.read([](const PlayerState::Values& v) { return v.session; }),
+            mMpv.getInt("track-list/count"), mMpv.getInt("vid"), mMpv.getInt("aid"),
+            mMpv.getInt("sid")};
+}
+
+std::shared_ptr<const TrackTables> Tracks::keptDetails(const Stand& now) {
+    std::lock_guard<std::mutex> lock(mKeptMutex);
+    return mKept != nullptr && mKeptStand == now ? mKept : nullptr;
+}
+
+std::shared_ptr<const TrackTables> Tracks::details(const char* operation) {
+    if (mState.requireOpen(operation) != android::NO_ERROR) return nullptr;
+    const Stand now = stand();
+    if (const auto kept = keptDetails(now)) return kept;
+    const auto all = std::make_shared<TrackTables>();
+    if (!tables(operation, *all)) return nullptr;
+    mLoader.secondReading()->withFile([&](MediaFile& file) { addContainerDetails(file, *all); });
+    // Those that changed meanwhile are not kept.
+    if (!(stand() == now)) return all;
+    std::lock_guard<std::mutex> lock(mKeptMutex);
+    mKeptStand = now;
+    mKept = all;
+    return all;
+}
+
 bool Tracks::videoInfo(int index, VideoCodecInfo& info) {
-    TrackTables all;
-    if (!tables("getVideoCodecInfo", all)) return false;
-    if (!isIndex(all.video, index)) return refused("getVideoCodecInfo", "no such track");
-    mLoader.secondReading()->withFile([&](MediaFile& file) { addContainerDetails(file, all); });
-    info = all.video[index].record;
+    const auto all = details("getVideoCodecInfo");
+    if (all == nullptr) return false;
+    if (!isIndex(all->video, index)) return refused("getVideoCodecInfo", "no such track");
+    info = all->video[index].record;
     return true;
 }
 
@@ -77,14 +107,14 @@ int Tracks::shownVideoStream() {
 }
 
 bool Tracks::audioInfo(bool withTexts, int index, AudioTrackInfo& info) {
-    TrackTables all;
-    if (!tables("getAudioTrackInfo", all)) return false;
-    if (!isIndex(all.audio, index)) return refused("getAudioTrackInfo", "no such track");
-    mLoader.secondReading()->withFile([&](MediaFile& file) {
-        addContainerDetails(file, all);
-        if (withTexts) addAudioTexts(file, all.audio[index]);
-    });
-    info = all.audio[index].record;
+    const auto all = details("getAudioTrackInfo");
+    if (all == nullptr) return false;
+    if (!isIndex(all->audio, index)) return refused("getAudioTrackInfo", "no such track");
+    Track<AudioTrackInfo> track = all->audio[index];
+    if (withTexts) {
+        mLoader.secondReading()->withFile([&](MediaFile& file) { addAudioTexts(file, track); });
+    }
+    info = track.record;
     return true;
 }
 
@@ -93,11 +123,10 @@ bool Tracks::subtitleInfo(int index, SubtitleTrackInfo& info) {
         return descriptionPiece(index - ORV_DESCRIPTION_INDEX_BASE, info);
     }
     if (index >= ORV_CHAPTER_INDEX_BASE) return chapterInfo(index - ORV_CHAPTER_INDEX_BASE, info);
-    TrackTables all;
-    if (!tables("getSubtitleTrackInfo", all)) return false;
-    if (!isIndex(all.subtitles, index)) return refused("getSubtitleTrackInfo", "no such track");
-    mLoader.secondReading()->withFile([&](MediaFile& file) { addContainerDetails(file, all); });
-    info = all.subtitles[index].record;
+    const auto all = details("getSubtitleTrackInfo");
+    if (all == nullptr) return false;
+    if (!isIndex(all->subtitles, index)) return refused("getSubtitleTrackInfo", "no such track");
+    info = all->subtitles[index].record;
     return true;
 }
 

@@ -4,6 +4,10 @@
 #include <orvtarn/TrackRecords.h>
 #include <stdint.h>
 
+#include <memory>
+#include <mutex>
+#include <optional>
+
 #include "core/MpvHandle.h"
 #include "core/PlayerState.h"
 #include "playback/Loader.h"
@@ -51,6 +55,22 @@ public:
     bool showSubtitle(const char* operation, int64_t id);
 
 private:
+    // What changes with the tables, though it is read in a moment.
+    struct Stand {
+        uint64_t session;
+        std::optional<int64_t> count;
+        std::optional<int64_t> video;
+        std::optional<int64_t> audio;
+        std::optional<int64_t> subtitle;
+
+        bool operator==(const Stand& other) const;
+    };
+
+    Stand stand() const;
+    // The tables with what the container knows, kept: each of many tracks is asked for
+    // on its own. Null where there are none.
+    std::shared_ptr<const TrackTables> details(const char* operation);
+    std::shared_ptr<const TrackTables> keptDetails(const Stand& now);
     template <class Table>
     bool countOf(const char* operation, Table TrackTables::* table, int& count);
     template <class Table>
@@ -65,6 +85,9 @@ private:
     Loader& mLoader;
     Seeker& mSeeker;
     VideoFilters& mFilters;
+    std::mutex mKeptMutex;
+    Stand mKeptStand{};
+    std::shared_ptr<const TrackTables> mKept;
 };
 
 }  // namespace orvtarn
