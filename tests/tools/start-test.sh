@@ -46,7 +46,7 @@ done
 
 # The native libraries are loaded by a thread of their own, the log's sixth word. Help needs none.
 ORV_LOG=verbose "${java[@]}" "${jar[@]}" info "$ORV_MEDIA/short.mp4" >"$folder/log" 2>&1 || fail "info"
-thread_of() { grep -a -m 1 -F "$1" "$folder/log" | cut -d' ' -f6; }
+thread_of() { awk -v text="$1" 'index($0, text) { print $6; exit }' "$folder/log"; }
 [ -n "$(thread_of 'JNI_OnLoad()')" ] || fail "no log of the native libraries"
 [ "$(thread_of 'JNI_OnLoad()')" != "$(thread_of '_setup(): Enter')" ] ||
     fail "the native libraries are loaded while nothing else is done"
@@ -75,8 +75,8 @@ prepare >/dev/null || fail "a start after a build"
 [ ! -e "$archive.failed" ] || fail "the mark of an earlier build stays"
 
 # The jar names the libraries that it needs: it is made anew with that list.
-ninja -C "$ORV_BUILD" -t query java/orv_player.jar | grep -q 'player/manifest\.txt$' ||
-    fail "a new list of libraries does not reach the jar"
+inputs=$(ninja -C "$ORV_BUILD" -t query java/orv_player.jar)
+grep -q 'player/manifest\.txt$' <<<"$inputs" || fail "a new list of libraries does not reach the jar"
 
 # Nobody may be asked now.
 mkdir "$folder/bin"
