@@ -537,7 +537,7 @@ make_counted_60_mkv() { counted "$1" 60 60; }
 # AAC begins before time zero, so that all times are moved on: the container's begin
 # with the sound's, while the first block is a frame, 21 ms later.
 make_counted_sound_mkv() {
-    counted "$1" 60 60 "[out0];sine=duration=4:sample_rate=48000[out1]" "-c:a aac -bf 2"
+    counted "$1" 60 60 "[out0];sine=duration=3:sample_rate=48000[out1]" "-c:a aac -bf 2"
 }
 make_counted_ts() { counted "$1" 25 25; }
 make_counted_film_mp4() { counted "$1" 24000/1001 24; }
