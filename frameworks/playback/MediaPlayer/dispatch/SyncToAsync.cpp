@@ -165,7 +165,9 @@ void SyncToAsync::m_deleteMsgHandler(MsgHandler* handler) {
 
 void SyncToAsync::m_deleteAction(SyncToAsyncAction* action) {
     if (action == nullptr) return;
-    m_actions.remove(action);
+    // Actions go in the order in which they came: it is the first, usually.
+    const auto pending = std::find(m_actions.begin(), m_actions.end(), action);
+    if (pending != m_actions.end()) m_actions.erase(pending);
     delete action->payload;
     delete action;
 }
