@@ -18,6 +18,7 @@ film() {
         -c:v libx264 -preset veryfast -crf 20 -g $((2 * $2)) -pix_fmt yuv420p -c:a aac -ac 2 "$3"
 }
 make_1080p60_mkv() { film 1920x1080 60 "$1"; }
+make_wall_mkv() { film 640x360 30 "$1"; }
 make_2160p30_mkv() { film 3840x2160 30 "$1"; }
 
 # Three hours of a still: two small pictures a second, a key frame each ten seconds.
