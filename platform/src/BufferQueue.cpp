@@ -32,7 +32,7 @@ status_t BufferQueue::dequeueBuffer(int width, int height, PixelBuffer* buffer) 
     if (!isFrameSize(width, height)) return BAD_VALUE;
     Lock lock(mLock);
     if (mAbandoned) return NO_INIT;
-    const int index = findSlot(State::FREE);
+    const int index = findFreeSlot();
     if (index < 0) return WOULD_BLOCK;
 
     Slot& slot = mSlots[index];
@@ -104,6 +104,7 @@ status_t BufferQueue::releaseFrame(int index) {
     Slot* const slot = slotIn(index, State::ACQUIRED);
     if (slot == nullptr) return BAD_VALUE;
     freeSlot(slot);
+    mLastReleased = index;
     return NO_ERROR;
 }
 
@@ -144,6 +145,13 @@ int BufferQueue::findSlot(State state) const {
         if (mSlots[index].state == state) return index;
     }
     return -1;
+}
+
+int BufferQueue::findFreeSlot() const {
+    for (int index = 0; index < kSlotCount; ++index) {
+        if (index != mLastReleased && mSlots[index].state == State::FREE) return index;
+    }
+    return findSlot(State::FREE);
 }
 
 void BufferQueue::freeSlot(Slot* slot) {

@@ -49,7 +49,8 @@ public:
     // INVALID_OPERATION while an earlier one is not released; NO_INIT once
     // abandoned.
     status_t acquireFrame(Frame* frame);
-    // BAD_VALUE for a slot that is not acquired.
+    // BAD_VALUE for a slot that is not acquired. The frame that was given back last keeps its
+    // content while another slot is free, for a consumer that shows it still.
     status_t releaseFrame(int slot);
     // Waits until more than seen frames were queued, the queue is abandoned or
     // the time is over; returns the number of frames queued so far.
@@ -73,6 +74,7 @@ private:
 
     Slot* slotIn(int index, State state);
     int findSlot(State state) const;
+    int findFreeSlot() const;
     void freeSlot(Slot* slot);
     PixelBuffer describe(int index) const;
 
@@ -82,6 +84,7 @@ private:
     int mDefaultWidth = 0;
     int mDefaultHeight = 0;
     bool mAbandoned = false;
+    int mLastReleased = -1;
     Statistics mStatistics = {0, 0};
 };
 

@@ -149,6 +149,21 @@ TEST_F(BufferQueueTest, AHeldFrameNeitherHoldsUpTheProducerNorChanges) {
     EXPECT_EQ(acquire().timestampUs, 10);
 }
 
+TEST_F(BufferQueueTest, TheFrameThatWasGivenBackKeepsItsContentWhileThereAreOthers) {
+    produce(1);
+    const int shown = acquire().buffer.slot;
+    EXPECT_EQ(mQueue->releaseFrame(shown), NO_ERROR);
+    const int next = dequeue().slot;
+    const int other = dequeue().slot;
+    EXPECT_NE(next, shown);
+    EXPECT_NE(other, shown);
+    EXPECT_EQ(dequeue().slot, shown) << "when it is the only one";
+    EXPECT_EQ(mQueue->queueBuffer(next, 2), NO_ERROR);
+    EXPECT_EQ(mQueue->releaseFrame(acquire().buffer.slot), NO_ERROR);
+    EXPECT_EQ(mQueue->cancelBuffer(shown), NO_ERROR);
+    EXPECT_EQ(dequeue().slot, shown) << "once another was given back";
+}
+
 TEST_F(BufferQueueTest, ATakenFrameIsNotTakenTwice) {
     EXPECT_EQ(tryAcquire(), WOULD_BLOCK);
     produce(1);

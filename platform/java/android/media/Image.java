@@ -33,7 +33,8 @@ public class Image implements AutoCloseable {
         /**
          * The rows, top first: a direct, read-only, little-endian buffer of row stride times height
          * bytes at position 0. Read as ints, each pixel is 0xXXRRGGBB with X undefined. Once the
-         * image is closed the content changes under the reader, but reading stays harmless.
+         * image is closed the content changes under the reader, usually not before another frame
+         * was taken, but reading stays harmless.
          */
         public ByteBuffer getBuffer() {
             mImage.checkOpen();

@@ -6,14 +6,11 @@ import java.awt.EventQueue;
 import java.awt.Graphics;
 import java.awt.Graphics2D;
 import java.awt.Rectangle;
-import java.awt.RenderingHints;
 import java.awt.geom.AffineTransform;
 import java.awt.geom.Rectangle2D;
 import java.awt.image.BufferedImage;
-import java.awt.image.DataBufferInt;
+import java.lang.reflect.InvocationTargetException;
 import java.nio.ByteBuffer;
-import java.util.concurrent.atomic.AtomicBoolean;
-import java.util.concurrent.atomic.AtomicLong;
 import javax.swing.JPanel;
 
 /**
@@ -21,20 +18,17 @@ import javax.swing.JPanel;
  * of which there are more than the window's where the screen is scaled.
  */
 final class VideoPane extends JPanel {
-    // The one that is painted and the one that is filled; they change places under the lock.
-    private final Object lock = new Object();
-    private BufferedImage front;
-    private BufferedImage back;
-
-    private final AtomicBoolean awaitsPainting = new AtomicBoolean();
+    private final FramePainter painter = new FramePainter();
     private final Runnable onRoomChanged;
+    // One of them is shown; on the window's thread.
+    private Frame frame;
+    private BufferedImage still;
     private Dimension room = new Dimension();
-    private final AtomicLong copies = new AtomicLong();
     private long paintings;
     private long scalings;
 
-    /** How often a frame was copied, the picture painted, and of those painted in another size. */
-    record Work(long copies, long paintings, long scalings) {}
+    /** How many pixels were copied, pictures painted, and of those in another size. */
+    record Work(long copiedPixels, long paintings, long scalings) {}
 
     /** Calls back when there is more or less room than before, on the window's thread. */
     VideoPane(Runnable onRoomChanged) {
@@ -43,47 +37,47 @@ final class VideoPane extends JPanel {
     }
 
     /**
-     * Shows a frame from now on; may be called on any one thread.
+     * Shows a frame from now on, and returns when it is painted, so that its memory may have other
+     * content then: what is painted again later, as after another window was in front, is what is
+     * there at that time. Any thread but the window's.
      *
      * @param pixels rows of 32-bit pixels that read 0xXXRRGGBB
      * @param stride bytes from row to row
      */
     void draw(ByteBuffer pixels, int width, int height, int stride) {
-        if (back == null || back.getWidth() != width || back.getHeight() != height) {
-            back = new BufferedImage(width, height, BufferedImage.TYPE_INT_RGB);
+        Frame next = new Frame(pixels, width, height, stride);
+        try {
+            EventQueue.invokeAndWait(() -> show(next, null));
+        } catch (InterruptedException e) {
+            Thread.currentThread().interrupt(); // The window is closing.
+        } catch (InvocationTargetException e) {
+            Thread thread = Thread.currentThread();
+            thread.getUncaughtExceptionHandler().uncaughtException(thread, e.getCause());
         }
-        int[] target = ((DataBufferInt) back.getRaster().getDataBuffer()).getData();
-        var source = pixels.asIntBuffer();
-        for (int y = 0; y < height; y++) {
-            source.get(y * (stride / 4), target, y * width, width);
-        }
-        copies.incrementAndGet();
-        draw(back);
     }
 
-    /** Shows a still picture, which must not change any more. */
+    /** Shows a still picture, which must not change any more; on the window's thread. */
     void draw(BufferedImage picture) {
-        synchronized (lock) {
-            back = front;
-            front = picture;
-        }
-        if (!awaitsPainting.getAndSet(true)) {
-            EventQueue.invokeLater(this::paintNewest);
-        }
+        show(null, picture);
     }
 
-    /** Straight onto the screen, if nothing lies over it: there is nothing to flicker. */
-    private void paintNewest() {
-        awaitsPainting.set(false);
+    private void show(Frame nextFrame, BufferedImage nextStill) {
+        frame = nextFrame;
+        still = nextStill;
         if (!isShowing()) {
             return; // It is painted when it shows again.
         }
         if (Covering.isOver(this)) {
-            repaint();
-            return;
+            paintImmediately(0, 0, getWidth(), getHeight());
+        } else {
+            paintAlone();
         }
-        // Asking for it also ends that Swing keeps the window's content to put it back where
-        // the window was covered: that would be an older picture.
+    }
+
+    // Straight onto the screen: with nothing over it, there is nothing to flicker. Asking for the
+    // graphics also ends that Swing keeps the window's content to put it back where the window
+    // was covered, which would be an older picture.
+    private void paintAlone() {
         Graphics graphics = getGraphics();
         if (graphics != null) {
             paintComponent(graphics);
@@ -94,7 +88,7 @@ final class VideoPane extends JPanel {
 
     /** What was done since the pane was made; on the window's thread. */
     Work work() {
-        return new Work(copies.get(), paintings, scalings);
+        return new Work(painter.copiedPixels(), paintings, scalings);
     }
 
     @Override
@@ -109,11 +103,10 @@ final class VideoPane extends JPanel {
 
     /** The pixels of the newest frame; none before there is one. */
     Dimension pictureSize() {
-        synchronized (lock) {
-            return front == null
-                    ? new Dimension()
-                    : new Dimension(front.getWidth(), front.getHeight());
+        if (frame != null) {
+            return new Dimension(frame.width(), frame.height());
         }
+        return still == null ? new Dimension() : new Dimension(still.getWidth(), still.getHeight());
     }
 
     // Only here it is certain on which screen, and how large, the picture shows.
@@ -122,9 +115,7 @@ final class VideoPane extends JPanel {
         Graphics2D g = (Graphics2D) graphics.create();
         Rectangle pixels = pixelsOf(g.getTransform());
         g.setTransform(new AffineTransform());
-        synchronized (lock) {
-            paintFrame(g, pixels);
-        }
+        paintPicture(g, pixels);
         g.dispose();
         if (!room.equals(pixels.getSize())) {
             room = pixels.getSize();
@@ -146,24 +137,26 @@ final class VideoPane extends JPanel {
         return (int) Math.ceil(place - 0.5);
     }
 
-    private void paintFrame(Graphics2D g, Rectangle pixels) {
+    private void paintPicture(Graphics2D g, Rectangle pixels) {
         g.setColor(Theme.STAGE);
-        if (front == null || pixels.isEmpty()) {
+        Dimension size = pictureSize();
+        if (size.width == 0 || pixels.isEmpty()) {
             g.fill(pixels);
             return;
         }
-        Rectangle place = fit(front.getWidth(), front.getHeight(), pixels.width, pixels.height);
+        Rectangle place = fit(size.width, size.height, pixels.width, pixels.height);
         place.translate(pixels.x, pixels.y);
         fillAround(g, pixels, place);
         paintings++;
-        if (place.width == front.getWidth() && place.height == front.getHeight()) {
-            g.drawImage(front, place.x, place.y, null);
-            return;
+        boolean isScaled = !place.getSize().equals(size);
+        scalings += isScaled ? 1 : 0;
+        if (frame != null) {
+            painter.paint(g, frame, place);
+        } else if (isScaled) {
+            FramePainter.paintScaled(g, still, place);
+        } else {
+            g.drawImage(still, place.x, place.y, null);
         }
-        scalings++;
-        g.setRenderingHint(
-                RenderingHints.KEY_INTERPOLATION, RenderingHints.VALUE_INTERPOLATION_BILINEAR);
-        g.drawImage(front, place.x, place.y, place.width, place.height, null);
     }
 
     // Nothing is painted twice, which would flicker.

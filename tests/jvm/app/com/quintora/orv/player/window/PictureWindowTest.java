@@ -8,6 +8,7 @@ import java.awt.Graphics2D;
 import java.awt.Rectangle;
 import java.awt.image.BufferedImage;
 import java.nio.ByteBuffer;
+import java.nio.ByteOrder;
 import java.util.concurrent.atomic.AtomicInteger;
 import javax.swing.SwingUtilities;
 import org.junit.jupiter.api.Test;
@@ -35,7 +36,7 @@ class PictureWindowTest {
         assertEquals(Math.ceil(height * scale - 0.5), room.height);
         Rectangle place = VideoPane.fit(320, 180, room.width, room.height);
         BufferedImage picture = checkered(place.width, place.height);
-        pane.draw(picture);
+        show(picture);
         BufferedImage screen = paint(scale, 0, 0);
         for (int y = 0; y < room.height; y++) {
             for (int x = 0; x < room.width; x++) {
@@ -55,7 +56,7 @@ class PictureWindowTest {
         paint(scale, x, y);
         Dimension room = pane.room();
         BufferedImage picture = checkered(room.width, room.height);
-        pane.draw(picture);
+        show(picture);
         BufferedImage screen = paint(scale, x, y);
         int left = (int) Math.ceil(x * scale - 0.5);
         int top = (int) Math.ceil(y * scale - 0.5);
@@ -78,28 +79,60 @@ class PictureWindowTest {
         assertEquals(new Dimension(640, 360), pane.room());
     }
 
+    /** By each way: in bands, and the whole where it is scaled. */
+    @ParameterizedTest
+    @CsvSource({"1, 0", "2, 1"})
+    void everyPixelIsCopiedOnceForAPainting(int scale, int scalings) throws Exception {
+        pane.setSize(700, 480);
+        pane.draw(bytesOf(checkered(700, 480), 2816), 700, 480, 2816);
+        assertEquals(new VideoPane.Work(0, 0, 0), work(), "nothing is painted yet");
+        paint(scale, 0, 0);
+        assertEquals(new VideoPane.Work(700 * 480, 1, scalings), work());
+    }
+
+    /** Rows lie further apart in memory than they are wide, and there are several bands. */
     @Test
-    void aFrameIsCopiedOnceHoweverOftenItIsPainted() throws Exception {
-        pane.setSize(64, 36);
-        for (int frame = 1; frame <= 3; frame++) {
-            pane.draw(ByteBuffer.allocateDirect(256 * 36), 64, 36, 256);
-            paint(1, 0, 0);
-            paint(1, 0, 0);
-            assertEquals(new VideoPane.Work(frame, 2 * frame, 0), work());
+    void aFrameInMemoryIsShownPixelByPixel() throws Exception {
+        pane.setSize(700, 480);
+        var picture = new BufferedImage(700, 480, BufferedImage.TYPE_INT_RGB);
+        for (int i = 0; i < 700 * 480; i++) {
+            picture.setRGB(i % 700, i / 700, i);
+        }
+        pane.draw(bytesOf(picture, 2816), 700, 480, 2816);
+        BufferedImage screen = paint(1, 0, 0);
+        for (int y = 0; y < 480; y++) {
+            for (int x = 0; x < 700; x++) {
+                assertEquals(picture.getRGB(x, y), screen.getRGB(x, y), "at " + x + ", " + y);
+            }
         }
     }
 
     @Test
-    void onlyAFrameOfAnotherSizeIsScaled() throws Exception {
+    void onlyAPictureOfAnotherSizeIsScaled() throws Exception {
         pane.setSize(64, 36);
-        pane.draw(checkered(64, 36));
+        show(checkered(64, 36));
         paint(1, 0, 0);
         assertEquals(new VideoPane.Work(0, 1, 0), work());
         paint(2, 0, 0);
         assertEquals(new VideoPane.Work(0, 2, 1), work());
-        pane.draw(checkered(128, 72));
+        show(checkered(128, 72));
         paint(2, 0, 0);
         assertEquals(new VideoPane.Work(0, 3, 1), work());
+    }
+
+    private void show(BufferedImage picture) throws Exception {
+        SwingUtilities.invokeAndWait(() -> pane.draw(picture));
+    }
+
+    private static ByteBuffer bytesOf(BufferedImage picture, int stride) {
+        ByteBuffer bytes = ByteBuffer.allocateDirect(stride * picture.getHeight());
+        bytes.order(ByteOrder.LITTLE_ENDIAN);
+        for (int y = 0; y < picture.getHeight(); y++) {
+            for (int x = 0; x < picture.getWidth(); x++) {
+                bytes.putInt(y * stride + 4 * x, picture.getRGB(x, y));
+            }
+        }
+        return bytes;
     }
 
     private VideoPane.Work work() throws Exception {

@@ -32,7 +32,7 @@ class ScaledWindowTest extends WindowFixture {
                 "a frame is as wide, or as high, as the room has pixels",
                 () -> {
                     Dimension room = new Dimension(2 * video.getWidth(), 2 * video.getHeight());
-                    Dimension picture = video.pictureSize();
+                    Dimension picture = onWindow(video::pictureSize);
                     return picture.width == room.width && picture.height <= room.height
                             || picture.height == room.height && picture.width <= room.width;
                 });
