@@ -64,6 +64,7 @@ bool TarnPlayer::Engine::requireCore() {
 
 bool TarnPlayer::Engine::createCore() {
     if (!mpv.create()) return false;
+    audio.restore();
     subtitles.readUsualLook();
     notifier.start();
     return protocol.install(mpv.get()) && video.create(mpv.get()) && events.start();

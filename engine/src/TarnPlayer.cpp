@@ -139,7 +139,7 @@ status_t TarnPlayer::getMetadata(const SortedVector<int>& ids, Parcel* records) 
 }
 
 status_t TarnPlayer::setVolume(float left, float right) {
-    return mEngine->statusWithCore(__func__, [&] { return mEngine->audio.setVolume(left, right); });
+    return mEngine->status(__func__, [&] { return mEngine->audio.setVolume(left, right); });
 }
 
 status_t TarnPlayer::getVideoWidth(int* w) {
@@ -278,7 +278,7 @@ bool TarnPlayer::flushSubtitleAttr() {
 }
 
 status_t TarnPlayer::setPlayerRole(E_Orv_Player_Role_Type role) {
-    return mEngine->statusWithCore(__func__, [&] { return mEngine->audio.setRole(role); });
+    return mEngine->status(__func__, [&] { return mEngine->audio.setRole(role); });
 }
 
 status_t TarnPlayer::setPCMMediaInfo(IORV_PB_CTRL_SET_MEDIA_INFO_T* info) {

@@ -14,6 +14,8 @@ namespace {
 std::atomic<bool> gNoNewCore{false};
 std::atomic<const char*> gUnknownOption{nullptr};
 std::atomic<int> gQuestions{0};
+std::atomic<double> gVolume{-1};
+std::atomic<bool> gMute{false};
 
 bool isRendering() {
     char name[16] = "";
@@ -36,6 +38,9 @@ UnknownOption::~UnknownOption() { gUnknownOption = nullptr; }
 
 int questionsWhileRendering() { return gQuestions; }
 
+double newestVolume() { return gVolume; }
+bool newestMute() { return gMute; }
+
 }  // namespace orvtest
 
 // These stand before the media library's for the whole test program.
@@ -51,6 +56,14 @@ int mpv_set_option_string(mpv_handle* mpv, const char* name, const char* value) 
     const char* unknown = orvtest::gUnknownOption;
     if (unknown != nullptr && strcmp(unknown, name) == 0) return MPV_ERROR_OPTION_NOT_FOUND;
     return set(mpv, name, value);
+}
+
+int mpv_set_property(mpv_handle* mpv, const char* name, mpv_format format, void* data) {
+    static const auto set =
+        orvtest::original<int(mpv_handle*, const char*, mpv_format, void*)>("mpv_set_property");
+    if (strcmp(name, "volume") == 0) orvtest::gVolume = *static_cast<double*>(data);
+    if (strcmp(name, "mute") == 0) orvtest::gMute = *static_cast<int*>(data) != 0;
+    return set(mpv, name, format, data);
 }
 
 int mpv_get_property(mpv_handle* mpv, const char* name, mpv_format format, void* data) {

@@ -26,4 +26,8 @@ public:
 // far, which may stop the core for as long as it waits for that thread.
 int questionsWhileRendering();
 
+// What any core was given last: percent, and whether it is silent.
+double newestVolume();
+bool newestMute();
+
 }  // namespace orvtest

@@ -10,6 +10,7 @@
 #include <thread>
 #include <vector>
 
+#include "CoreCalls.h"
 #include "PlayerTest.h"
 
 using namespace android;
@@ -102,7 +103,8 @@ TEST_F(IdleTest, WithoutASurfaceNobodyDraws) {
 }
 
 TEST_F(IdleTest, WithoutMediaNothingIsReported) {
-    ASSERT_EQ(NO_ERROR, player->setVolume(1, 1));
+    open("short.mp4");
+    ASSERT_EQ(NO_ERROR, player->reset());
     EXPECT_EQ(0, wokenWhileAnotherPlays(kEvents));
 }
 
@@ -112,6 +114,8 @@ TEST_F(IdleTest, PlayersWithoutMediaHaveNoThreads) {
     for (const auto& each : players) {
         each->setVideoSurfaceTexture(sink);
         EXPECT_EQ(NO_ERROR, each->setLooping(1));
+        EXPECT_EQ(NO_ERROR, each->setVolume(0.5, 0.25));
+        EXPECT_EQ(NO_ERROR, each->setPlayerRole(E_ORV_PLAYER_ROLE_SUB));
         EXPECT_EQ(NO_ERROR, each->reset());
         int msec = 0;
         EXPECT_EQ(INVALID_OPERATION, each->getCurrentPosition(&msec));
@@ -120,6 +124,18 @@ TEST_F(IdleTest, PlayersWithoutMediaHaveNoThreads) {
         EXPECT_FALSE(each->step(1));
     }
     EXPECT_EQ(0u, threadsOfPlayers());
+}
+
+TEST_F(IdleTest, VolumeAndRoleWaitForMedia) {
+    ASSERT_TRUE(noThreadsAreLeft());
+    EXPECT_EQ(NO_ERROR, player->setVolume(0.125, 0.125));
+    EXPECT_EQ(NO_ERROR, player->setPlayerRole(E_ORV_PLAYER_ROLE_SUB));
+    EXPECT_EQ(0u, threadsOfPlayers());
+    open("short.mp4");
+    EXPECT_NEAR(50, newestVolume(), 0.01);
+    EXPECT_TRUE(newestMute());
+    EXPECT_EQ(NO_ERROR, player->setPlayerRole(E_ORV_PLAYER_ROLE_MAIN));
+    EXPECT_FALSE(newestMute());
 }
 
 TEST_F(IdleTest, MediaBringThreadsAndReleaseEndsThem) {

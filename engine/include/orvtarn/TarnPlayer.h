@@ -42,10 +42,10 @@ public:
     // chooses by itself, whatever the number: a decoder of the machine's that
     // copies its pictures back, or software where there is none.
     // A new player has neither threads nor an mpv: both come with the first data
-    // source, volume, role, parameter or look of subtitles, which takes some
-    // milliseconds, sets the process's LC_NUMERIC to "C", and fails with
-    // INVALID_OPERATION where mpv cannot start, as without memory: the player is
-    // then as a released one.
+    // source, parameter or look of subtitles, which takes some milliseconds, sets
+    // the process's LC_NUMERIC to "C", and fails with INVALID_OPERATION where mpv
+    // cannot start, as without memory: the player is then as a released one. They
+    // stay until release.
     explicit TarnPlayer(int decoder);
 
     // Before the data source: whether it is a stereoscopic stream file. On the

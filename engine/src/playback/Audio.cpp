@@ -22,10 +22,20 @@ std::string gainText(double gain) {
 
 android::status_t Audio::setVolume(float left, float right) {
     if (isnan(left) || isnan(right)) return failed(android::BAD_VALUE, "setVolume", "not a number");
-    const double l = std::clamp(left, 0.0f, 1.0f);
-    const double r = std::clamp(right, 0.0f, 1.0f);
-    const double louder = std::max(l, r);
     std::lock_guard<std::mutex> lock(mMutex);
+    mVolume = {std::clamp(left, 0.0f, 1.0f), std::clamp(right, 0.0f, 1.0f)};
+    return hasCore() ? applyVolume() : android::NO_ERROR;
+}
+
+void Audio::restore() {
+    std::lock_guard<std::mutex> lock(mMutex);
+    if (mVolume) applyVolume();
+    if (mMuted) mMpv.set("mute", *mMuted);
+}
+
+android::status_t Audio::applyVolume() {
+    const auto [l, r] = *mVolume;
+    const double louder = std::max(l, r);
     // mpv's volume is cubic, in percent.
     int error = mMpv.set("volume", 100 * cbrt(louder));
     if (error < 0) return failed(android::UNKNOWN_ERROR, "setVolume", mpv_error_string(error));
@@ -48,7 +58,8 @@ android::status_t Audio::setRole(E_Orv_Player_Role_Type role) {
         return failed(android::BAD_VALUE, "setPlayerRole", "no such role");
     }
     std::lock_guard<std::mutex> lock(mMutex);
-    mMpv.set("mute", role == E_ORV_PLAYER_ROLE_SUB);
+    mMuted = role == E_ORV_PLAYER_ROLE_SUB;
+    if (hasCore()) mMpv.set("mute", *mMuted);
     mVideo.setVisible(role != E_ORV_PLAYER_ROLE_BACKGROUND);
     return android::NO_ERROR;
 }
