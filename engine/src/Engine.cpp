@@ -13,10 +13,15 @@ namespace android {
 TarnPlayer::Engine::Engine(orvtarn::Notifier::Deliver deliver)
     : notifier(std::move(deliver)),
       video([this] { events.onFrame(); },
-            [this](uint64_t frame, int64_t due) { return frameTiming.begin(frame, due); }),
+            [this](uint64_t frame, int64_t due) { return frameTiming.begin(frame, due); },
+            [this](bool onWindow, const std::function<void()>& change) {
+                outputChange.run(onWindow, change);
+            }),
       frameTiming(mpv, state, video),
       media(mpv, state, notifier),
       events(mpv, state, video, notifier, media, frameTiming),
+      decoding(mpv, orvtarn::hardwareDecoder()),
+      outputChange(mpv, state, events, decoding),
       loader(mpv, state, video, media, protocol),
       transport(mpv, state, events),
       seeker(mpv, state, notifier, events, transport),
@@ -24,7 +29,7 @@ TarnPlayer::Engine::Engine(orvtarn::Notifier::Deliver deliver)
       stepper(mpv, state, seeker, transport, events),
       abRepeat(mpv, state),
       audio(mpv, video),
-      videoFilters(mpv),
+      videoFilters(mpv, decoding),
       tracks(mpv, state, loader, seeker, videoFilters),
       subtitles(mpv, state, tracks),
       bytes(mpv, state, loader, seeker),

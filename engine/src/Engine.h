@@ -10,6 +10,7 @@
 #include "base/EngineLog.h"
 #include "core/EventLoop.h"
 #include "core/FrameTiming.h"
+#include "core/HardwareDecoder.h"
 #include "core/MpvHandle.h"
 #include "core/Notifier.h"
 #include "core/OpenMedia.h"
@@ -18,8 +19,10 @@
 #include "playback/AbRepeat.h"
 #include "playback/Audio.h"
 #include "playback/BytePosition.h"
+#include "playback/HardwareDecoding.h"
 #include "playback/Loader.h"
 #include "playback/MediaMetaData.h"
+#include "playback/OutputChange.h"
 #include "playback/Parameters.h"
 #include "playback/Seeker.h"
 #include "playback/Speed.h"
@@ -96,6 +99,8 @@ private:
     orvtarn::FrameTiming frameTiming;
     orvtarn::OpenMedia media;
     orvtarn::EventLoop events;
+    orvtarn::HardwareDecoding decoding;
+    orvtarn::OutputChange outputChange;
 
 public:
     orvtarn::Loader loader;

@@ -66,10 +66,12 @@ status_t TarnPlayer::setDataSource(int fd, int64_t offset, int64_t length) {
 }
 
 status_t TarnPlayer::setVideoSurfaceTexture(const sp<IGraphicBufferProducer>& bufferProducer) {
-    return mEngine->status(__func__, [&] {
+    const auto set = [&] {
         mEngine->video.setProducer(bufferProducer);
         return status_t{NO_ERROR};
-    });
+    };
+    return orvtarn::VideoOutput::hasWindow(bufferProducer) ? mEngine->statusWithCore(__func__, set)
+                                                           : mEngine->status(__func__, set);
 }
 
 status_t TarnPlayer::prepare() {

@@ -82,7 +82,8 @@ protected:
     const std::string file = mediaPath(
         std::string(testing::UnitTest::GetInstance()->current_test_info()->name()) + ".pcm");
     MpvHandle mpv;
-    VideoOutput video{[] {}, [](uint64_t, int64_t) { return int64_t{0}; }};
+    VideoOutput video{[] {}, [](uint64_t, int64_t) { return int64_t{0}; },
+                      [](bool, const std::function<void()>& change) { change(); }};
     Audio audio{mpv, video};
 };
 

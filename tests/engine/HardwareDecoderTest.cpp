@@ -43,5 +43,14 @@ TEST_F(HardwareDecoderTest, IsNvdecWithItsDriver) {
     EXPECT_STREQ("nvdec-copy", hardwareDecoder(devices));
 }
 
+TEST(DirectDecoderTest, CopiesNothingAndHasItsInterop) {
+    EXPECT_EQ("vaapi", directDecoder("vaapi-copy"));
+    EXPECT_STREQ("vaapi", decoderInterop("vaapi-copy"));
+    EXPECT_EQ("nvdec", directDecoder("nvdec-copy"));
+    EXPECT_STREQ("cuda", decoderInterop("nvdec-copy"));
+    EXPECT_EQ("no", directDecoder("no"));
+    EXPECT_STREQ("no", decoderInterop("no"));
+}
+
 }  // namespace
 }  // namespace orvtarn

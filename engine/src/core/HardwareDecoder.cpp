@@ -20,4 +20,13 @@ const char* hardwareDecoder(const std::string& devices) {
     return isThere(devices + "/dri/renderD*") ? "vaapi-copy" : "no";
 }
 
+std::string directDecoder(const std::string& copying) {
+    return copying.substr(0, copying.rfind("-copy"));
+}
+
+const char* decoderInterop(const std::string& copying) {
+    if (copying == "nvdec-copy") return "cuda";
+    return copying == "vaapi-copy" ? "vaapi" : "no";
+}
+
 }  // namespace orvtarn

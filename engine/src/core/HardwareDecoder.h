@@ -11,4 +11,10 @@ namespace orvtarn {
 // where there is none; mpv decodes in software what the decoder cannot do.
 const char* hardwareDecoder(const std::string& devices = "/dev");
 
+// The same decoder without the copy, for pictures that OpenGL draws.
+std::string directDecoder(const std::string& copying);
+// What hands its pictures to OpenGL, as mpv's option "gpu-hwdec-interop" has it:
+// by itself mpv would try all, and some complain.
+const char* decoderInterop(const std::string& copying);
+
 }  // namespace orvtarn

@@ -45,6 +45,9 @@ const Option kWished[] = {
     {"load-stats-overlay", "no"},
     {"ytdl", "no"},
     {"osd-level", "0"},
+    // Colours are left to the filters, as by software; and what mpv 0.40 does more on
+    // Mesa 25 comes out black now and then.
+    {"gpu-dumb-mode", "yes"},
     {"audio-display", "no"},
     {"input-default-bindings", "no"},
     {"sub-auto", "no"},
@@ -112,6 +115,7 @@ bool setOptions(mpv_handle* mpv) {
     }
     for (const Option& option : kWished) setWished(mpv, option);
     setWished(mpv, {"hwdec", hardwareDecoder()});
+    setWished(mpv, {"gpu-hwdec-interop", decoderInterop(hardwareDecoder())});
     setWished(mpv, {"ao", audioOutputs().c_str()});
     setNetwork(mpv);
     return true;

@@ -1,8 +1,9 @@
 // SPDX-License-Identifier: Apache-2.0
 #include "core/VideoOutput.h"
 
+#include <mpv/render.h>
+
 #include <chrono>
-#include <utility>
 
 #include "base/EngineLog.h"
 #include "base/ThreadName.h"
@@ -20,52 +21,52 @@ constexpr milliseconds kSizePollInterval{100};
 }  // namespace
 
 bool VideoOutput::create(mpv_handle* mpv) {
-    mpv_render_param parameters[] = {
-        {MPV_RENDER_PARAM_API_TYPE, const_cast<char*>(MPV_RENDER_API_TYPE_SW)},
-        {MPV_RENDER_PARAM_INVALID, nullptr},
-    };
-    const int error = mpv_render_context_create(&mContext, mpv, parameters);
-    if (error < 0) return refused("VideoOutput", mpv_error_string(error));
     // mpv calls at once, and then when it has a picture.
-    mpv_render_context_set_update_callback(mContext, onUpdate, this);
+    if (!mTarget.create(mpv)) return false;
     std::lock_guard<std::mutex> lock(mWakeMutex);
     mMayStart = true;
     return true;
 }
 
-void VideoOutput::destroy() {
-    if (mContext != nullptr) stopRendering();
-    mProducer.clear();
+// Pictures begin it. A window does, too: it may turn out not to be drawn on, which
+// whoever offers it is to see at once.
+void VideoOutput::startThread() {
+    if (mMayStart && !mQuit && !mThread.joinable()) mThread = std::thread(&VideoOutput::run, this);
 }
 
-void VideoOutput::stopRendering() {
-    mpv_render_context_set_update_callback(mContext, nullptr, nullptr);
+bool VideoOutput::hasWindow(const Producer& producer) {
+    return producer != nullptr && producer->nativeWindow() != nullptr;
+}
+
+void VideoOutput::destroy() {
     {
         std::lock_guard<std::mutex> lock(mWakeMutex);
         mQuit = true;
+        mWanted = nullptr;
         mWakeUp.notify_one();
+        mAttached.notify_all();
     }
-    if (mThread.joinable()) mThread.join();
-    dropHeld();
-    mpv_render_context_free(mContext);
-    mContext = nullptr;
+    if (mThread.joinable()) {
+        mThread.join();
+    } else {
+        mTarget.destroy();
+    }
 }
 
-void VideoOutput::setProducer(const android::sp<android::IGraphicBufferProducer>& producer) {
-    {
-        std::lock_guard<std::mutex> lock(mSurfaceMutex);
-        if (mProducer == producer) return;
-        dropHeld();
-        mProducer = producer;
-    }
-    wake(true);
+void VideoOutput::setProducer(const Producer& producer) {
+    std::unique_lock<std::mutex> lock(mWakeMutex);
+    if (mWanted == producer) return;
+    mWanted = producer;
+    const uint64_t count = ++mWantedCount;
+    mWoken = mRedraw = true;
+    mWakeUp.notify_one();
+    if (hasWindow(producer)) startThread();
+    if (!mThread.joinable()) return;
+    mAttached.wait(lock, [&] { return mAttachedCount >= count || mQuit; });
 }
 
 void VideoOutput::setVisible(bool visible) {
-    {
-        std::lock_guard<std::mutex> lock(mSurfaceMutex);
-        mVisible = visible;
-    }
+    mVisible = visible;
     wake(true);
 }
 
@@ -78,15 +79,11 @@ void VideoOutput::setFrameTime(uint64_t frame, int64_t microseconds) {
     wake(false);
 }
 
-void VideoOutput::onUpdate(void* self) {
-    auto& output = *static_cast<VideoOutput*>(self);
-    output.wake(false);
-    output.startRendering();
-}
-
-void VideoOutput::startRendering() {
+void VideoOutput::onUpdate() {
     std::lock_guard<std::mutex> lock(mWakeMutex);
-    if (mMayStart && !mThread.joinable()) mThread = std::thread(&VideoOutput::run, this);
+    startThread();
+    mWoken = true;
+    mWakeUp.notify_one();
 }
 
 void VideoOutput::wake(bool redraw) {
@@ -108,27 +105,51 @@ void VideoOutput::run() {
         } else {
             mWakeUp.wait(lock, woken);
         }
-        if (mQuit) return;
+        if (mQuit) break;
         bool redraw = mRedraw || retry;
         const bool isWoken = mWoken;
         mWoken = mRedraw = false;
         const uint64_t toldFrame = mToldFrame;
         const int64_t toldTimeUs = mToldTimeUs;
+        const uint64_t wantedCount = mWantedCount;
+        const Producer wanted = mWanted;
+        const bool isAnother = wantedCount != mAttachedCount;
         lock.unlock();
+        if (isAnother) attach(wanted);
+        redraw = attendWindow() || redraw;
         deliverHeld(toldFrame, toldTimeUs);
         const bool newFrame = isWoken && takeFrame();
-        if (!newFrame && !redraw) redraw = sizeChanged();
+        if (!newFrame && !redraw) redraw = isBehind();
         retry = (newFrame || (redraw && mHasPicture)) && !render(newFrame);
-        showsPicture = mHasPicture && hasSurface();
+        showsPicture = mHasPicture && isShown();
         lock.lock();
+        mAttachedCount = wantedCount;
+        mAttached.notify_all();
     }
+    lock.unlock();
+    dropHeld();
+    mTarget.destroy();
+}
+
+void VideoOutput::attach(const Producer& producer) {
+    dropHeld();
+    mTarget.attach(producer);
+}
+
+// Whether its picture is to be drawn anew.
+bool VideoOutput::attendWindow() {
+    const bool closes = mTarget.isWindowClosing();
+    if (closes) attach(nullptr);
+    return mTarget.takeRedraw() || closes;
 }
 
 bool VideoOutput::takeFrame() {
-    if ((mpv_render_context_update(mContext) & MPV_RENDER_UPDATE_FRAME) == 0) return false;
+    mpv_render_context* const context = mTarget.context();
+    if (context == nullptr) return false;
+    if ((mpv_render_context_update(context) & MPV_RENDER_UPDATE_FRAME) == 0) return false;
     mpv_render_frame_info info = {};
     mpv_render_param parameter = {MPV_RENDER_PARAM_NEXT_FRAME_INFO, &info};
-    if (mpv_render_context_get_info(mContext, parameter) < 0) return false;
+    if (mpv_render_context_get_info(context, parameter) < 0) return false;
     if ((info.flags & MPV_RENDER_FRAME_INFO_PRESENT) == 0) return false;
     const bool isAnother = (info.flags & MPV_RENDER_FRAME_INFO_REDRAW) == 0 || !mHasPicture;
     if (isAnother) {
@@ -142,123 +163,74 @@ bool VideoOutput::takeFrame() {
 
 // False when the picture could not be drawn yet and is to be tried again.
 bool VideoOutput::render(bool newFrame) {
-    android::status_t status = android::NO_ERROR;
-    {
-        std::lock_guard<std::mutex> lock(mSurfaceMutex);
-        const bool shown = mProducer != nullptr && mVisible;
-        dropHeld();
-        status = shown ? draw() : android::NO_INIT;
-        if (mHeld) return true;
-        if (status != android::NO_ERROR && newFrame) {
-            skip();
-            if (status == android::WOULD_BLOCK) mMissed++;
-        }
+    dropHeld();
+    const android::status_t status = isShown() ? draw() : android::NO_INIT;
+    if (mHolds) return true;
+    if (status != android::NO_ERROR && newFrame) {
+        mTarget.skip();
+        if (status == android::WOULD_BLOCK) mMissed++;
     }
     if (status == android::NOT_ENOUGH_DATA) return false;
     mOnFrame();
     return status != android::WOULD_BLOCK;
 }
 
-VideoOutput::Size VideoOutput::wantedSize() const {
-    Size size;
-    if (mProducer->getDefaultSize(&size.width, &size.height) != android::NO_ERROR)
-        return mVideoSize;
+// Whether the picture on the surface is not the one that belongs there.
+bool VideoOutput::isBehind() {
+    return isShown() && (!(wantedSize() == mDrawnSize) || mTarget.drawer().isBehind());
+}
+
+FrameSize VideoOutput::wantedSize() {
+    const FrameSize size = mTarget.drawer().wantedSize();
     return size.width > 0 && size.height > 0 ? size : mVideoSize.load();
 }
 
-bool VideoOutput::hasSurface() {
-    std::lock_guard<std::mutex> lock(mSurfaceMutex);
-    return mProducer != nullptr && mVisible;
-}
-
-bool VideoOutput::sizeChanged() {
-    std::lock_guard<std::mutex> lock(mSurfaceMutex);
-    return mProducer != nullptr && mVisible && !(wantedSize() == mDrawnSize);
-}
-
 android::status_t VideoOutput::draw() {
-    const Size size = wantedSize();
+    const FrameSize size = wantedSize();
     // The first frame may be here before the word of the video's size.
-    if (size == Size()) return android::NOT_ENOUGH_DATA;
-    android::IGraphicBufferProducer::PixelBuffer buffer = {};
-    android::status_t status = mProducer->dequeueBuffer(size.width, size.height, &buffer);
-    if (status != android::NO_ERROR) return status;
-    status = drawInto(buffer);
-    if (status != android::NO_ERROR) {
-        mProducer->cancelBuffer(buffer.slot);
-        return status;
+    if (size == FrameSize()) return android::NOT_ENOUGH_DATA;
+    const android::status_t status = mTarget.drawer().draw(size);
+    if (status == android::UNKNOWN_ERROR && mTarget.isOnWindow()) {
+        mTarget.fallBack("a frame could not be drawn");
+        return android::NO_INIT;
     }
+    if (status != android::NO_ERROR) return status;
     mDrawnSize = size;
-    if (mIsTimed) return queue(buffer.slot);
-    mHeld = buffer.slot;
+    mHolds = !mIsTimed;
+    if (mIsTimed) queue();
     return android::NO_ERROR;
 }
 
-android::status_t VideoOutput::queue(int slot) {
-    const android::status_t status = mProducer->queueBuffer(slot, *mTimeUs);
-    if (status == android::NO_ERROR) mDelivered++;
-    return status;
+void VideoOutput::queue() {
+    if (mTarget.drawer().deliver(*mTimeUs) == android::NO_ERROR) mDelivered++;
 }
 
 void VideoOutput::deliverHeld(uint64_t frame, int64_t microseconds) {
-    {
-        std::lock_guard<std::mutex> lock(mSurfaceMutex);
-        if (mIsTimed || frame != mFrame) return;
-        mTimeUs = microseconds;
-        mIsTimed = true;
-        if (!queueHeld()) return;
-    }
-    mOnFrame();
+    if (mIsTimed || frame != mFrame) return;
+    mTimeUs = microseconds;
+    mIsTimed = true;
+    if (queueHeld()) mOnFrame();
 }
 
 // The frame that follows is here, and the answer is not.
 void VideoOutput::releaseHeld() {
-    {
-        std::lock_guard<std::mutex> lock(mSurfaceMutex);
-        if (!mTimeUs || !queueHeld()) return;
-    }
-    mOnFrame();
+    if (mTimeUs && queueHeld()) mOnFrame();
 }
 
 // Whether there was one.
 bool VideoOutput::queueHeld() {
     // The media may be closed by now.
     if (!mHasPicture) dropHeld();
-    if (!mHeld) return false;
-    queue(*std::exchange(mHeld, std::nullopt));
+    if (!mHolds) return false;
+    mHolds = false;
+    queue();
     return true;
 }
 
 // The frame is drawn anew, or nobody wants it any more.
 void VideoOutput::dropHeld() {
-    if (mHeld) mProducer->cancelBuffer(*mHeld);
-    mHeld.reset();
-}
-
-android::status_t VideoOutput::drawInto(
-    const android::IGraphicBufferProducer::PixelBuffer& buffer) {
-    int size[2] = {buffer.width, buffer.height};
-    size_t stride = buffer.stride;
-    mpv_render_param parameters[] = {
-        {MPV_RENDER_PARAM_SW_SIZE, size},
-        {MPV_RENDER_PARAM_SW_FORMAT, const_cast<char*>("bgr0")},
-        {MPV_RENDER_PARAM_SW_STRIDE, &stride},
-        {MPV_RENDER_PARAM_SW_POINTER, buffer.pixels},
-        {MPV_RENDER_PARAM_INVALID, nullptr},
-    };
-    const int error = mpv_render_context_render(mContext, parameters);
-    if (error >= 0) return android::NO_ERROR;
-    return failed(android::UNKNOWN_ERROR, "VideoOutput", mpv_error_string(error));
-}
-
-// Reports to mpv that the frame is done with, without drawing it.
-void VideoOutput::skip() {
-    int yes = 1;
-    mpv_render_param parameters[] = {
-        {MPV_RENDER_PARAM_SKIP_RENDERING, &yes},
-        {MPV_RENDER_PARAM_INVALID, nullptr},
-    };
-    mpv_render_context_render(mContext, parameters);
+    if (mHolds) mTarget.drawer().cancel();
+    mHolds = false;
 }
 
 }  // namespace orvtarn

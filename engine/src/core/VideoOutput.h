@@ -2,7 +2,7 @@
 #pragma once
 
 #include <gui/IGraphicBufferProducer.h>
-#include <mpv/render.h>
+#include <mpv/client.h>
 #include <stdint.h>
 #include <utils/StrongPointer.h>
 
@@ -13,13 +13,18 @@
 #include <optional>
 #include <thread>
 
+#include "core/DrawTarget.h"
+
 namespace orvtarn {
 
-// Draws mpv's video frames into the surface's buffers, on a thread of its
-// own, the only one that renders, which begins with the first picture. Never holds up playback: a
-// surface without a free buffer misses a frame, and gets the newest one when it has.
+// Has mpv's video frames drawn on the surface when it is time, on a thread of its
+// own, the only one that renders, which begins with the first picture or window. Never
+// holds up playback: a surface without a free buffer misses a frame, and gets the newest
+// one when it has.
 class VideoOutput {
 public:
+    using Producer = DrawTarget::Producer;
+
     struct Counters {
         uint64_t delivered;  // frames handed to the surface
         uint64_t missed;     // frames that found no free buffer
@@ -32,8 +37,16 @@ public:
     // and without one it is dropped. Both are called on the rendering thread, which
     // must not ask mpv.
     using FrameTime = std::function<std::optional<int64_t>(uint64_t frame, int64_t due)>;
-    VideoOutput(std::function<void()> onFrame, FrameTime frameTime)
-        : mOnFrame(std::move(onFrame)), mFrameTime(std::move(frameTime)) {}
+    // exchange: see DrawTarget.
+    VideoOutput(std::function<void()> onFrame, FrameTime frameTime, DrawTarget::Exchange exchange)
+        : mOnFrame(std::move(onFrame)),
+          mFrameTime(std::move(frameTime)),
+          mExchange(std::move(exchange)),
+          mTarget([this] { onUpdate(); },
+                  [this](bool onWindow, const std::function<void()>& change) {
+                      mHasPicture = false;
+                      mExchange(onWindow, change);
+                  }) {}
     ~VideoOutput() { destroy(); }
 
     // Once; the surface may be there before.
@@ -41,40 +54,36 @@ public:
     // Before mpv goes, and quicker when no media is open.
     void destroy();
 
+    // Whether the surface is to be set after create: it is then found out at once
+    // whether its window can be drawn on.
+    static bool hasWindow(const Producer& producer);
     // Null for none. No frame goes to an earlier surface afterwards; the new
-    // one gets the picture at once, paused or not.
-    void setProducer(const android::sp<android::IGraphicBufferProducer>& producer);
+    // one gets the picture at once, paused or not. Waits for the rendering thread.
+    void setProducer(const Producer& producer);
     // Any thread.
     void setFrameTime(uint64_t frame, int64_t microseconds);
     // Whether frames go to the surface at all.
     void setVisible(bool visible);
-    void setVideoSize(int width, int height) { mVideoSize = {width, height}; }
+    void setVideoSize(int width, int height) { mVideoSize = FrameSize{width, height}; }
     // The media is closed: nothing is drawn again before the next frame.
     void forgetPicture() { mHasPicture = false; }
 
     Counters counters() const { return {mDelivered, mMissed}; }
 
 private:
-    struct Size {
-        int width = 0;
-        int height = 0;
-        bool operator==(Size other) const { return width == other.width && height == other.height; }
-    };
-
-    static void onUpdate(void* self);
+    void startThread();
+    void onUpdate();
     void wake(bool redraw);
-    void startRendering();
-    void stopRendering();
     void run();
+    void attach(const Producer& producer);
+    bool attendWindow();
     bool takeFrame();
     bool render(bool newFrame);
-    Size wantedSize() const;
-    bool hasSurface();
-    bool sizeChanged();
     android::status_t draw();
-    android::status_t drawInto(const android::IGraphicBufferProducer::PixelBuffer& buffer);
-    void skip();
-    android::status_t queue(int slot);
+    FrameSize wantedSize();
+    bool isShown() const { return mTarget.hasSurface() && mVisible && !mTarget.isHeld(); }
+    bool isBehind();
+    void queue();
     void deliverHeld(uint64_t frame, int64_t microseconds);
     void dropHeld();
     bool queueHeld();
@@ -82,7 +91,7 @@ private:
 
     const std::function<void()> mOnFrame;
     const FrameTime mFrameTime;
-    mpv_render_context* mContext = nullptr;
+    const DrawTarget::Exchange mExchange;
     std::thread mThread;
 
     std::mutex mWakeMutex;
@@ -93,18 +102,21 @@ private:
     bool mQuit = false;
     uint64_t mToldFrame = 0;
     int64_t mToldTimeUs = 0;
+    Producer mWanted;
+    uint64_t mWantedCount = 0;    // of producers that were set
+    uint64_t mAttachedCount = 0;  // of those that the rendering thread has taken up
+    std::condition_variable mAttached;
 
-    // Held while a frame is drawn.
-    std::mutex mSurfaceMutex;
-    android::sp<android::IGraphicBufferProducer> mProducer;
-    bool mVisible = true;
-    Size mDrawnSize;
+    // The rendering thread's.
+    DrawTarget mTarget;
+    FrameSize mDrawnSize;
     uint64_t mFrame = 0;  // mpv's newest
     std::optional<int64_t> mTimeUs;
-    bool mIsTimed = false;     // else the time is what is expected
-    std::optional<int> mHeld;  // the slot of a drawn frame that is not timed
+    bool mIsTimed = false;  // else the time is what is expected
+    bool mHolds = false;    // a drawn frame that is not timed
 
-    std::atomic<Size> mVideoSize{Size()};
+    std::atomic<bool> mVisible{true};
+    std::atomic<FrameSize> mVideoSize{FrameSize()};
     std::atomic<bool> mHasPicture{false};
     std::atomic<uint64_t> mDelivered{0};
     std::atomic<uint64_t> mMissed{0};

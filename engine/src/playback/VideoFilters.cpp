@@ -65,6 +65,14 @@ double peakLuminance(double ofMpv) {
     return peak < kUnknownPeak - 1 ? peak : 0;
 }
 
+// mpv goes on to take what was hybrid log-gamma as scene light, whatever became of
+// it; OpenGL would make it darker.
+std::string filterChain(const std::string& graph, const PictureTraits& traits) {
+    if (graph.empty()) return graph;
+    const bool wasSceneLight = traits.transfer == AVCOL_TRC_ARIB_STD_B67;
+    return "lavfi=[" + graph + "]" + (wasSceneLight ? ",format=light=display" : "");
+}
+
 }  // namespace
 
 void VideoFilters::onOpened() {
@@ -122,7 +130,8 @@ void VideoFilters::keepChroma() {
 bool VideoFilters::apply() {
     const std::string graph = pictureFilters(mTraits);
     if (graph == mGraph) return false;
-    const int error = mMpv.set("vf", graph.empty() ? graph : "lavfi=[" + graph + "]");
+    mDecoding.setFiltered(!graph.empty());
+    const int error = mMpv.set("vf", filterChain(graph, mTraits));
     if (error < 0) {
         ALOGW("picture: mpv refuses the filters %s: %s", graph.c_str(), mpv_error_string(error));
         return false;

@@ -8,6 +8,7 @@
 
 #include "base/PictureFilters.h"
 #include "core/MpvHandle.h"
+#include "playback/HardwareDecoding.h"
 
 namespace orvtarn {
 
@@ -16,7 +17,7 @@ namespace orvtarn {
 // filters follow the selected video track. Any thread.
 class VideoFilters {
 public:
-    explicit VideoFilters(MpvHandle& mpv) : mMpv(mpv) {}
+    VideoFilters(MpvHandle& mpv, HardwareDecoding& decoding) : mMpv(mpv), mDecoding(decoding) {}
 
     // Media are open and mpv is about to choose their tracks: what the container
     // says of the track to come is acted on before its first picture.
@@ -33,6 +34,7 @@ private:
     bool apply();
 
     MpvHandle& mMpv;
+    HardwareDecoding& mDecoding;
     std::mutex mMutex;
     PictureTraits mTraits;  // of the selected track, as far as they were seen
     std::string mGraph;     // that mpv has

@@ -1,10 +1,12 @@
 // SPDX-License-Identifier: Apache-2.0
 #pragma once
 
+#include <gui/NativeWindow.h>
 #include <stddef.h>
 #include <stdint.h>
 #include <utils/Errors.h>
 #include <utils/RefBase.h>
+#include <utils/StrongPointer.h>
 
 namespace android {
 
@@ -31,6 +33,10 @@ public:
     // timestampUs: the frame's media time. BAD_VALUE for a slot not dequeued.
     virtual status_t queueBuffer(int slot, int64_t timestampUs) = 0;
     virtual status_t cancelBuffer(int slot) = 0;
+
+    // The window that a producer may draw on instead; null for none. The desktop's
+    // alone: a television's producer has no such operation.
+    virtual sp<NativeWindow> nativeWindow() { return nullptr; }
 
 protected:
     virtual ~IGraphicBufferProducer() = default;

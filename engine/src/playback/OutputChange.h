@@ -1,0 +1,30 @@
+// SPDX-License-Identifier: Apache-2.0
+#pragma once
+
+#include <functional>
+
+#include "core/EventLoop.h"
+#include "core/MpvHandle.h"
+#include "core/PlayerState.h"
+#include "playback/HardwareDecoding.h"
+
+namespace orvtarn {
+
+// Changes the way in which pictures are drawn, also while media plays: mpv has no
+// video meanwhile, and shows the same place afterwards.
+class OutputChange {
+public:
+    OutputChange(MpvHandle& mpv, PlayerState& state, EventLoop& events, HardwareDecoding& decoding)
+        : mMpv(mpv), mState(state), mEvents(events), mDecoding(decoding) {}
+
+    // onWindow: the new way is by OpenGL. Blocks until mpv has video again.
+    void run(bool onWindow, const std::function<void()>& change);
+
+private:
+    MpvHandle& mMpv;
+    PlayerState& mState;
+    EventLoop& mEvents;
+    HardwareDecoding& mDecoding;
+};
+
+}  // namespace orvtarn
