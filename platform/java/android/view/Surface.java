@@ -27,7 +27,7 @@ public class Surface {
 
     // Also called from native code, by this signature. The cleaner keeps no hold on the object.
     @SuppressWarnings("this-escape")
-    private Surface(long producer) {
+    Surface(long producer) {
         long surface = nativeCreate(producer);
         if (surface == 0) {
             throw new OutOfMemoryError("native surface");

@@ -1,0 +1,104 @@
+// SPDX-License-Identifier: Apache-2.0
+package android.view;
+
+import java.awt.Component;
+import java.lang.ref.Cleaner;
+import java.lang.ref.Reference;
+
+/** The native half of a view's window. Thread-safe. */
+final class ViewWindow {
+    private static final Cleaner CLEANER = Cleaner.create();
+    private static final boolean KNOWS_WINDOWS = loadWindows();
+
+    // Lives as long as this object, so that no call can meet a window that is gone.
+    private final long mNative;
+    private long mSeen; // The one thread's that awaits frames.
+
+    ViewWindow(long id, boolean acceptsSoftwareGl) {
+        long window = SurfaceView.nativeCreate(id, acceptsSoftwareGl);
+        if (window == 0) {
+            throw new OutOfMemoryError("native window");
+        }
+        mNative = window;
+        CLEANER.register(this, () -> SurfaceView.nativeDestroy(window));
+    }
+
+    // The JDK's own, and what was built against it.
+    private static boolean loadWindows() {
+        try {
+            System.loadLibrary("jawt");
+            return true;
+        } catch (UnsatisfiedLinkError e) {
+            return false;
+        }
+    }
+
+    /** The desktop's number of a component's window; 0 when that cannot be known. */
+    static long idOf(Component component) {
+        try {
+            return KNOWS_WINDOWS ? SurfaceView.nativeWindowOf(component) : 0;
+        } catch (UnsatisfiedLinkError e) {
+            return 0; // Built without the JDK's headers.
+        }
+    }
+
+    /** A surface for the window; who cannot draw on it fills the buffers of the other one. */
+    Surface surface(Surface buffers) {
+        long producer = SurfaceView.nativeCreateProducer(mNative, buffers);
+        if (producer == 0) {
+            throw new OutOfMemoryError("native producer");
+        }
+        try {
+            return new Surface(producer);
+        } finally {
+            SurfaceView.nativeReleaseProducer(producer);
+            Reference.reachabilityFence(this);
+        }
+    }
+
+    boolean isDrawnByGpu() {
+        boolean isDrawn = SurfaceView.nativeIsDrawnByGpu(mNative);
+        Reference.reachabilityFence(this);
+        return isDrawn;
+    }
+
+    String describeDrawing() {
+        String description = SurfaceView.nativeDescribeDrawing(mNative);
+        Reference.reachabilityFence(this);
+        return description;
+    }
+
+    void redraw() {
+        SurfaceView.nativeRedraw(mNative);
+        Reference.reachabilityFence(this);
+    }
+
+    void hold(boolean held) {
+        SurfaceView.nativeHold(mNative, held);
+        Reference.reachabilityFence(this);
+    }
+
+    /** A frame that was drawn by software shows. */
+    void reportFrame(long timeNs) {
+        SurfaceView.nativeReportFrame(mNative, timeNs / 1000);
+        Reference.reachabilityFence(this);
+    }
+
+    /** Waits until nobody draws on the window any more. */
+    void close() {
+        SurfaceView.nativeClose(mNative);
+        Reference.reachabilityFence(this);
+    }
+
+    /** The media time of the next frame in nanoseconds; -1 when none came in time. */
+    long awaitFrame(int timeoutMillis) {
+        long[] frame = new long[2];
+        SurfaceView.nativeAwaitFrame(mNative, mSeen, timeoutMillis, frame);
+        Reference.reachabilityFence(this);
+        if (frame[0] == 0) {
+            return -1;
+        }
+        mSeen = frame[0];
+        return frame[1] * 1000;
+    }
+}
