@@ -9,7 +9,7 @@ row() { printf '%-10s %-8s %s\n' "$@"; }
 
 check_machine() {
     local bad=0 check
-    for check in packages java libraries display fonts sound; do
+    for check in packages java libraries display graphics fonts sound; do
         "check_$check" || bad=1
     done
     return $bad
@@ -65,6 +65,15 @@ check_display() {
         row display ok "$DISPLAY"
     else
         row display none "without a display ./orv play plays in the terminal"
+    fi
+}
+
+# What the player looks at before it tries OpenGL.
+check_graphics() {
+    if [ -n "$(compgen -G '/dev/dri/renderD*')$(compgen -G '/dev/nvidiactl')$(compgen -G '/dev/dxg')" ]; then
+        row graphics ok "a graphics processor draws the window's pictures if OpenGL can use it"
+    else
+        row graphics none "no graphics processor: software draws the window's pictures"
     fi
 }
 

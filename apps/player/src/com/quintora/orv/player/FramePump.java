@@ -3,6 +3,7 @@ package com.quintora.orv.player;
 
 import android.media.Image;
 import android.media.ImageReader;
+import android.view.SurfaceView;
 import java.util.function.Consumer;
 
 /** Takes the frames that the player draws, on a thread of its own, and counts them. */
@@ -13,13 +14,9 @@ final class FramePump implements AutoCloseable {
     private final Thread thread = new Thread(this::run, "frames");
     private final Consumer<Image> screen;
 
-    // What the pump's thread is asked to do, and what it reports.
-    private volatile double framesPerSecond;
-    private volatile boolean jumped;
+    private final FrameCount count = new FrameCount();
     private boolean hidden; // Under the lock of this object.
-    private volatile long shown;
-    private volatile long dropped;
-    private volatile long firstFrameAt;
+    private volatile SurfaceView view; // That is drawn on in place of the reader's surface.
     private volatile boolean closed;
 
     /** The screen is called with each frame on the pump's thread, and must not keep it. */
@@ -36,40 +33,31 @@ final class FramePump implements AutoCloseable {
         thread.start();
     }
 
-    /** How many frames a second shall come; 0 when unknown, and then none is missed. */
-    void expect(double framesPerSecond) {
-        this.framesPerSecond = framesPerSecond;
-        jumped = true;
+    /** Also counts, and hides, the frames that are drawn on that view. */
+    void watch(SurfaceView watched) {
+        view = watched;
+        Thread watcher = new Thread(() -> countFramesOf(watched), "window frames");
+        watcher.setDaemon(true);
+        watcher.start();
     }
 
-    /** The next frame may have any time, as after a seek. */
-    void expectJump() {
-        jumped = true;
+    FrameCount count() {
+        return count;
     }
 
     /** Of the frames that come meanwhile only the last is shown, afterwards. */
     synchronized void hide(boolean hide) {
         hidden = hide;
         notifyAll();
-    }
-
-    long shown() {
-        return shown;
-    }
-
-    long dropped() {
-        return dropped;
-    }
-
-    /** When the first frame came, as System.currentTimeMillis; 0 before. */
-    long firstFrameAt() {
-        return firstFrameAt;
+        if (view != null) {
+            view.hold(hide);
+        }
     }
 
     private void run() {
         try {
             while (!closed) {
-                takeFrames(new MissedFrames(framesPerSecond), dropped, framesPerSecond);
+                takeFrame();
             }
         } catch (InterruptedException | IllegalStateException e) {
             // Both mean that the reader was closed while this thread waited.
@@ -77,26 +65,25 @@ final class FramePump implements AutoCloseable {
         }
     }
 
-    /** Goes on while that many frames a second are expected. */
-    private void takeFrames(MissedFrames missed, long droppedBefore, double rate)
-            throws InterruptedException {
-        while (!closed && rate == framesPerSecond) {
-            try (Image image = reader.awaitImage(WAIT_MS)) {
-                if (image == null || isOvertaken()) {
-                    continue;
-                }
-                if (firstFrameAt == 0) {
-                    firstFrameAt = System.currentTimeMillis();
-                }
-                if (jumped) {
-                    jumped = false;
-                    missed.jump();
-                }
-                missed.add(image.getTimestamp());
-                dropped = droppedBefore + missed.count();
-                shown = shown + 1;
+    private void takeFrame() throws InterruptedException {
+        try (Image image = reader.awaitImage(WAIT_MS)) {
+            if (image != null && !isOvertaken()) {
+                count.add(image.getTimestamp());
                 screen.accept(image);
             }
+        }
+    }
+
+    private void countFramesOf(SurfaceView view) {
+        try {
+            while (!closed) {
+                long timeNs = view.awaitFrame(WAIT_MS);
+                if (timeNs >= 0) {
+                    count.add(timeNs);
+                }
+            }
+        } catch (InterruptedException e) {
+            Thread.currentThread().interrupt();
         }
     }
 
@@ -105,11 +92,11 @@ final class FramePump implements AutoCloseable {
         if (!hidden) {
             return false;
         }
-        long count = reader.getFrameCount();
+        long before = reader.getFrameCount();
         while (hidden && !closed) {
             wait();
         }
-        return closed || reader.getFrameCount() > count;
+        return closed || reader.getFrameCount() > before;
     }
 
     @Override

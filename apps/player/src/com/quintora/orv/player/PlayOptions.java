@@ -22,6 +22,8 @@ public final class PlayOptions {
     PcmMediaInfo pcm;
     int volume;
     boolean noWindow;
+    boolean noGpu;
+    boolean gpu;
     boolean stats;
 
     /** Those that these arguments of play give, which are not checked further. */
@@ -55,6 +57,12 @@ public final class PlayOptions {
                         .description("The file is raw PCM, as in 44100:2:s16le.")
                         .build());
         arguments.addFlag("--no-window", value -> noWindow = value, "Play in the terminal.");
+        arguments.addFlag(
+                "--no-gpu",
+                value -> noGpu = value,
+                "Draw the window's pictures by software, not by the graphics processor.");
+        arguments.addFlag(
+                "--gpu", value -> gpu = value, "Draw by OpenGL also where that is only software.");
         arguments.addFlag(
                 "--stats",
                 value -> stats = value,
@@ -123,6 +131,14 @@ public final class PlayOptions {
     /** 0 to 100. */
     public int volume() {
         return volume;
+    }
+
+    /** When the graphics processor draws the pictures; the last word is --no-gpu's. */
+    public GpuUse gpuUse() {
+        if (noGpu) {
+            return GpuUse.NEVER;
+        }
+        return gpu ? GpuUse.ALWAYS : GpuUse.USUAL;
     }
 
     public boolean reportsStats() {

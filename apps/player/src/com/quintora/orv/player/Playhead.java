@@ -110,7 +110,7 @@ final class Playhead {
 
     private synchronized void end() {
         moving = false;
-        frames.expectJump();
+        frames.count().expectJump();
         frames.hide(false);
         // Otherwise the media failed, or was released.
         if (playsAfterwards && RESTING.contains(player.getState())) {

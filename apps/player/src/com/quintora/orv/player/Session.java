@@ -2,6 +2,8 @@
 package com.quintora.orv.player;
 
 import android.media.Image;
+import android.view.Surface;
+import android.view.SurfaceView;
 import com.quintora.mmp.ChannelStreamSource;
 import com.quintora.mmp.MediaException;
 import com.quintora.mmp.OrvMediaPlayer;
@@ -29,6 +31,7 @@ public final class Session implements AutoCloseable {
     private final CountDownLatch ended = new CountDownLatch(1);
     private final Stopwatch stopwatch = new Stopwatch();
     private volatile double frameRate;
+    private volatile boolean isOnView;
     private volatile Failure failure;
 
     /** The screen is called with each frame, on a thread of its own, and must not keep it. */
@@ -50,22 +53,49 @@ public final class Session implements AutoCloseable {
 
     /** Whether anybody sees the frames: otherwise none is drawn, and afterwards the newest is. */
     public void setWatched(boolean watched) {
-        frames.expectJump();
+        frames.count().expectJump();
         player.engine().setRole(watched ? PlayerRole.MAIN : PlayerRole.BACKGROUND);
+    }
+
+    /**
+     * Has the graphics processor draw on that view, whose surface is there, instead of giving frames
+     * to the screen. To be asked before the media is opened.
+     *
+     * @return false when it does not: frames go to the screen
+     */
+    public boolean drawOn(SurfaceView view) {
+        player.setSurface(view.getHolder().getSurface());
+        isOnView = view.isDrawnByGpu();
+        if (isOnView) {
+            frames.watch(view);
+        } else {
+            player.setSurface(frames.reader().getSurface());
+        }
+        return isOnView;
+    }
+
+    /** Goes on with the surface that such a view has now; without one, the picture waits. */
+    public void drawOnNewSurfaceOf(SurfaceView view) {
+        Surface surface = view.getHolder().getSurface();
+        if (surface != null && surface.isValid()) {
+            player.setSurface(surface);
+        }
     }
 
     /** Opens the media and brings it to where it shall begin. */
     public void open() throws Failure {
         try {
             setSource();
-            player.setSurface(frames.reader().getSurface());
+            if (!isOnView) {
+                player.setSurface(frames.reader().getSurface());
+            }
             frames.start();
             player.prepare();
             Silence.explain(player);
             frameRate = player.tracks().currentVideo().map(VideoTrack::frameRate).orElse(0.0);
             playhead.open();
             goToStart();
-            frames.expect(frameRate);
+            frames.count().expect(frameRate);
             applyOptions();
         } catch (IOException | SecurityException | IllegalStateException e) {
             throw new Failure(e.getMessage(), e);
@@ -76,7 +106,7 @@ public final class Session implements AutoCloseable {
         if (options.section != null) {
             new SectionRepeater(player, options.section).start();
         }
-        frames.expectJump();
+        frames.count().expectJump();
         stopwatch.start(player.getCurrentPosition());
         player.start();
     }
@@ -120,9 +150,9 @@ public final class Session implements AutoCloseable {
     public void setSpeed(double speed) throws Failure {
         try {
             // At other speeds frames are left out on purpose.
-            frames.expect(0);
+            frames.count().expect(0);
             player.trickPlay().setSpeed(speed);
-            frames.expect(speed == 1 ? frameRate : 0);
+            frames.count().expect(speed == 1 ? frameRate : 0);
         } catch (IllegalArgumentException e) {
             throw new Failure(e.getMessage(), e);
         }
@@ -171,8 +201,8 @@ public final class Session implements AutoCloseable {
                 playhead.isPlaying(),
                 player.trickPlay().getSpeed(),
                 player.trickPlay().getBufferedPercent(),
-                frames.shown(),
-                frames.dropped());
+                frames.count().shown(),
+                frames.count().dropped());
     }
 
     /** Reaches zero when the media has come to its end or has failed. */

@@ -23,13 +23,13 @@ final class Stopwatch {
 
     String report(FramePump frames) {
         StringBuilder text = new StringBuilder();
-        if (frames.firstFrameAt() > 0) {
+        if (frames.count().firstFrameAt() > 0) {
             long started = ManagementFactory.getRuntimeMXBean().getStartTime();
             text.append(
                     String.format(
                             Locale.ROOT,
                             "first frame %.2f s after the JVM's start; ",
-                            (frames.firstFrameAt() - started) / 1000.0));
+                            (frames.count().firstFrameAt() - started) / 1000.0));
         }
         if (endNs > 0) {
             text.append(
@@ -40,6 +40,6 @@ final class Stopwatch {
                             (endNs - startNs) / 1e9));
         }
         return text
-                + String.format("%d frames shown, %d dropped", frames.shown(), frames.dropped());
+                + String.format("%d frames shown, %d dropped", frames.count().shown(), frames.count().dropped());
     }
 }

@@ -1,6 +1,7 @@
 // SPDX-License-Identifier: Apache-2.0
 package com.quintora.orv.player.window;
 
+import android.view.SurfaceView;
 import com.quintora.mmp.MediaException;
 import com.quintora.mmp.OrvMediaPlayer;
 import com.quintora.mmp.PlayerListener;
@@ -57,11 +58,33 @@ final class Conductor implements Controls {
     }
 
     private void openAndPlay() throws Failure {
+        chooseWay();
         session.open();
         details.read();
         EventQueue.invokeLater(() -> stage.showMedia(details, volume));
         session.start();
         workers.begin(() -> failOn(this::poll));
+    }
+
+    private void chooseWay() throws Failure {
+        try {
+            stage.awaitView().ifPresent(this::tryGpu);
+        } catch (InterruptedException e) {
+            Thread.currentThread().interrupt();
+            throw new Failure("interrupted", e);
+        }
+    }
+
+    private void tryGpu(SurfaceView view) {
+        boolean draws = session.drawOn(view);
+        EventQueue.invokeLater(
+                () -> {
+                    if (draws) {
+                        stage.drawOn(view, () -> later(() -> session.drawOnNewSurfaceOf(view)));
+                    } else {
+                        stage.dropView(view);
+                    }
+                });
     }
 
     /** Runs what the playback cannot go on without. */

@@ -12,6 +12,7 @@ final class Deck extends JPanel {
     private final Component picture;
     private final Component bar;
     private boolean overlaps;
+    private boolean isApart;
 
     Deck(Component picture, Component bar) {
         super(new Layout());
@@ -24,8 +25,14 @@ final class Deck extends JPanel {
 
     /** Whether the bar lies over the picture, which has all the room then. */
     void setOverlapping(boolean overlaps) {
-        this.overlaps = overlaps;
+        this.overlaps = overlaps && !isApart;
         revalidate();
+    }
+
+    /** The bar never lies over the picture, which would cover it. */
+    void keepApart() {
+        isApart = true;
+        setOverlapping(false);
     }
 
     /** Otherwise a new frame would be painted over the bar. */

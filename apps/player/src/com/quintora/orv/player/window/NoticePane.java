@@ -3,6 +3,7 @@ package com.quintora.orv.player.window;
 
 import java.awt.CardLayout;
 import java.awt.Color;
+import java.awt.Component;
 import java.awt.Graphics;
 import java.awt.Graphics2D;
 import javax.swing.JPanel;
@@ -16,6 +17,8 @@ final class NoticePane extends JPanel {
     private final Timer noticeEnd = new Timer(NOTICE_MS, event -> setNotice(""));
     private String notice = "";
     private String lasting = "";
+    private Component cover;
+    private WordsWindow wordsOnCover;
 
     NoticePane() {
         setLayout(cards);
@@ -25,6 +28,12 @@ final class NoticePane extends JPanel {
     /** Shows the component that was added under that name. */
     void show(String name) {
         cards.show(this, name);
+    }
+
+    /** While that component shows, which nothing can be painted on, words lie over it. */
+    void writeOver(Component heavy) {
+        cover = heavy;
+        wordsOnCover = new WordsWindow(heavy);
     }
 
     /** Writes a few words onto what is shown. */
@@ -48,6 +57,9 @@ final class NoticePane extends JPanel {
 
     private void showWords() {
         getAccessibleContext().setAccessibleDescription(words());
+        if (cover != null) {
+            wordsOnCover.show(cover.isShowing() ? words() : "");
+        }
         repaint();
     }
 
@@ -72,7 +84,7 @@ final class NoticePane extends JPanel {
     @Override
     public void paint(Graphics graphics) {
         super.paint(graphics);
-        if (hasWords()) {
+        if (hasWords() && (cover == null || !cover.isShowing())) {
             paintWords(graphics, words());
         }
     }

@@ -2,6 +2,7 @@
 package com.quintora.orv.player.window;
 
 import com.quintora.orv.player.Failure;
+import com.quintora.orv.player.GpuUse;
 import com.quintora.orv.player.Interruption;
 import com.quintora.orv.player.PlayOptions;
 import com.quintora.orv.player.Session;
@@ -27,7 +28,8 @@ public final class PlayerWindow {
      * @throws Failure when there can be no window
      */
     public static int play(PlayOptions options) throws Failure, InterruptedException {
-        Stage stage = makeStage(options.title());
+        PictureWay way = new PictureWay(options.gpuUse());
+        Stage stage = makeStage(options.title(), way);
         try (Session session = new Session(options, stage::draw);
                 Interruption interruption = new Interruption(session, () -> {})) {
             Conductor conductor = new Conductor(session, stage, options);
@@ -38,6 +40,7 @@ public final class PlayerWindow {
             conductor.end();
             if (options.reportsStats()) {
                 System.out.println(session.report());
+                System.out.println(way.describe());
             }
             Failure failure = conductor.failure();
             return failure == null || interruption.happened() ? 0 : 1;
@@ -46,7 +49,7 @@ public final class PlayerWindow {
 
     /** Plays to the end in a window that is never shown, and draws it where nobody looks. */
     public static void rehearse(PlayOptions options) throws Failure, InterruptedException {
-        Stage stage = makeStage(options.title());
+        Stage stage = makeStage(options.title(), new PictureWay(GpuUse.NEVER));
         try (Session session = new Session(options, stage::draw)) {
             Conductor conductor = new Conductor(session, stage, options);
             EventQueue.invokeLater(() -> stage.build(conductor, () -> {}));
@@ -60,10 +63,10 @@ public final class PlayerWindow {
         }
     }
 
-    private static Stage makeStage(String title) throws Failure {
+    private static Stage makeStage(String title, PictureWay way) throws Failure {
         try {
             Desktop.await();
-            return new Stage(title);
+            return new Stage(title, way);
         } catch (AWTError | HeadlessException e) {
             throw noWindow("on display " + System.getenv("DISPLAY"), e);
         }

@@ -2,6 +2,7 @@
 package com.quintora.orv.player.window;
 
 import android.media.Image;
+import android.view.SurfaceView;
 import com.quintora.orv.player.Snapshot;
 import java.awt.Color;
 import java.awt.Component;
@@ -9,6 +10,8 @@ import java.awt.Dimension;
 import java.awt.Graphics;
 import java.awt.GraphicsEnvironment;
 import java.awt.Rectangle;
+import java.awt.event.ComponentAdapter;
+import java.awt.event.ComponentEvent;
 import java.awt.event.MouseAdapter;
 import java.awt.event.MouseEvent;
 import java.awt.event.WindowAdapter;
@@ -16,15 +19,21 @@ import java.awt.event.WindowEvent;
 import java.awt.image.VolatileImage;
 import java.util.List;
 import java.util.Locale;
+import java.util.Optional;
+import java.util.concurrent.CompletableFuture;
+import java.util.concurrent.ExecutionException;
 import javax.swing.JFrame;
+import javax.swing.JPopupMenu;
 import javax.swing.LayoutFocusTraversalPolicy;
 import javax.swing.SwingUtilities;
 import javax.swing.Timer;
+import javax.swing.ToolTipManager;
 import javax.swing.WindowConstants;
 
 /** The window: the picture or a message, and the controls. On the window's thread but for draw. */
 final class Stage {
     private static final String VIDEO = "video";
+    private static final String SURFACE = "surface";
     private static final String MESSAGE = "message";
     private static final double LARGEST_PART_OF_SCREEN = 0.8;
     private static final int OPENING_MS = 400;
@@ -35,6 +44,7 @@ final class Stage {
     private final NoticePane room = new NoticePane();
     private JFrame frame;
     private ControlBar bar;
+    private Deck deck;
     private final Help help = new Help();
     // Most media open so quickly that a word about it would only flicker.
     private final Timer opening = new Timer(OPENING_MS, event -> showOpening());
@@ -45,15 +55,25 @@ final class Stage {
     private boolean buffering;
     private int seekingLooks;
     private Runnable onClosed;
+    private final PictureWay way;
+    private final CompletableFuture<Optional<SurfaceView>> view = new CompletableFuture<>();
+    private SurfaceView surface; // Once the graphics processor draws on it.
+    private String shown = VIDEO;
 
     /** The name stands in the title bar. */
-    Stage(String name) {
+    Stage(String name, PictureWay way) {
         this.name = name;
+        this.way = way;
     }
 
     void open(Conductor conductor, Runnable onClosed) {
-        build(conductor, onClosed);
-        frame.setVisible(true);
+        try {
+            build(conductor, onClosed);
+            frame.setVisible(true);
+            view.complete(addView());
+        } finally {
+            view.complete(Optional.empty()); // Unless there is one.
+        }
         opening.setRepeats(false);
         opening.start();
     }
@@ -68,7 +88,7 @@ final class Stage {
         message = new MessagePanel();
         room.add(video, VIDEO);
         room.add(message, MESSAGE);
-        Deck deck = new Deck(room, bar);
+        deck = new Deck(room, bar);
         frame.add(deck);
         frame.setGlassPane(help);
         fullScreen = new FullScreen(frame, deck, bar);
@@ -90,6 +110,66 @@ final class Stage {
         target.flush();
     }
 
+    /** A view with a surface, out of sight, for the graphics processor to be tried on. */
+    private Optional<SurfaceView> addView() {
+        if (!way.isTried()) {
+            return Optional.empty();
+        }
+        SurfaceView made = way.makeView();
+        made.setFocusable(false);
+        room.add(made, SURFACE);
+        frame.validate();
+        return Optional.of(made);
+    }
+
+    /** Waits for the window, if that is to have a view. Not for the window's thread. */
+    Optional<SurfaceView> awaitView() throws InterruptedException {
+        try {
+            return way.isTried() ? view.get() : Optional.empty();
+        } catch (ExecutionException e) {
+            return Optional.empty();
+        }
+    }
+
+    /** The graphics processor draws on the view, whose window covers what is painted. */
+    void drawOn(SurfaceView drawn, Runnable onNewSurface) {
+        surface = drawn;
+        JPopupMenu.setDefaultLightWeightPopupEnabled(false);
+        ToolTipManager.sharedInstance().setLightWeightPopupEnabled(false);
+        deck.keepApart();
+        room.writeOver(surface);
+        surface.addMouseListener(clicks());
+        surface.getHolder().addCallback(new NewSurfaces(onNewSurface));
+        help.addComponentListener(
+                new ComponentAdapter() {
+                    @Override
+                    public void componentShown(ComponentEvent event) {
+                        showCard(shown);
+                    }
+
+                    @Override
+                    public void componentHidden(ComponentEvent event) {
+                        showCard(shown);
+                    }
+                });
+    }
+
+    /** Nothing is drawn on the view that was tried. */
+    void dropView(SurfaceView unused) {
+        room.remove(unused);
+    }
+
+    private void showPicture() {
+        showCard(surface == null ? VIDEO : SURFACE);
+    }
+
+    // The list of keys would lie below the picture's window.
+    private void showCard(String card) {
+        shown = card;
+        boolean isCovered = card.equals(SURFACE) && help.isVisible();
+        room.show(isCovered ? VIDEO : card);
+    }
+
     /** Called with each frame, on the frames' thread. */
     void draw(Image image) {
         Image.Plane plane = image.getPlanes()[0];
@@ -102,7 +182,11 @@ final class Stage {
 
     void showMedia(MediaDetails details, double volume) {
         opening.stop();
-        room.show(VIDEO);
+        if (details.hasVideo()) {
+            showPicture();
+        } else {
+            showCard(VIDEO);
+        }
         bar.showTracks(details.audioTracks(), details.subtitleTracks());
         bar.seekBar().showMarks(details.chapters());
         bar.showVolume(volume, false);
@@ -195,7 +279,7 @@ final class Stage {
 
     private void tellInstead(Glyph glyph, Color color, String title, String text) {
         message.tell(glyph, color, title, text);
-        room.show(MESSAGE);
+        showCard(MESSAGE);
     }
 
     /** As large as the video, within a part of the screen. */
@@ -258,15 +342,18 @@ final class Stage {
                         conductor.setWatched(true);
                     }
                 });
-        room.addMouseListener(
-                new MouseAdapter() {
-                    @Override
-                    public void mouseClicked(MouseEvent event) {
-                        if (SwingUtilities.isLeftMouseButton(event)) {
-                            onClick(event.getClickCount());
-                        }
-                    }
-                });
+        room.addMouseListener(clicks());
+    }
+
+    private MouseAdapter clicks() {
+        return new MouseAdapter() {
+            @Override
+            public void mouseClicked(MouseEvent event) {
+                if (SwingUtilities.isLeftMouseButton(event)) {
+                    onClick(event.getClickCount());
+                }
+            }
+        };
     }
 
     private void onClick(int clicks) {

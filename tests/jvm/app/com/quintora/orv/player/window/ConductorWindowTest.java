@@ -6,6 +6,7 @@ import static org.junit.jupiter.api.Assertions.assertNotNull;
 import static org.junit.jupiter.api.Assertions.assertNull;
 
 import com.quintora.mmp.Media;
+import com.quintora.orv.player.GpuUse;
 import com.quintora.orv.player.PlayOptions;
 import com.quintora.orv.player.Session;
 import java.awt.Frame;
@@ -17,7 +18,7 @@ import org.junit.jupiter.api.Test;
 
 /** What becomes of the player's refusals. */
 class ConductorWindowTest {
-    private final Stage stage = new Stage("test");
+    private final Stage stage = new Stage("test", new PictureWay(GpuUse.NEVER));
     private Session session;
     private Conductor conductor;
 

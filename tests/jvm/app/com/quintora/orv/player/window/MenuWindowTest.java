@@ -2,13 +2,13 @@
 package com.quintora.orv.player.window;
 
 import static org.junit.jupiter.api.Assertions.assertEquals;
+import static org.junit.jupiter.api.Assertions.assertFalse;
 import static org.junit.jupiter.api.Assertions.assertNotNull;
 import static org.junit.jupiter.api.Assertions.assertNull;
 import static org.junit.jupiter.api.Assertions.assertTrue;
 
 import com.quintora.mmp.Wait;
 import javax.swing.JMenuItem;
-import javax.swing.JPopupMenu;
 import javax.swing.MenuElement;
 import javax.swing.MenuSelectionManager;
 import org.junit.jupiter.api.Test;
@@ -29,7 +29,7 @@ class MenuWindowTest extends WindowFixture {
         assertEquals(first, selected());
         press("DOWN");
         press("ENTER");
-        assertNull(find(JPopupMenu.class, null));
+        assertFalse(menuShows());
         assertEquals(100, volume);
         assertEquals(volume, volume(), "the arrows are the menu's");
         openMenu("A");
@@ -50,7 +50,7 @@ class MenuWindowTest extends WindowFixture {
         press("F");
         openMenu("S");
         press("ESCAPE");
-        assertNull(find(JPopupMenu.class, null));
+        assertFalse(menuShows());
         assertNotNull(button("Leave full screen (F)"));
         press("ESCAPE");
         assertNotNull(button("Full screen (F)"));
@@ -75,12 +75,20 @@ class MenuWindowTest extends WindowFixture {
 
     private void openMenu(String key) throws Exception {
         press(key);
-        Wait.until("the menu shows", () -> find(JPopupMenu.class, null) != null);
+        Wait.until("the menu shows", MenuWindowTest::menuShows);
         Wait.until("the keyboard is in it", () -> selected() != null);
     }
 
     private int volume() throws Exception {
         return onWindow(find(LevelBar.class, "Volume")::value);
+    }
+
+    /** In the window, or in one of its own. */
+    private static boolean menuShows() throws Exception {
+        return onWindow(() -> {
+            MenuElement[] path = MenuSelectionManager.defaultManager().getSelectedPath();
+            return path.length > 0 && path[0].getComponent().isShowing();
+        });
     }
 
     /** The text of the menu's item at which the keyboard is, or null. */

@@ -3,12 +3,17 @@ package com.quintora.orv.player.window;
 
 import static org.junit.jupiter.api.Assertions.assertFalse;
 
+import android.view.SurfaceView;
 import com.quintora.mmp.Media;
 import com.quintora.mmp.Wait;
 import com.quintora.orv.player.PlayOptions;
+import java.awt.Color;
 import java.awt.Component;
 import java.awt.Container;
 import java.awt.Frame;
+import java.awt.Point;
+import java.awt.Rectangle;
+import java.awt.Robot;
 import java.awt.event.KeyEvent;
 import java.awt.image.BufferedImage;
 import java.util.concurrent.Callable;
@@ -47,12 +52,18 @@ abstract class WindowFixture {
     final void openSource(String source, String... options) throws Exception {
         PlayOptions parsed =
                 PlayOptions.of(
-                        Stream.concat(Stream.of(options), Stream.of(source))
+                        Stream.of(usualOptions(), options, new String[] {source})
+                                .flatMap(Stream::of)
                                 .toArray(String[]::new));
         playing = new FutureTask<>(() -> PlayerWindow.play(parsed));
         new Thread(playing, "main").start();
         Wait.until("the window is open", () -> openFrame() != null);
         frame = openFrame();
+    }
+
+    /** Options that every player of the test gets. */
+    String[] usualOptions() {
+        return new String[0];
     }
 
     private static JFrame openFrame() {
@@ -87,7 +98,9 @@ abstract class WindowFixture {
     final void awaitPicture() throws Exception {
         Wait.until("a picture shows", () -> {
             VideoPane video = find(VideoPane.class, null);
-            return video != null && brightest(video, 150) > 100;
+            SurfaceView view = find(SurfaceView.class, null);
+            return video != null && brightest(video, 150) > 100
+                    || view != null && brightestOnScreen(view) > 100;
         });
     }
 
@@ -157,6 +170,27 @@ abstract class WindowFixture {
                     }
                     return brightest;
                 });
+    }
+
+    /** The same of a row of the screen, two thirds down a component. */
+    static int brightestOnScreen(Component view) throws Exception {
+        Rectangle row = onWindow(() -> {
+            if (!view.isShowing()) {
+                return null;
+            }
+            Point place = view.getLocationOnScreen();
+            return new Rectangle(place.x, place.y + view.getHeight() * 2 / 3, view.getWidth(), 1);
+        });
+        if (row == null) {
+            return 0;
+        }
+        BufferedImage screen = new Robot().createScreenCapture(row);
+        int brightest = 0;
+        for (int x = 0; x < screen.getWidth(); x++) {
+            Color color = new Color(screen.getRGB(x, 0));
+            brightest = Math.max(brightest, Math.max(color.getRed(), color.getBlue()));
+        }
+        return brightest;
     }
 
     static <T> T onWindow(Callable<T> question) throws Exception {
