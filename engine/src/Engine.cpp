@@ -21,7 +21,7 @@ TarnPlayer::Engine::Engine(orvtarn::Notifier::Deliver deliver)
       media(mpv, state, notifier),
       events(mpv, state, video, notifier, media, frameTiming),
       decoding(mpv, orvtarn::hardwareDecoder()),
-      outputChange(mpv, state, events, decoding),
+      outputChange(mpv, events, decoding),
       loader(mpv, state, video, media, protocol),
       transport(mpv, state, events),
       seeker(mpv, state, notifier, events, transport),

@@ -1,15 +1,16 @@
 // SPDX-License-Identifier: Apache-2.0
 #include "TestWindow.h"
 
-#include <X11/Xlib.h>
-#include <X11/Xutil.h>
 #include <stdlib.h>
 #include <string.h>
 
 #include "PlayerTest.h"
 
-namespace orvtest {
+// Last: their macros are words of other headers.
+#include <X11/Xlib.h>
+#include <X11/Xutil.h>
 
+namespace orvtest {
 namespace {
 
 // Null without a display. One connection stays for the whole program: the virtual

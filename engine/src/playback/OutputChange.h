@@ -5,7 +5,6 @@
 
 #include "core/EventLoop.h"
 #include "core/MpvHandle.h"
-#include "core/PlayerState.h"
 #include "playback/HardwareDecoding.h"
 
 namespace orvtarn {
@@ -14,15 +13,14 @@ namespace orvtarn {
 // video meanwhile, and shows the same place afterwards.
 class OutputChange {
 public:
-    OutputChange(MpvHandle& mpv, PlayerState& state, EventLoop& events, HardwareDecoding& decoding)
-        : mMpv(mpv), mState(state), mEvents(events), mDecoding(decoding) {}
+    OutputChange(MpvHandle& mpv, EventLoop& events, HardwareDecoding& decoding)
+        : mMpv(mpv), mEvents(events), mDecoding(decoding) {}
 
     // onWindow: the new way is by OpenGL. Blocks until mpv has video again.
     void run(bool onWindow, const std::function<void()>& change);
 
 private:
     MpvHandle& mMpv;
-    PlayerState& mState;
     EventLoop& mEvents;
     HardwareDecoding& mDecoding;
 };

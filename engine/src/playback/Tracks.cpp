@@ -73,7 +73,7 @@ std::shared_ptr<const TrackTables> Tracks::keptDetails(const Stand& now) {
 std::shared_ptr<const TrackTables> Tracks::details(const char* operation) {
     if (mState.requireOpen(operation) != android::NO_ERROR) return nullptr;
     const Stand now = stand();
-    if (const auto kept = keptDetails(now)) return kept;
+    if (auto kept = keptDetails(now)) return kept;
     const auto all = std::make_shared<TrackTables>();
     if (!tables(operation, *all)) return nullptr;
     mLoader.secondReading()->withFile([&](MediaFile& file) { addContainerDetails(file, *all); });
