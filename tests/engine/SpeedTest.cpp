@@ -164,7 +164,8 @@ TEST_F(SpeedTest, EndsWithTheMedia) {
         EXPECT_TRUE(eventually([] { return hasThread("orv-rewind"); }));
         ASSERT_EQ(NO_ERROR, stops ? player->stop() : player->reset());
         EXPECT_EQ(1000, speed());
-        EXPECT_FALSE(hasThread("orv-rewind"));
+        // The kernel lists a thread a moment longer than a join waits for it.
+        EXPECT_TRUE(eventually([] { return !hasThread("orv-rewind"); }));
     }
 }
 
