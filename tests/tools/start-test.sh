@@ -44,9 +44,12 @@ for command in "info $ORV_MEDIA/tracks.mkv" "info --json $ORV_MEDIA/tone.flac" \
     [ "$(grep -c . <<<"$outside")" -le 3 ] || fail "${words[0]}: not archived: $outside"
 done
 
-# The native libraries are loaded by a thread of their own, the log's sixth word. Help needs none.
+# The native libraries are loaded by a thread of their own: in a line of the log, in
+# whichever format, its number follows the process's. Help needs none.
 ORV_LOG=verbose "${java[@]}" "${jar[@]}" info "$ORV_MEDIA/short.mp4" >"$folder/log" 2>&1 || fail "info"
-thread_of() { awk -v text="$1" 'index($0, text) { print $6; exit }' "$folder/log"; }
+thread_of() {
+    grep -a -m 1 -F "$1" "$folder/log" | sed -E 's/^.* [0-9]+ +([0-9]+) .*$/\1/'
+}
 [ -n "$(thread_of 'JNI_OnLoad()')" ] || fail "no log of the native libraries"
 [ "$(thread_of 'JNI_OnLoad()')" != "$(thread_of '_setup(): Enter')" ] ||
     fail "the native libraries are loaded while nothing else is done"
