@@ -1,8 +1,6 @@
 // SPDX-License-Identifier: Apache-2.0
 package com.quintora.orv.player;
 
-import picocli.CommandLine;
-
 /**
  * Seeks as the player's window does, to the frame of a time: a program whose arguments are the film
  * and the times in milliseconds. Prints what each took, in milliseconds, a line each.
@@ -11,7 +9,7 @@ final class ExactSeeks {
     private ExactSeeks() {}
 
     public static void main(String[] arguments) throws Failure {
-        PlayOptions options = CommandLine.populateCommand(new PlayOptions(), arguments[0]);
+        PlayOptions options = PlayOptions.of(arguments[0]);
         try (Session session = new Session(options, image -> {})) {
             session.open();
             for (int i = 1; i < arguments.length; i++) {

@@ -3,7 +3,6 @@ package com.quintora.orv.player;
 
 import java.util.ArrayList;
 import java.util.List;
-import picocli.CommandLine;
 
 /**
  * A wall of players in one program, each of which draws into a surface of its own: a program with
@@ -16,7 +15,7 @@ final class Wall {
     public static void main(String[] arguments) throws Exception {
         List<Session> sessions = new ArrayList<>();
         for (int i = 0; i < Integer.parseInt(arguments[0]); i++) {
-            PlayOptions options = CommandLine.populateCommand(new PlayOptions(), arguments[1]);
+            PlayOptions options = PlayOptions.of(arguments[1]);
             Session session = new Session(options, image -> {});
             sessions.add(session);
             session.open();
