@@ -12,10 +12,10 @@ import picocli.CommandLine.Model.PositionalParamSpec;
  * that a short command does in Java. A value goes where it belongs when it has been read.
  */
 final class Arguments {
-    private final CommandSpec spec;
+    private final CommandSpec command;
 
-    private Arguments(CommandSpec spec) {
-        this.spec = spec;
+    private Arguments(CommandSpec command) {
+        this.command = command;
     }
 
     /** Of what runs a command, a Runnable or Callable, or of what only holds the values. */
@@ -26,7 +26,7 @@ final class Arguments {
     /** Those of the command called so, with what every command takes. */
     static Arguments ofCommand(Object command, String name, String description) {
         Arguments arguments = of(command);
-        arguments.spec.name(name).usageMessage().description(description);
+        arguments.command.name(name).usageMessage().description(description);
         arguments.addCommon();
         return arguments;
     }
@@ -47,12 +47,12 @@ final class Arguments {
                 "Accept servers whose certificate is not trusted.");
     }
 
-    CommandSpec spec() {
-        return spec;
+    CommandSpec command() {
+        return command;
     }
 
     void add(OptionSpec option) {
-        spec.addOption(option);
+        command.addOption(option);
     }
 
     void addFlag(String name, Consumer<Boolean> target, String description) {
@@ -60,7 +60,7 @@ final class Arguments {
     }
 
     void add(PositionalParamSpec parameter) {
-        spec.addPositional(parameter);
+        command.addPositional(parameter);
     }
 
     /** An option whose values go to the target, the default one, too. */
@@ -85,7 +85,7 @@ final class Arguments {
 
     private record Target<T>(Consumer<T> target) implements ISetter {
         @Override
-        @SuppressWarnings("unchecked") // picocli gives values of the type that it was told.
+        @SuppressWarnings("unchecked") // picocli gives values of the type that was asked for.
         public <V> V set(V value) {
             target.accept((T) value);
             return null; // Nobody asks for the former value.

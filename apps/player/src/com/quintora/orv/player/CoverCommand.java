@@ -8,7 +8,7 @@ import picocli.CommandLine.Model.CommandSpec;
 
 /** Writes the picture inside a media file. */
 final class CoverCommand implements Callable<Integer> {
-    private final CommandSpec spec;
+    private final CommandSpec command;
     private String source;
     private Path out;
 
@@ -29,11 +29,11 @@ final class CoverCommand implements Callable<Integer> {
                         .paramLabel("OUT")
                         .description("Where to write the picture; - for standard output.")
                         .build());
-        spec = arguments.spec();
+        command = arguments.command();
     }
 
-    CommandSpec spec() {
-        return spec;
+    CommandSpec command() {
+        return command;
     }
 
     @Override

@@ -9,7 +9,7 @@ import picocli.CommandLine.Model.CommandSpec;
 
 /** Prints what media hold. */
 final class InfoCommand implements Callable<Integer> {
-    private final CommandSpec spec;
+    private final CommandSpec command;
     private String source;
     private boolean json;
 
@@ -25,16 +25,16 @@ final class InfoCommand implements Callable<Integer> {
                         .description("A media file or URL; - for standard input.")
                         .build());
         arguments.addFlag("--json", value -> json = value, "For programs: one JSON object.");
-        spec = arguments.spec();
+        command = arguments.command();
     }
 
-    CommandSpec spec() {
-        return spec;
+    CommandSpec command() {
+        return command;
     }
 
     @Override
     public Integer call() throws Failure {
-        PrintWriter out = spec.commandLine().getOut();
+        PrintWriter out = command.commandLine().getOut();
         try (OrvMediaPlayer player = Media.open(source)) {
             MediaInfo info = MediaInfo.of(source, player);
             if (json) {

@@ -68,10 +68,10 @@ public final class Main {
 
     private static CommandSpec command(String name) {
         return switch (name) {
-            case "play" -> new PlayCommand().spec();
-            case "info" -> new InfoCommand().spec();
-            case "thumbnail" -> new ThumbnailCommand().spec();
-            case "cover" -> new CoverCommand().spec();
+            case "play" -> new PlayCommand().command();
+            case "info" -> new InfoCommand().command();
+            case "thumbnail" -> new ThumbnailCommand().command();
+            case "cover" -> new CoverCommand().command();
             default -> throw new IllegalArgumentException(name);
         };
     }

@@ -13,7 +13,7 @@ import picocli.CommandLine.ParameterException;
 /** Plays in a window, or in the terminal where there is no display. */
 final class PlayCommand implements Callable<Integer> {
     private final PlayOptions options = new PlayOptions();
-    private final CommandSpec spec;
+    private final CommandSpec command;
 
     PlayCommand() {
         var arguments =
@@ -23,12 +23,12 @@ final class PlayCommand implements Callable<Integer> {
                         "Plays a file or URL: in a window, or in the terminal where there is no"
                                 + " display.");
         options.addTo(arguments);
-        spec = arguments.spec();
-        spec.usageMessage().footer("In the window, H lists the keyboard shortcuts.");
+        command = arguments.command();
+        command.usageMessage().footer("In the window, H lists the keyboard shortcuts.");
     }
 
-    CommandSpec spec() {
-        return spec;
+    CommandSpec command() {
+        return command;
     }
 
     @Override
@@ -60,7 +60,7 @@ final class PlayCommand implements Callable<Integer> {
 
     private void require(boolean met, String sentence) {
         if (!met) {
-            throw new ParameterException(spec.commandLine(), sentence);
+            throw new ParameterException(command.commandLine(), sentence);
         }
     }
 

@@ -31,7 +31,7 @@ public final class PlayOptions {
         var options = new PlayOptions();
         var arguments = Arguments.of(options);
         options.addTo(arguments);
-        new CommandLine(arguments.spec()).parseArgs(words);
+        new CommandLine(arguments.command()).parseArgs(words);
         return options;
     }
 

@@ -27,7 +27,7 @@ import picocli.CommandLine.ParameterException;
 final class ThumbnailCommand implements Callable<Integer> {
     private static final int USUAL_HEIGHT = 180;
 
-    private final CommandSpec spec;
+    private final CommandSpec command;
     private String source;
     private Path out;
     private int at;
@@ -62,11 +62,11 @@ final class ThumbnailCommand implements Callable<Integer> {
                                 "How large, at most 8192x255; without it, 180 rows in the video's"
                                         + " shape.")
                         .build());
-        spec = arguments.spec();
+        command = arguments.command();
     }
 
-    CommandSpec spec() {
-        return spec;
+    CommandSpec command() {
+        return command;
     }
 
     @Override
@@ -82,11 +82,12 @@ final class ThumbnailCommand implements Callable<Integer> {
     private void check() {
         if (!OutputFile.isStandardOutput(out) && !out.toString().toLowerCase().endsWith(".png")) {
             throw new ParameterException(
-                    spec.commandLine(), "a thumbnail is a PNG file; '" + out + "' is not named so");
+                    command.commandLine(),
+                    "a thumbnail is a PNG file; '" + out + "' is not named so");
         }
         if (size != null && size.height() > Pictures.MAX_THUMBNAIL_HEIGHT) {
             throw new ParameterException(
-                    spec.commandLine(),
+                    command.commandLine(),
                     "a thumbnail has at most "
                             + Pictures.MAX_THUMBNAIL_HEIGHT
                             + " rows, not "
@@ -94,7 +95,7 @@ final class ThumbnailCommand implements Callable<Integer> {
         }
         if (size != null && size.width() > Pictures.MAX_THUMBNAIL_WIDTH) {
             throw new ParameterException(
-                    spec.commandLine(),
+                    command.commandLine(),
                     "a thumbnail has at most "
                             + Pictures.MAX_THUMBNAIL_WIDTH
                             + " columns, not "
