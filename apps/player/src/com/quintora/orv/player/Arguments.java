@@ -1,6 +1,7 @@
 // SPDX-License-Identifier: Apache-2.0
 package com.quintora.orv.player;
 
+import java.nio.file.Path;
 import java.util.function.Consumer;
 import picocli.CommandLine.Model.CommandSpec;
 import picocli.CommandLine.Model.ISetter;
@@ -49,6 +50,24 @@ final class Arguments {
 
     CommandSpec command() {
         return command;
+    }
+
+    /** What the command reads, as the first argument. */
+    void addSource(String label, Consumer<String> target) {
+        add(
+                parameter(0, String.class, target)
+                        .paramLabel(label)
+                        .description("A media file or URL; - for standard input.")
+                        .build());
+    }
+
+    /** Where the command writes its picture, as the second argument. */
+    void addPicture(String label, Consumer<Path> target) {
+        add(
+                parameter(1, Path.class, target)
+                        .paramLabel(label)
+                        .description("Where to write the picture; - for standard output.")
+                        .build());
     }
 
     void add(OptionSpec option) {

@@ -19,16 +19,8 @@ final class CoverCommand implements Callable<Integer> {
                         "cover",
                         "Writes the picture inside a file, such as an album's cover, byte for"
                                 + " byte.");
-        arguments.add(
-                Arguments.parameter(0, String.class, value -> source = value)
-                        .paramLabel("FILE")
-                        .description("A media file or URL; - for standard input.")
-                        .build());
-        arguments.add(
-                Arguments.parameter(1, Path.class, value -> out = value)
-                        .paramLabel("OUT")
-                        .description("Where to write the picture; - for standard output.")
-                        .build());
+        arguments.addSource("FILE", value -> source = value);
+        arguments.addPicture("OUT", value -> out = value);
         command = arguments.command();
     }
 

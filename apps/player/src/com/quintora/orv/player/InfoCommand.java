@@ -19,11 +19,7 @@ final class InfoCommand implements Callable<Integer> {
                         this,
                         "info",
                         "Prints the container, duration, tracks, chapters and metadata of media.");
-        arguments.add(
-                Arguments.parameter(0, String.class, value -> source = value)
-                        .paramLabel("FILE|URL")
-                        .description("A media file or URL; - for standard input.")
-                        .build());
+        arguments.addSource("FILE|URL", value -> source = value);
         arguments.addFlag("--json", value -> json = value, "For programs: one JSON object.");
         command = arguments.command();
     }

@@ -37,16 +37,8 @@ final class ThumbnailCommand implements Callable<Integer> {
         var arguments =
                 Arguments.ofCommand(
                         this, "thumbnail", "Writes one picture of a video as a PNG file.");
-        arguments.add(
-                Arguments.parameter(0, String.class, value -> source = value)
-                        .paramLabel("FILE")
-                        .description("A media file or URL; - for standard input.")
-                        .build());
-        arguments.add(
-                Arguments.parameter(1, Path.class, value -> out = value)
-                        .paramLabel("OUT.png")
-                        .description("Where to write the picture; - for standard output.")
-                        .build());
+        arguments.addSource("FILE", value -> source = value);
+        arguments.addPicture("OUT.png", value -> out = value);
         arguments.add(
                 Arguments.option("--at", int.class, value -> at = value)
                         .paramLabel("TIME")
