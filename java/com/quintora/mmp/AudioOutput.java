@@ -3,70 +3,76 @@ package com.quintora.mmp;
 
 /**
  * Where a player's sound goes and how loud. Thread-safe; every state but RELEASED, in which all
- * methods throw {@link IllegalStateException}.
+ * methods throw {@link IllegalStateException}. What is set outlasts a reset.
  */
-public final class AudioOutput {
-    private final OrvMediaPlayer player;
-
-    AudioOutput(OrvMediaPlayer player) {
-        this.player = player;
-    }
-
+public interface AudioOutput {
     /**
-     * Sets how loud the sound is.
+     * Sets how loud the sound is. While it is muted the volume is kept for later.
      *
      * @param left 0 for silence to 1 for as recorded
      * @param right the same, for the right side
      * @throws IllegalArgumentException for a volume out of range
      * @throws IllegalStateException when the engine refuses
      */
-    public void setVolume(float left, float right) {
-        player.states.requireAlive("setVolume()");
-        requireGain(left);
-        requireGain(right);
-        player.run("setVolume()", () -> player.native_setVolume(left, right));
-    }
+    void setVolume(float left, float right);
 
     /**
-     * Says which of the platform's streams the sound belongs to.
+     * The volume of the left side; muting does not change it.
+     *
+     * @return 0 to 1; 1 at first
+     */
+    float getLeftVolume();
+
+    /**
+     * The volume of the right side; muting does not change it.
+     *
+     * @return 0 to 1; 1 at first
+     */
+    float getRightVolume();
+
+    /**
+     * Silences the sound, or has it at its volume again.
+     *
+     * @param muted true for silence
+     * @throws IllegalStateException when the engine refuses
+     */
+    void setMuted(boolean muted);
+
+    /**
+     * Whether the sound is muted.
+     *
+     * @return what was last set; false at first
+     */
+    boolean isMuted();
+
+    /**
+     * Chooses the platform's stream that the sound belongs to.
      *
      * @param type the platform's number, such as 3 for music
      */
-    public void setStreamType(int type) {
-        player.run("setStreamType()", () -> player.native_setAudioStreamType(type));
-    }
+    void setStreamType(int type);
 
     /**
-     * Says which of the platform's audio sessions the sound belongs to.
+     * Chooses the platform's audio session that the sound belongs to.
      *
      * @param id 0 or more
      * @throws IllegalArgumentException when it is negative
      */
-    public void setSessionId(int id) {
-        player.states.requireAlive("setSessionId()");
-        if (id < 0) {
-            throw new IllegalArgumentException("an audio session's number is not negative: " + id);
-        }
-        player.run("setSessionId()", () -> player.native_setAudioSessionId(id));
-    }
+    void setSessionId(int id);
 
     /**
      * The audio session.
      *
      * @return what was last set, 0 at first
      */
-    public int getSessionId() {
-        return player.ask("getSessionId()", player::native_getAudioSessionId);
-    }
+    int getSessionId();
 
     /**
      * Attaches one of the platform's auxiliary effects.
      *
      * @param id the effect's number; 0 for none
      */
-    public void attachAuxEffect(int id) {
-        player.run("attachAuxEffect()", () -> player.native_attachAuxEffect(id));
-    }
+    void attachAuxEffect(int id);
 
     /**
      * Sets how much of the sound goes to the auxiliary effect.
@@ -74,15 +80,5 @@ public final class AudioOutput {
      * @param level 0 to 1
      * @throws IllegalArgumentException for a level out of range
      */
-    public void setAuxEffectSendLevel(float level) {
-        player.states.requireAlive("setAuxEffectSendLevel()");
-        requireGain(level);
-        player.run("setAuxEffectSendLevel()", () -> player.native_setAuxEffectSendLevel(level));
-    }
-
-    private static void requireGain(float gain) {
-        if (!(gain >= 0 && gain <= 1)) {
-            throw new IllegalArgumentException("a volume is 0 to 1: " + gain);
-        }
-    }
+    void setAuxEffectSendLevel(float level);
 }

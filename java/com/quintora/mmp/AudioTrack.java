@@ -37,4 +37,9 @@ public record AudioTrack(
         String comment,
         String encoder,
         String handler,
-        String language) {}
+        String language) implements Track {
+    @Override
+    public Kind kind() {
+        return Kind.AUDIO;
+    }
+}

@@ -1,6 +1,9 @@
 // SPDX-License-Identifier: Apache-2.0
 package com.quintora.mmp;
 
+import java.time.Duration;
+import java.util.Optional;
+
 /**
  * What the media says of itself. Texts have at most 128 UTF-16 units and are empty when unknown;
  * numbers are 0 when unknown.
@@ -30,4 +33,13 @@ public record MediaMetadata(
         int chapterCount,
         String composer,
         String container,
-        String comment) {}
+        String comment) {
+    /**
+     * How long the media is.
+     *
+     * @return the duration; empty when unknown
+     */
+    public Optional<Duration> duration() {
+        return Times.known(durationMillis);
+    }
+}

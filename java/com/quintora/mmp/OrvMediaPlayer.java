@@ -5,6 +5,9 @@ import android.graphics.Bitmap;
 import android.os.Parcel;
 import android.view.Surface;
 import com.quintora.SubtitleAttr;
+import com.quintora.mmp.internal.PlayerUnits;
+import com.quintora.mmp.internal.media.EngineDivxNavigation;
+import com.quintora.mmp.internal.media.FourCharacters;
 import com.quintora.mmp.util.DivxLastMemoryFilePosition;
 import com.quintora.mmp.util.PcmMediaInfo;
 import com.quintora.mmp.util.ThumbnailInfo;
@@ -12,58 +15,38 @@ import java.io.FileDescriptor;
 import java.io.IOException;
 import java.lang.ref.WeakReference;
 import java.util.List;
+import java.util.Map;
+import java.util.concurrent.CompletableFuture;
 import java.util.concurrent.Executor;
+import org.jetbrains.annotations.Nullable;
 
 /**
- * Plays audio and video.
+ * The {@link MediaPlayer} that plays, by the platform's engine.
  *
- * <pre>{@code
- * try (OrvMediaPlayer player = new OrvMediaPlayer()) {
- *     player.addListener(listener);
- *     player.setDataSource("/media/film.mkv");
- *     player.setSurface(surface);
- *     player.prepare();
- *     player.start();
- *     ...
- * }
- * }</pre>
- *
- * <p>A player stands in one {@link PlayerState}; each method says in which it may be called and
- * throws {@link IllegalStateException} with a sentence otherwise, in every case after {@link
- * #release()}. Any thread may call any method at any time, also from inside a {@link
- * PlayerListener}. Methods do not block unless they say so, but those that change whether the
- * player runs wait for one another. Where null is not said to be possible it is refused with an
- * {@link IllegalArgumentException}.
- *
- * <p>Times are in milliseconds, sizes in pixels, positions in bytes where the name says so.
- *
- * <p>A player holds native resources until it is released. One that is dropped without that is
- * released by the garbage collector some time later, unless its data source is a {@link
- * MediaStreamSource}.
+ * <p>A player holds native resources until it is released: use try-with-resources, or {@link
+ * #release()}. One that is dropped without that is freed by the garbage collector some time later,
+ * with a warning in the log that says where it was made, unless its data source is a {@link
+ * MediaStreamSource}: the native half keeps hold of such a player.
  *
  * <p>This class is also what the native half knows: it registers the native methods, reads and
  * writes the fields and calls the callbacks below by their names and signatures.
  */
-public final class OrvMediaPlayer extends Playback {
+public final class OrvMediaPlayer implements MediaPlayer {
     static {
         NativeLibrary.load();
         native_init();
     }
 
-    private final Tracks tracks = new Tracks(this);
-    private final Subtitles subtitles = new Subtitles(this);
-    private final Pictures pictures = new Pictures(this);
-    private final TrickPlay trickPlay = new TrickPlay(this);
-    private final AudioOutput audio = new AudioOutput(this);
-    private final DivxNavigation divx = new DivxNavigation(this);
-    private final EngineCommands engine = new EngineCommands(this);
+    // Null in a stand-in for a player that was collected, of which nothing is called.
+    final @Nullable PlayerUnits units;
+    private final @Nullable ForgottenPlayer forgotten;
 
     /**
      * A player whose listeners are called on a daemon thread of its own, which starts with the
      * first event. Players without media cost next to nothing.
      *
      * @throws RuntimeException when the native half has no memory
-     * @throws UnsatisfiedLinkError when the native library is not on java.library.path
+     * @throws UnsatisfiedLinkError when the native library cannot be found or loaded
      */
     public OrvMediaPlayer() {
         this(null);
@@ -75,57 +58,33 @@ public final class OrvMediaPlayer extends Playback {
      * @param executor such as {@code SwingUtilities::invokeLater}; null for a thread of the
      *     player's own
      * @throws RuntimeException when the native half has no memory
-     * @throws UnsatisfiedLinkError when the native library is not on java.library.path
+     * @throws UnsatisfiedLinkError when the native library cannot be found or loaded
      */
-    public OrvMediaPlayer(Executor executor) {
-        super(executor);
+    public OrvMediaPlayer(@Nullable Executor executor) {
+        NativeCalls natives = new NativeCalls(this);
+        units = new PlayerUnits(this, natives, executor);
         native_setup(new WeakReference<>(this));
+        forgotten = ForgottenPlayer.watch(this, units);
+        rememberHeld();
     }
 
-    /**
-     * The media's tracks, chapters and metadata.
-     *
-     * @return the same object always
-     */
-    public Tracks tracks() {
-        return tracks;
+    /** Stands in for a player that was collected: what the native half held for it. */
+    OrvMediaPlayer(long nativeContext, long nativeSurfaceTexture) {
+        units = null;
+        forgotten = null;
+        mNativeContext = nativeContext;
+        mNativeSurfaceTexture = nativeSurfaceTexture;
     }
 
-    /**
-     * Subtitles on the picture.
-     *
-     * @return the same object always
-     */
-    public Subtitles subtitles() {
-        return subtitles;
+    void finalizeNatively() {
+        native_finalize();
     }
 
-    /**
-     * Thumbnails and embedded pictures.
-     *
-     * @return the same object always
-     */
-    public Pictures pictures() {
-        return pictures;
+    void rememberHeld() {
+        forgotten.setHeld(mNativeContext, mNativeSurfaceTexture);
     }
 
-    /**
-     * Speeds, single steps, repeated sections and byte positions.
-     *
-     * @return the same object always
-     */
-    public TrickPlay trickPlay() {
-        return trickPlay;
-    }
-
-    /**
-     * Volume, session and effects of the sound.
-     *
-     * @return the same object always
-     */
-    public AudioOutput audio() {
-        return audio;
-    }
+    // What the engine alone knows, beyond the interface.
 
     /**
      * Titles, chapters and playlists of DivX media.
@@ -133,24 +92,61 @@ public final class OrvMediaPlayer extends Playback {
      * @return the same object always
      */
     public DivxNavigation divx() {
-        return divx;
+        return units.divx;
     }
 
     /**
-     * What is the engine's own affair.
+     * Calls whose meaning is the engine's and the platform's.
      *
      * @return the same object always
      */
     public EngineCommands engine() {
-        return engine;
+        return units.engine;
     }
 
-    @Override
-    @SuppressWarnings("deprecation") // The native half's finalize needs the object itself.
-    protected void finalize() {
-        abandon();
-        native_finalize();
+    // The interface, by the units.
+
+    @Override public void addListener(PlayerListener l) { units.events.addListener(l); }
+    @Override public void removeListener(PlayerListener l) { units.events.removeListener(l); }
+    @Override public PlayerState getState() { return units.states.state(); }
+    @Override public void setDataSource(String s) throws IOException { units.sources.set(s); }
+    @Override public void setDataSource(String url, Map<String, String> headers)
+            throws IOException { units.sources.set(url, headers); }
+    @Override public void setDataSource(FileDescriptor fd, long offset, long length)
+            throws IOException { units.sources.set(fd, offset, length); }
+    @Override public void setDataSource(MediaStreamSource s) throws IOException {
+        units.sources.set(s);
     }
+    @Override public void setPcmFormat(PcmMediaInfo f) { units.sources.setPcmFormat(f); }
+    @Override public void setSurface(@Nullable Surface s) { units.surface.set(s); }
+    @Override public CompletableFuture<Void> prepareAsync() throws IOException {
+        return units.preparation.prepareAsync();
+    }
+    @Override public void prepareAndWait() throws IOException {
+        units.preparation.prepareAndWait();
+    }
+    @Override public void start() { units.playback.start(); }
+    @Override public void pause() { units.playback.pause(); }
+    @Override public void stop() { units.playback.stop(); }
+    @Override public CompletableFuture<Void> reset() { return units.lifetime.reset(); }
+    @Override public void resetAndWait() throws IOException { units.lifetime.resetAndWait(); }
+    @Override public CompletableFuture<Void> release() { return units.lifetime.release(); }
+    @Override public void close() { units.lifetime.close(); }
+    @Override public CompletableFuture<Boolean> seekTo(int ms) { return units.seeking.seekTo(ms); }
+    @Override public void seekToAndWait(int millis) { units.seeking.seekToAndWait(millis); }
+    @Override public boolean isPlaying() { return units.playback.isPlaying(); }
+    @Override public int getCurrentPosition() { return units.playback.position(); }
+    @Override public int getDuration() { return units.playback.duration(); }
+    @Override public int getBufferedPercent() { return units.playback.bufferedPercent(); }
+    @Override public int getVideoWidth() { return units.playback.videoWidth(); }
+    @Override public int getVideoHeight() { return units.playback.videoHeight(); }
+    @Override public void setLooping(boolean on) { units.playback.setLooping(on); }
+    @Override public boolean isLooping() { return units.playback.isLooping(); }
+    @Override public Tracks tracks() { return units.tracks; }
+    @Override public Subtitles subtitles() { return units.subtitles; }
+    @Override public Pictures pictures() { return units.pictures; }
+    @Override public TrickPlay trickPlay() { return units.trickPlay; }
+    @Override public AudioOutput audio() { return units.audio; }
 
     // Fields that the native half reads and writes, all of them 0, null or false at first.
 
@@ -170,56 +166,56 @@ public final class OrvMediaPlayer extends Playback {
             Object weakPlayer, int what, int arg1, int arg2, Object payload) {
         if (weakPlayer instanceof WeakReference<?> reference
                 && reference.get() instanceof OrvMediaPlayer player) {
-            player.events().fromNative(what, arg1, arg2, (byte[]) payload);
+            player.units.nativeEvents.receive(what, arg1, arg2, (byte[]) payload);
         }
     }
 
     private int readStream(int length) {
-        return stream().read(length);
+        return units.source.stream().read(length);
     }
 
     private long seekStream(int type, long offset) {
-        return stream().seek(type, offset);
+        return units.source.stream().seek(type, offset);
     }
 
     private long seekStreamEx(int type, long offset) {
-        return stream().seek(type, offset);
+        return units.source.stream().seek(type, offset);
     }
 
     private long timeSeekStream(long first, long second) {
-        return stream().seekTime(first, second);
+        return units.source.stream().seekTime(first, second);
     }
 
     private int getSeekType() {
-        return stream().seekType();
+        return units.source.stream().seekType();
     }
 
     private void cancelRead() {
-        stream().cancel();
+        units.source.stream().cancel();
     }
 
     private void closeStream() {
-        stream().close();
+        units.source.stream().close();
     }
 
     private void setVideoCodecInfo(
             int codec, int width, int height, int frameRate, int bitRate, int flags) {
-        tracks.addVideo(0, codec, width, height, frameRate, bitRate, flags);
+        units.tables.addVideo(0, codec, width, height, frameRate, bitRate, flags);
     }
 
     private void setAllVideoCodecInfo(
             int count, int index, int codec, int width, int height, int frameRate, int bitRate,
             int flags) {
-        tracks.addVideo(index, codec, width, height, frameRate, bitRate, flags);
+        units.tables.addVideo(index, codec, width, height, frameRate, bitRate, flags);
     }
 
     private void setSubtitleTrackInfo(int trackId, int codec, String text, int flags) {
-        tracks.addSubtitle(0, trackId, codec, text, flags);
+        units.tables.addSubtitle(0, trackId, codec, text, flags);
     }
 
     private void setAllSubtitleTrackInfo(
             int count, int index, int trackId, int codec, String text, int flags) {
-        tracks.addSubtitle(index, trackId, codec, text, flags);
+        units.tables.addSubtitle(index, trackId, codec, text, flags);
     }
 
     private void setAllAudioTrackInfo(
@@ -227,7 +223,7 @@ public final class OrvMediaPlayer extends Playback {
             int bitsPerSample, int trackId, String title, String codecName, String channelLayout,
             String profile, int flags, String comment, String encoder, String handler,
             String language) {
-        tracks.addAudio(new AudioTrack(
+        units.tables.addAudio(new AudioTrack(
                 index, FourCharacters.text(codec), channels, sampleRate, bitRate, bitsPerSample,
                 trackId, title, codecName, channelLayout, profile, new TrackFlags(flags), comment,
                 encoder, handler, language));
@@ -237,31 +233,31 @@ public final class OrvMediaPlayer extends Playback {
             int duration, int bitRate, int year, int trackNumber, String title, String artist,
             String album, String genre, int chapterCount, String composer, String container,
             String comment) {
-        tracks.setMetadata(new MediaMetadata(
+        units.tables.setMetadata(new MediaMetadata(
                 duration, bitRate, year, trackNumber, title, artist, album, genre, chapterCount,
                 composer, container, comment));
     }
 
     private void setDivxTitleInfoPrm(int title, int playlistCount, int chapterCount) {
-        divx.receive(new DivxNavigation.TitleInfo(title, playlistCount, chapterCount));
+        units.divx.receive(new DivxNavigation.TitleInfo(title, playlistCount, chapterCount));
     }
 
     private void setDivxChapInfoPrm(int title, int playlist, int chapter, int start) {
-        divx.receive(new DivxNavigation.ChapterInfo(title, playlist, chapter, start));
+        units.divx.receive(new DivxNavigation.ChapterInfo(title, playlist, chapter, start));
     }
 
     private void setDivxPlayListInfoPrm(int title, int playlist, int chapter, int start) {
-        divx.receive(new DivxNavigation.ChapterInfo(title, playlist, chapter, start));
+        units.divx.receive(new DivxNavigation.ChapterInfo(title, playlist, chapter, start));
     }
 
     private void setDivxPositionInfoPrm(int title, int playlist, int chapter) {
-        divx.receive(new DivxNavigation.PositionInfo(title, playlist, chapter));
+        units.divx.receive(new DivxNavigation.PositionInfo(title, playlist, chapter));
     }
 
     private void setDivxDisplayInfoPrm(
             int value1, int value2, int value3, int value4, int value5, String text1, int value6,
             String text2, int value7) {
-        divx.receive(new DivxNavigation.DisplayInfo(
+        units.divx.receive(new DivxNavigation.DisplayInfo(
                 List.of(value1, value2, value3, value4, value5, value6, value7), text1, text2));
     }
 
@@ -270,7 +266,7 @@ public final class OrvMediaPlayer extends Playback {
             long audioPts, long audioFramePosition, long iPts, long pts, long iFramePosition,
             long framePosition, int temporalReference, int decodingOrder, long stc,
             long framePositionDisplayed, int timestamp) {
-        divx.receive(DivxNavigation.lastMemory(
+        units.divx.receive(EngineDivxNavigation.lastMemory(
                 new int[] {title, playlist, chapter, audio, subtitle, temporalReference,
                     decodingOrder, timestamp},
                 new long[] {clipId, audioPts, audioFramePosition, iPts, pts, iFramePosition,

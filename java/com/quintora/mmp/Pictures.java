@@ -2,28 +2,37 @@
 package com.quintora.mmp;
 
 import android.graphics.Bitmap;
-import com.quintora.mmp.util.ThumbnailInfo;
 import java.util.Optional;
+import java.util.concurrent.CompletableFuture;
 
 /**
  * Still pictures of a player's media. Thread-safe; all methods throw {@link IllegalStateException}
- * after release and block while the engine works, for milliseconds as a rule.
+ * after release.
  */
-public final class Pictures {
+public interface Pictures {
     /** The most rows that a thumbnail can have: the native half counts them in 8 bits. */
-    public static final int MAX_THUMBNAIL_HEIGHT = 255;
+    int MAX_THUMBNAIL_HEIGHT = 255;
 
     /** The most pixels that a row of a thumbnail can have. */
-    public static final int MAX_THUMBNAIL_WIDTH = 8192;
-
-    private final OrvMediaPlayer player;
-
-    Pictures(OrvMediaPlayer player) {
-        this.player = player;
-    }
+    int MAX_THUMBNAIL_WIDTH = 8192;
 
     /**
-     * Draws the picture of the present position in a size of one's own; the shape follows the size.
+     * Draws the picture of the present position; the shape follows the size. Does not block;
+     * pictures are drawn in the order of their calls, each of the position at the time when it is
+     * drawn.
+     *
+     * @param width pixels, 1 to {@link #MAX_THUMBNAIL_WIDTH}
+     * @param height rows, 1 to {@link #MAX_THUMBNAIL_HEIGHT}
+     * @param colorMode the pixels' format
+     * @return completed with the picture, with an empty one when the media has none or is not
+     *     prepared; exceptionally with an {@link IllegalStateException} after release
+     * @throws IllegalArgumentException for a size out of range and when the format is null
+     */
+    CompletableFuture<Optional<Thumbnail>> thumbnail(int width, int height, ColorMode colorMode);
+
+    /**
+     * Draws the picture of the present position; as {@link #thumbnail}, but blocks while the engine
+     * decodes it: for milliseconds as a rule, longer for large pictures far from a key frame.
      *
      * @param width pixels, 1 to {@link #MAX_THUMBNAIL_WIDTH}
      * @param height rows, 1 to {@link #MAX_THUMBNAIL_HEIGHT}
@@ -31,42 +40,22 @@ public final class Pictures {
      * @return the picture; empty when the media has none or is not prepared
      * @throws IllegalArgumentException for a size out of range and when the format is null
      */
-    public Optional<Thumbnail> thumbnail(int width, int height, ColorMode colorMode) {
-        player.states.requireAlive("thumbnail()");
-        requireRange("width", width, MAX_THUMBNAIL_WIDTH);
-        requireRange("height", height, MAX_THUMBNAIL_HEIGHT);
-        ThumbnailInfo request = new ThumbnailInfo(
-                Arguments.require(colorMode, "the pixels' format").number(), width, height);
-        return player.ask("thumbnail()",
-                        () -> Optional.ofNullable(player.native_getThumbnailInfo(request)))
-                .map(bytes -> new Thumbnail(width, height, colorMode, bytes));
-    }
+    Optional<Thumbnail> thumbnailAndWait(int width, int height, ColorMode colorMode);
 
     /**
-     * The picture inside the media, such as an album's cover.
+     * The picture inside the media, such as an album's cover. Does not wait for a server.
      *
-     * @return the bytes of an image file, as they stand in the media; empty when there is none
+     * @return the bytes of an image file, as they stand in the media, an array of the caller's own;
+     *     empty when there is none
      */
-    public Optional<byte[]> embedded() {
-        return player.ask("embedded()",
-                () -> Optional.ofNullable(player.native_getEmbeddedPicture(0)));
-    }
+    Optional<byte[]> embedded();
 
     /**
-     * The frame at a time, on platforms whose native half can grab frames.
+     * The frame at a time, on platforms whose native half can grab frames. Blocks while it is
+     * decoded.
      *
      * @param millis milliseconds from the start
      * @return the frame; empty on platforms that cannot, see {@link #thumbnail} there
      */
-    public Optional<Bitmap> frameAt(int millis) {
-        return player.ask("frameAt()",
-                () -> Optional.ofNullable(player.native_getFrameAt(millis)));
-    }
-
-    private static void requireRange(String name, int value, int most) {
-        if (value < 1 || value > most) {
-            throw new IllegalArgumentException(
-                    "a thumbnail's " + name + " must be 1 to " + most + ": " + value);
-        }
-    }
+    Optional<Bitmap> frameAtAndWait(int millis);
 }

@@ -1,28 +1,23 @@
 // SPDX-License-Identifier: Apache-2.0
 package com.quintora.mmp;
 
+import org.jetbrains.annotations.Nullable;
+
 /**
- * Is told what happens to a player: each thing once, in order, one call at a time, by the executor
- * that the player was made with. Calls may call the player, {@link OrvMediaPlayer#release()}
- * included. What a call throws goes to its thread's uncaught exception handler and disturbs nothing
- * else.
+ * Receives what happens to a player: each event once, in order, one call at a time, by the executor
+ * that the player was made with. Calls may call the player, {@link MediaPlayer#close()} included.
+ * What a call throws goes to its thread's uncaught exception handler and disturbs nothing else.
+ *
+ * <p>An executor that rejects a call, or drops one silently, only delays it: it is handed over
+ * again with the next event and after a while, in the same order.
  */
 public interface PlayerListener {
-    /** {@link #onInfo}: the picture or sound began to run for the first time. */
-    int INFO_RENDERING_STARTED = 3;
-
-    /** {@link #onInfo}: playing waits for data. */
-    int INFO_BUFFERING_STARTED = 701;
-
-    /** {@link #onInfo}: playing goes on. */
-    int INFO_BUFFERING_ENDED = 702;
-
     /**
      * The media is ready: {@link PlayerState#PREPARED}.
      *
      * @param player the player
      */
-    default void onPrepared(OrvMediaPlayer player) {}
+    default void onPrepared(MediaPlayer player) {}
 
     /**
      * The end of the media was reached: {@link PlayerState#COMPLETED}. A looping player goes on
@@ -30,14 +25,14 @@ public interface PlayerListener {
      *
      * @param player the player
      */
-    default void onCompletion(OrvMediaPlayer player) {}
+    default void onCompletion(MediaPlayer player) {}
 
     /**
      * A seek is done.
      *
      * @param player the player
      */
-    default void onSeekComplete(OrvMediaPlayer player) {}
+    default void onSeekComplete(MediaPlayer player) {}
 
     /**
      * The picture has a size for the first time, or another one.
@@ -46,7 +41,7 @@ public interface PlayerListener {
      * @param width pixels
      * @param height rows
      */
-    default void onVideoSizeChanged(OrvMediaPlayer player, int width, int height) {}
+    default void onVideoSizeChanged(MediaPlayer player, int width, int height) {}
 
     /**
      * The amount of buffered media changed.
@@ -54,25 +49,24 @@ public interface PlayerListener {
      * @param player the player
      * @param percent 0 to 100
      */
-    default void onBufferingUpdate(OrvMediaPlayer player, int percent) {}
+    default void onBufferingUpdate(MediaPlayer player, int percent) {}
 
     /**
-     * The media failed outside any call: {@link PlayerState#ERROR}. Failures of a call are thrown
-     * by it and not told here.
+     * The media failed outside any call that blocks: {@link PlayerState#ERROR}. Failures of a call
+     * are thrown by it and not reported here.
      *
      * @param player the player
-     * @param error what happened, in a sentence and as the engine's status
+     * @param error what happened, in a sentence, with its kind and advice
      */
-    default void onError(OrvMediaPlayer player, MediaException error) {}
+    default void onError(MediaPlayer player, MediaException error) {}
 
     /**
-     * Something worth knowing.
+     * Something worth knowing about playing, such as that it waits for data.
      *
      * @param player the player
-     * @param what one of the INFO constants, or a number of the engine's own
-     * @param extra the engine's further number, or 0
+     * @param info what it is
      */
-    default void onInfo(OrvMediaPlayer player, int what, int extra) {}
+    default void onInfo(MediaPlayer player, PlaybackInfo info) {}
 
     /**
      * A text of a timed-text track, on engines that deliver them.
@@ -80,5 +74,5 @@ public interface PlayerListener {
      * @param player the player
      * @param payload the engine's bytes, null when it sent none
      */
-    default void onTimedText(OrvMediaPlayer player, byte[] payload) {}
+    default void onTimedText(MediaPlayer player, byte @Nullable [] payload) {}
 }

@@ -12,8 +12,10 @@ package com.quintora.mmp;
  * @param flags what is said of the track
  */
 public record SubtitleTrack(
-        int index, int trackId, String codec, String language, String title, TrackFlags flags) {
-    SubtitleTrack withIndex(int number) {
-        return new SubtitleTrack(number, trackId, codec, language, title, flags);
+        int index, int trackId, String codec, String language, String title, TrackFlags flags)
+        implements Track {
+    @Override
+    public Kind kind() {
+        return Kind.SUBTITLE;
     }
 }

@@ -2,79 +2,97 @@
 package com.quintora.mmp;
 
 import com.quintora.SubtitleAttr;
+import java.io.IOException;
+import java.net.URI;
+import java.nio.file.Path;
+import java.util.concurrent.CompletableFuture;
 
 /**
- * Subtitles on a player's picture. Thread-safe; all methods throw {@link IllegalStateException}
- * after release. The engine reports no failures here: {@link Tracks#subtitles()} and {@link
- * Tracks#currentSubtitle()} tell what came of a call.
+ * Files of subtitles for a player's media, and how subtitles look. Which track is shown is chosen
+ * by {@link Tracks#select}. Thread-safe; all methods throw {@link IllegalStateException} after
+ * release.
  */
-public final class Subtitles {
-    private final OrvMediaPlayer player;
-
-    Subtitles(OrvMediaPlayer player) {
-        this.player = player;
-    }
-
+public interface Subtitles {
     /**
-     * Shows a subtitle track. Unknown indices are ignored.
+     * Adds the subtitles of a file or URL, such as SRT or ASS, as a track and shows it. Allowed
+     * while the player has media. Does not block.
      *
-     * @param index its number among the subtitle tracks, from 0
-     */
-    public void show(int index) {
-        player.run("show()", () -> player.native_onSubtitleTrack(index));
-    }
-
-    /** Shows no subtitles. */
-    public void hide() {
-        player.run("hide()", player::native_offSubtitleTrack);
-    }
-
-    /**
-     * Adds the subtitles of a file or URL, such as SRT or ASS, as a track and shows it. Blocks
-     * while they are read, for a URL ten seconds at most.
-     *
-     * @param pathOrUrl where they are
+     * @param pathOrUrl a file's path, or a URL
+     * @return completed with the new track; exceptionally with a {@link MediaException} when there
+     *     are no subtitles that can be read, with an {@link IllegalStateException} after a reset or
+     *     release
      * @throws IllegalArgumentException when it is null
+     * @throws IllegalStateException when the player has no prepared media
      */
-    public void add(String pathOrUrl) {
-        player.run("add()", () -> player.native_setSubtitleDataSource(
-                Arguments.require(pathOrUrl, "the path or URL")));
+    CompletableFuture<SubtitleTrack> add(String pathOrUrl);
+
+    /**
+     * Adds the subtitles of a file; as {@link #add(String)}.
+     *
+     * @param file the file, of the default file system
+     * @return as {@link #add(String)}
+     * @throws IllegalArgumentException when it is null, or of another file system
+     * @throws IllegalStateException when the player has no prepared media
+     */
+    default CompletableFuture<SubtitleTrack> add(Path file) {
+        return add(SourceNames.of(file));
     }
 
     /**
-     * Adds subtitles that are a pair of files as a track and shows it. Blocks while they are read.
+     * Adds the subtitles that a URI names; as {@link #add(String)}.
+     *
+     * @param uri an absolute URI, {@code file:} included
+     * @return as {@link #add(String)}
+     * @throws IllegalArgumentException when it is null or relative
+     * @throws IllegalStateException when the player has no prepared media
+     */
+    default CompletableFuture<SubtitleTrack> add(URI uri) {
+        return add(SourceNames.of(uri));
+    }
+
+    /**
+     * Adds the subtitles of a file or URL and shows them; as {@link #add(String)}, but blocks while
+     * they are read, for a URL ten seconds at most.
+     *
+     * @param pathOrUrl a file's path, or a URL
+     * @return the new track
+     * @throws IllegalArgumentException when it is null
+     * @throws MediaException when there are no subtitles that can be read
+     * @throws IllegalStateException when the player has no prepared media
+     */
+    SubtitleTrack addAndWait(String pathOrUrl) throws IOException;
+
+    /**
+     * Adds subtitles that are a pair of files, and shows them; otherwise as {@link
+     * #addAndWait(String)}.
      *
      * @param pictures the path of the file with the pictures (.sub)
      * @param index the path of the file with their times (.idx)
+     * @return the new track
      * @throws IllegalArgumentException when one of them is null
+     * @throws MediaException when there are no subtitles that can be read
+     * @throws IllegalStateException when the player has no prepared media
      */
-    public void add(String pictures, String index) {
-        player.run("add()", () -> player.native_setSubtitleDataSourceEx(
-                Arguments.require(pictures, "the path of the pictures"),
-                Arguments.require(index, "the path of the index")));
-    }
+    SubtitleTrack addPairAndWait(String pictures, String index) throws IOException;
 
     /**
-     * Adds a file or URL of timed text as a track, without showing it. Blocks as {@link
-     * #add(String)} does.
+     * Adds the timed text of a file or URL as a track, without showing it; otherwise as {@link
+     * #addAndWait(String)}.
      *
-     * @param pathOrUrl where it is
+     * @param pathOrUrl a file's path, or a URL
+     * @return the new track
      * @throws IllegalArgumentException when it is null
+     * @throws MediaException when there is no text that can be read
+     * @throws IllegalStateException when the player has no prepared media
      */
-    public void addTimedText(String pathOrUrl) {
-        player.run("addTimedText()", () -> player.native_addTimedTextSource(
-                Arguments.require(pathOrUrl, "the path or URL")));
-    }
+    SubtitleTrack addTimedTextAndWait(String pathOrUrl) throws IOException;
 
     /**
-     * Changes how subtitles look; what the attributes do not name stays as it is.
+     * Changes how subtitles look; what the attributes do not name stays as it is. Every state, from
+     * the next picture on.
      *
      * @param attr such as {@code SubtitleAttr.builder().textColor(0xFFFFFF00).build()}
-     * @throws IllegalArgumentException when they are null, or the mask names a group that is null
+     * @throws IllegalArgumentException when it is null, or its mask names a group that is null
      */
-    public void setStyle(SubtitleAttr attr) {
-        player.states.requireAlive("setStyle()");
-        Arguments.require(attr, "the attributes' object").check();
-        player.run("setStyle()", () -> player.native_setSubtitleAttr(attr));
-    }
+    void setStyle(SubtitleAttr attr);
 }

@@ -2,31 +2,19 @@
 package com.quintora.mmp;
 
 import java.io.IOException;
+import java.util.concurrent.CompletableFuture;
 
 /**
  * Speeds, single frames, repeated sections and byte positions of a player. Thread-safe; all methods
  * throw {@link IllegalStateException} after release, and those that change something also before
  * the media is prepared.
  */
-public final class TrickPlay {
+public interface TrickPlay {
     /** The lowest speed, forward and backward. */
-    public static final double MIN_SPEED = 0.25;
+    double MIN_SPEED = 0.25;
 
     /** The highest speed, forward and backward. */
-    public static final double MAX_SPEED = 32;
-
-    // The engine counts speeds in thousandths.
-    private static final int NORMAL_SPEED = 1000;
-
-    private static final int REPEAT_OFF = 0;
-    private static final int REPEAT_SET_A = 1;
-    private static final int REPEAT_SET_B = 2;
-
-    private final OrvMediaPlayer player;
-
-    TrickPlay(OrvMediaPlayer player) {
-        this.player = player;
-    }
+    double MAX_SPEED = 32;
 
     /**
      * Changes the speed of playing.
@@ -36,24 +24,14 @@ public final class TrickPlay {
      * @throws IllegalArgumentException for a speed that {@link #canPlayAt} denies
      * @throws IllegalStateException before the media is prepared
      */
-    public void setSpeed(double speed) {
-        requireMedia("setSpeed()");
-        if (!canPlayAt(speed)
-                || player.ask("setSpeed()",
-                        () -> player.native_setPlayMode(thousandths(speed)) != 0)) {
-            throw new IllegalArgumentException("this media cannot be played at speed " + speed);
-        }
-        player.wake();
-    }
+    void setSpeed(double speed);
 
     /**
      * The speed of playing.
      *
      * @return 1 for normal, negative for backward
      */
-    public double getSpeed() {
-        return player.ask("getSpeed()", player::native_getPlayMode) / (double) NORMAL_SPEED;
-    }
+    double getSpeed();
 
     /**
      * Whether a seek is possible while playing at a speed.
@@ -61,10 +39,7 @@ public final class TrickPlay {
      * @param speed as for {@link #setSpeed}, or 0 for halted
      * @return true if so
      */
-    public boolean canSeekAt(double speed) {
-        return player.ask("canSeekAt()",
-                () -> inRange(speed) && player.native_canDoSeek(thousandths(speed)));
-    }
+    boolean canSeekAt(double speed);
 
     /**
      * Whether the media can be played at a speed.
@@ -72,106 +47,68 @@ public final class TrickPlay {
      * @param speed as for {@link #setSpeed}
      * @return true if so; false for every speed out of range
      */
-    public boolean canPlayAt(double speed) {
-        return player.ask("canPlayAt()",
-                () -> inRange(speed) && player.native_canDoTrick(thousandths(speed)));
-    }
+    boolean canPlayAt(double speed);
 
     /**
-     * Goes some frames on and halts there. Blocks until the last one is shown, at most 5 seconds
-     * for each frame forward and 10 for each back; reset and release end it. The player becomes
-     * PAUSED, also when there are fewer frames: it halts at the last one then. Media without a
-     * picture play on.
+     * Goes some frames on and halts there. Does not block; steps are carried out in the order of
+     * their calls. The player becomes PAUSED, also when there are fewer frames: it halts at the
+     * last one then. Media without a picture play on.
      *
      * @param frames how many; negative for back
-     * @throws IllegalStateException when the media have no picture or no such frame
+     * @return completed when the last frame is shown; exceptionally with an {@link
+     *     IllegalStateException} when the media have no picture or no such frame, or after a reset
+     *     or release
+     * @throws IllegalStateException before the media is prepared
      */
-    public void step(int frames) {
-        requireMedia("step()");
-        player.halt("step()", () -> player.native_step(frames));
-    }
+    CompletableFuture<Void> step(int frames);
+
+    /**
+     * Goes some frames on and halts there; as {@link #step}, but blocks until the last one is
+     * shown: at most 5 seconds for each frame forward and 10 for each back. Reset and release on
+     * another thread end it.
+     *
+     * @param frames how many; negative for back
+     * @throws IllegalStateException before the media is prepared, and when the media have no
+     *     picture or no such frame
+     */
+    void stepAndWait(int frames);
 
     /**
      * Begins the section to repeat at the present position.
      *
      * @return false when the engine cannot
      */
-    public boolean repeatFromHere() {
-        return repeat("repeatFromHere()", REPEAT_SET_A);
-    }
+    boolean repeatFromHere();
 
     /**
      * Ends the section to repeat at the present position and repeats it from now on.
      *
      * @return false when no section was begun before this position
      */
-    public boolean repeatUntilHere() {
-        return repeat("repeatUntilHere()", REPEAT_SET_B);
-    }
+    boolean repeatUntilHere();
 
     /**
      * Repeats no section any more.
      *
      * @return false when the engine cannot
      */
-    public boolean repeatOff() {
-        return repeat("repeatOff()", REPEAT_OFF);
-    }
+    boolean repeatOff();
 
     /**
-     * Where the media is being read.
+     * The place in the media's data that is being read.
      *
      * @return bytes from the start; the low 32 bits of it, as an unsigned number
-     * @throws IOException when the engine cannot tell
+     * @throws IOException when the engine does not know it
      */
-    public long getBytePosition() throws IOException {
-        requireMedia("getBytePosition()");
-        try {
-            return Integer.toUnsignedLong(player.native_getCurrentBytePosition());
-        } catch (IllegalStateException e) {
-            throw player.refusal("getBytePosition()", e);
-        }
-    }
+    long getBytePosition() throws IOException;
 
     /**
-     * Goes to a place in the media's bytes, and blocks until it is shown, for a limited time, as
-     * {@link OrvMediaPlayer#seekTo} does.
+     * Goes to a place in the media's data, and blocks until its picture is shown or the engine
+     * gives up waiting for it.
      *
      * @param position bytes from the start, below 2 GiB: the native half carries no more
      * @throws IllegalArgumentException for a position out of range
      * @throws IllegalStateException when the engine cannot
      */
-    public void seekToByte(long position) {
-        requireMedia("seekToByte()");
-        if (position < 0 || position > Integer.MAX_VALUE) {
-            throw new IllegalArgumentException("the byte position is out of range: " + position);
-        }
-        player.seek("seekToByte(" + position + ")", () -> player.native_seekToPosition(position));
-    }
-
-    /**
-     * How much of the media is buffered.
-     *
-     * @return 0 to 100
-     */
-    public int getBufferedPercent() {
-        return player.ask("getBufferedPercent()", player::native_getBufferPercent);
-    }
-
-    private boolean repeat(String call, int type) {
-        requireMedia(call);
-        return player.ask(call, () -> player.native_setABRepeat(type) > 0);
-    }
-
-    private void requireMedia(String call) {
-        player.states.require(call, StateMachine.WITH_MEDIA);
-    }
-
-    private static boolean inRange(double speed) {
-        return speed >= -MAX_SPEED && speed <= MAX_SPEED;
-    }
-
-    private static int thousandths(double speed) {
-        return (int) Math.round(speed * NORMAL_SPEED);
-    }
+    void seekToByteAndWait(long position);
 }

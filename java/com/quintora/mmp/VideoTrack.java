@@ -19,4 +19,9 @@ public record VideoTrack(
         int height,
         double frameRate,
         int bitRate,
-        TrackFlags flags) {}
+        TrackFlags flags) implements Track {
+    @Override
+    public Kind kind() {
+        return Kind.VIDEO;
+    }
+}

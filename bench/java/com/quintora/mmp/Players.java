@@ -16,7 +16,7 @@ final class Players {
 
     public static void main(String[] arguments) throws InterruptedException {
         int count = Integer.parseInt(arguments[0]);
-        new OrvMediaPlayer().release(); // Loads what the first one alone has to.
+        new OrvMediaPlayer().close(); // Loads what the first one alone has to.
         List<OrvMediaPlayer> players = new ArrayList<>(count);
         long begin = System.nanoTime();
         for (int i = 0; i < count; i++) {
@@ -25,7 +25,7 @@ final class Players {
         System.out.println((System.nanoTime() - begin) / 1e9);
         System.out.println(processorSecondsIn(Long.parseLong(arguments[1])));
         begin = System.nanoTime();
-        players.forEach(OrvMediaPlayer::release);
+        players.forEach(OrvMediaPlayer::close);
         System.out.println((System.nanoTime() - begin) / 1e9);
     }
 

@@ -8,10 +8,10 @@ final class Thumbnails {
     public static void main(String[] arguments) throws Exception {
         try (OrvMediaPlayer player = new OrvMediaPlayer()) {
             player.setDataSource(arguments[0]);
-            player.prepare();
+            player.prepareAndWait();
             for (int i = 1; i < arguments.length; i++) {
-                player.seekTo(Integer.parseInt(arguments[i]));
-                player.pictures().thumbnail(320, 180, ColorMode.XRGB8888).orElseThrow();
+                player.seekToAndWait(Integer.parseInt(arguments[i]));
+                player.pictures().thumbnailAndWait(320, 180, ColorMode.XRGB8888).orElseThrow();
             }
         }
     }

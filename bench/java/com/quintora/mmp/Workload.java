@@ -16,6 +16,6 @@ abstract class Workload {
 
     /** Checks that the runs had their effect, where only that shows it, and frees the player. */
     void close() throws Exception {
-        player.release();
+        player.close();
     }
 }

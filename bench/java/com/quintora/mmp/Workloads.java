@@ -99,7 +99,7 @@ final class Workloads {
             @Override
             void run(int times) {
                 for (int i = 0; i < times; i++) {
-                    new OrvMediaPlayer().release();
+                    new OrvMediaPlayer().close();
                 }
             }
         };
@@ -112,13 +112,13 @@ final class Workloads {
             void run(int times) throws Exception {
                 for (int i = 0; i < times; i++) {
                     player.setDataSource(media(FILM));
-                    player.prepare();
+                    player.prepareAndWait();
                 }
             }
 
             @Override
             void rewind() throws Exception {
-                player.reset();
+                player.resetAndWait();
             }
         };
     }
@@ -132,7 +132,7 @@ final class Workloads {
             void run(int times) {
                 for (int i = 0; i < times; i++) {
                     target = target == LAST_KEY_FRAME_MILLIS ? 0 : target + KEY_FRAME_MILLIS;
-                    player.seekTo(target);
+                    player.seekToAndWait(target);
                 }
             }
         };
@@ -144,7 +144,7 @@ final class Workloads {
             @Override
             void run(int times) {
                 for (int i = 0; i < times; i++) {
-                    player.pictures().thumbnail(320, 180, ColorMode.RGBA8888).orElseThrow();
+                    player.pictures().thumbnailAndWait(320, 180, ColorMode.RGBA8888).orElseThrow();
                 }
             }
         };
@@ -177,7 +177,7 @@ final class Workloads {
         FilmWorkload() throws Exception {
             player.setSurface(screen.getSurface());
             player.setDataSource(media(FILM));
-            player.prepare();
+            player.prepareAndWait();
         }
 
         @Override
@@ -207,7 +207,7 @@ final class Workloads {
             try {
                 player.native_setPcmFlag();
                 player.setDataSource(media(SAMPLES));
-                player.prepare();
+                player.prepareAndWait();
                 int millis = player.getDuration();
                 require(Math.abs(millis - MONO_MILLIS) <= TOLERANCE_MILLIS,
                         "the samples last " + millis + " ms: the description was not taken");
@@ -224,7 +224,7 @@ final class Workloads {
         TracksWorkload(int count) throws Exception {
             this.count = count;
             player.setDataSource(media("bench/tracks-" + count + ".mka"));
-            player.prepare();
+            player.prepareAndWait();
         }
 
         @Override

@@ -34,7 +34,7 @@ class BadInputTest extends PlayerFixture {
 
     @AfterEach
     void theNextCorrectCallWorks() throws Exception {
-        player.reset();
+        player.resetAndWait();
         prepare("silent.mkv");
         player.start();
         awaitMoving();
@@ -57,7 +57,7 @@ class BadInputTest extends PlayerFixture {
     void aFileThatIsMissing() {
         MediaException e = refusedAtOnce(folder + "/none.mkv");
         assertEquals(folder + "/none.mkv: no such file", e.getMessage());
-        assertEquals(MediaException.STATUS_NOT_FOUND, e.status());
+        assertEquals(MediaError.NOT_FOUND, e.error());
     }
 
     @Test
@@ -92,7 +92,7 @@ class BadInputTest extends PlayerFixture {
         new Random(42).nextBytes(noise);
         Path file = Files.write(folder.resolve("noise.mkv"), noise);
         MediaException e = refusedByPrepare(file);
-        assertEquals(MediaException.STATUS_MALFORMED, e.status());
+        assertEquals(MediaError.MALFORMED, e.error());
         assertEquals(file + ": unknown format", e.getMessage());
     }
 
@@ -118,7 +118,7 @@ class BadInputTest extends PlayerFixture {
                 folder.resolve("unknown.mkv"),
                 replace(media, "V_MPEG4/ISO/AVC", "V_QQQQQ/QQQ/QQQ"));
         MediaException e = refusedByPrepare(file);
-        assertEquals(MediaException.STATUS_UNSUPPORTED, e.status());
+        assertEquals(MediaError.UNSUPPORTED, e.error());
         assertEquals(file + ": has no track that can be played", e.getMessage());
     }
 
@@ -186,12 +186,12 @@ class BadInputTest extends PlayerFixture {
                 () -> engine.setMetadataFilter(Set.of(), null));
         assertNullRefused("a code",
                 () -> engine.setMetadataFilter(Collections.singleton(null), Set.of()));
-        assertNullRefused("the path or URL", () -> player.subtitles().add(null));
-        assertNullRefused("the path of the pictures", () -> player.subtitles().add(null, "x"));
-        assertNullRefused("the path of the index", () -> player.subtitles().add("x", null));
-        assertNullRefused("the path or URL", () -> player.subtitles().addTimedText(null));
+        assertNullRefused("the path or URL", () -> player.subtitles().addAndWait(null));
+        assertNullRefused("the path of the pictures", () -> player.subtitles().addPairAndWait(null, "x"));
+        assertNullRefused("the path of the index", () -> player.subtitles().addPairAndWait("x", null));
+        assertNullRefused("the path or URL", () -> player.subtitles().addTimedTextAndWait(null));
         assertNullRefused("the attributes' object", () -> player.subtitles().setStyle(null));
-        assertNullRefused("the pixels' format", () -> player.pictures().thumbnail(1, 1, null));
+        assertNullRefused("the pixels' format", () -> player.pictures().thumbnailAndWait(1, 1, null));
         assertNullRefused("the position", () -> player.divx().setLastMemory(null));
         assertNullRefused("the channel", () -> new ChannelStreamSource(null));
         parcel.recycle();
@@ -263,7 +263,7 @@ class BadInputTest extends PlayerFixture {
         player.prepareAsync();
         recorder.await("error");
         assertEquals(PlayerState.ERROR, player.getState());
-        assertEquals(MediaException.STATUS_MALFORMED, recorder.error.status());
+        assertEquals(MediaError.MALFORMED, recorder.error.error());
         assertEquals(1, recorder.count("error"));
         assertEquals(0, recorder.count("prepared"));
     }
@@ -289,7 +289,7 @@ class BadInputTest extends PlayerFixture {
 
     private MediaException refusedByPrepare(String source) throws IOException {
         player.setDataSource(source);
-        MediaException e = assertThrows(MediaException.class, player::prepare);
+        MediaException e = assertThrows(MediaException.class, player::prepareAndWait);
         assertEquals(PlayerState.ERROR, player.getState());
         return e;
     }

@@ -2,7 +2,6 @@
 package com.quintora.mmp;
 
 import static org.junit.jupiter.api.Assertions.assertEquals;
-import static org.junit.jupiter.api.Assertions.assertFalse;
 import static org.junit.jupiter.api.Assertions.assertThrows;
 import static org.junit.jupiter.api.Assertions.assertTrue;
 
@@ -10,14 +9,13 @@ import java.util.List;
 import java.util.Optional;
 import java.util.OptionalDouble;
 import java.util.OptionalInt;
-import java.util.OptionalLong;
 import org.junit.jupiter.api.Test;
 
 class DescriptionTest extends PlayerFixture {
     @Test
     void thereIsNoneBeforeTheMedia() {
         assertEquals(Optional.empty(), player.tracks().description());
-        player.release();
+        player.close();
         assertThrows(IllegalStateException.class, () -> player.tracks().description());
     }
 
@@ -44,13 +42,13 @@ class DescriptionTest extends PlayerFixture {
         assertEquals(Optional.of("PQ"), picture.color().highDynamicRange());
         assertEquals(OptionalInt.of(10), picture.bitDepth());
         assertEquals(OptionalDouble.of(4000), picture.light().masteringMax());
-        player.reset();
+        player.resetAndWait();
         prepare("lying90mirrored.mp4");
         picture = onlyStream(MediaStream.Kind.VIDEO).picture().orElseThrow();
         assertEquals(90, picture.rotation());
         assertTrue(picture.mirrored());
         assertEquals(90, picture.displayWidth());
-        player.reset();
+        player.resetAndWait();
         prepare("fonts.mkv");
         var font = onlyStream(MediaStream.Kind.ATTACHMENT).attachment().orElseThrow();
         assertEquals(Optional.of("Größe ＡＢ.ttf"), font.fileName());
@@ -63,32 +61,6 @@ class DescriptionTest extends PlayerFixture {
         MediaStream video = onlyStream(MediaStream.Kind.VIDEO);
         assertEquals(Optional.of("Première \\ prise"), video.title());
         assertEquals(Optional.of("fra"), video.language());
-    }
-
-    @Test
-    void aTextOfAnotherFormIsUnknownValues() {
-        assertEquals(Optional.empty(), DescriptionText.parse(""));
-        assertEquals(Optional.empty(), DescriptionText.parse("neither\n=a\n[stream]\nindex=1\n"));
-        String text = "[media]\nformat=x\nsize=many\nstartUs=-5\n[news]\nformat=y\n"
-                + "[stream]\nkind=hologram\nindex=99999999999\nlevel=\n"
-                + "[stream]\nkind=video\npixelAspect=4\ndisplayAspect=0:1\nframeRate=30000/1001\n"
-                + "title=a\\nb\\\\n\\\nbroken";
-        MediaDescription media = DescriptionText.parse(text).orElseThrow();
-        assertEquals("x", media.format());
-        assertEquals(OptionalLong.empty(), media.size());
-        assertEquals(OptionalLong.of(-5), media.startMicros());
-        MediaStream unknown = media.streams().get(0);
-        assertEquals(MediaStream.Kind.DATA, unknown.kind());
-        assertEquals(0, unknown.index());
-        assertEquals(OptionalInt.empty(), unknown.level());
-        assertEquals(List.of(), unknown.flags());
-        MediaStream video = media.streams().get(1);
-        assertEquals(Optional.of("a\nb\\n\\"), video.title());
-        PictureDetails picture = video.picture().orElseThrow();
-        assertEquals(Optional.empty(), picture.pixelAspect());
-        assertEquals(Optional.empty(), picture.displayAspect());
-        assertEquals(29.97, picture.frameRate().orElseThrow(), 0.001);
-        assertFalse(picture.mirrored());
     }
 
     private MediaStream onlyStream(MediaStream.Kind kind) {

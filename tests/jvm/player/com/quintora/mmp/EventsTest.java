@@ -6,6 +6,7 @@ import static org.junit.jupiter.api.Assertions.assertFalse;
 import static org.junit.jupiter.api.Assertions.assertThrows;
 import static org.junit.jupiter.api.Assertions.assertTrue;
 
+import com.quintora.mmp.internal.state.StateMachine;
 import java.util.EnumSet;
 import org.junit.jupiter.api.Test;
 
@@ -16,14 +17,14 @@ class EventsTest extends PlayerFixture {
         prepare("silent.mkv");
         player.start();
         recorder.await("completion");
-        player.reset();
+        player.resetAndWait();
         prepare("video.mp4");
-        player.seekTo(4000);
+        player.seekToAndWait(4000);
         recorder.told.clear();
         // A start after which the engine stands.
-        player.command("start()", StateMachine.WITH_MEDIA, StateMachine.WITH_MEDIA,
-                PlayerState.STARTED, () -> {});
-        player.wake();
+        int epoch = player.units.states.epoch();
+        player.units.states.move(epoch, StateMachine.WITH_MEDIA, PlayerState.STARTED);
+        player.units.watcher.wake();
         recorder.await("info 701 0");
         assertEquals(0, recorder.count("info 3 0"));
         player.native_start();
@@ -34,13 +35,13 @@ class EventsTest extends PlayerFixture {
     @Test
     void aChangeIsNotSeenBeforeItsCallIsQueued() throws Exception {
         player.setDataSource(Media.path("silent.mkv"));
-        int epoch = player.states.enter("test", EnumSet.of(PlayerState.INITIALIZED),
+        int epoch = player.units.states.enter("test", EnumSet.of(PlayerState.INITIALIZED),
                 PlayerState.PREPARING);
-        Thread telling = new Thread(() -> player.events().prepared(epoch));
-        synchronized (player.events()) {
-            telling.start();
+        Thread reporting = new Thread(() -> player.units.events.prepared(epoch));
+        synchronized (player.units.events) {
+            reporting.start();
             Wait.until("it waits to queue the call",
-                    () -> telling.getState() == Thread.State.BLOCKED);
+                    () -> reporting.getState() == Thread.State.BLOCKED);
             assertEquals(PlayerState.PREPARING, player.getState());
         }
         recorder.await("prepared");
@@ -48,24 +49,24 @@ class EventsTest extends PlayerFixture {
 
     @Test
     void aSeekOfTheOldMediaEndsNoneOfTheNew() throws Exception {
-        int old = player.states.epoch();
-        player.events().seekBegins(old);
-        player.reset();
-        player.events().seekBegins(old);
-        assertFalse(player.events().seeking());
-        player.events().seekBegins(player.states.epoch());
-        player.events().seekEnds(old, false);
-        assertTrue(player.events().seeking());
+        int old = player.units.states.epoch();
+        player.units.events.seekBegins(old);
+        player.resetAndWait();
+        player.units.events.seekBegins(old);
+        assertFalse(player.units.events.seeking());
+        player.units.events.seekBegins(player.units.states.epoch());
+        player.units.events.seekEnds(old, false);
+        assertTrue(player.units.events.seeking());
     }
 
     @Test
     void aSeekThatFailsInAnyWayIsOver() throws Exception {
         prepare("silent.mkv");
-        assertThrows(AssertionError.class, () -> player.seek("seekTo(1)", () -> {
+        assertThrows(AssertionError.class, () -> player.units.seeking.seek("seekTo(1)", () -> {
             throw new AssertionError("no memory");
         }));
-        assertFalse(player.events().seeking());
-        player.seekTo(0);
+        assertFalse(player.units.events.seeking());
+        player.seekToAndWait(0);
         recorder.await("seek");
         assertEquals(1, recorder.count("seek"));
     }

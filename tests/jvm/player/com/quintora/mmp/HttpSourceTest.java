@@ -16,6 +16,7 @@ import java.nio.file.Files;
 import java.nio.file.Path;
 import java.util.List;
 import java.util.Map;
+import java.util.Optional;
 import java.util.OptionalInt;
 import java.util.concurrent.CopyOnWriteArrayList;
 import java.util.concurrent.ExecutorService;
@@ -43,7 +44,7 @@ class HttpSourceTest extends PlayerFixture {
 
     @AfterEach
     void stopServing() {
-        player.release();
+        player.close();
         server.stop(0);
         threads.shutdownNow();
     }
@@ -52,7 +53,7 @@ class HttpSourceTest extends PlayerFixture {
     void aUrlIsPlayedAndSought() throws Exception {
         open(url("/film.mp4"));
         assertEquals(10_000, player.getDuration(), 50);
-        player.seekTo(6000);
+        player.seekToAndWait(6000);
         assertEquals(6000, player.getCurrentPosition(), 40);
         player.start();
         awaitMoving();
@@ -62,8 +63,8 @@ class HttpSourceTest extends PlayerFixture {
     void headersGoWithEveryRequest() throws Exception {
         player.setDataSource(url("/film.mp4"),
                 Map.of("X-Ticket", "a, b; c", "User-Agent", "tests/1"));
-        player.prepare();
-        player.seekTo(8000);
+        player.prepareAndWait();
+        player.seekToAndWait(8000);
         assertFalse(requests.isEmpty());
         for (Map<String, List<String>> headers : requests) {
             assertEquals(List.of("a, b; c"), headers.get("X-ticket"));
@@ -74,8 +75,8 @@ class HttpSourceTest extends PlayerFixture {
     @Test
     void headersDoNotOutliveTheirMedia() throws Exception {
         player.setDataSource(url("/film.mp4"), Map.of("X-Ticket", "old"));
-        player.prepare();
-        player.reset();
+        player.prepareAndWait();
+        player.resetAndWait();
         requests.clear();
         open(url("/film.mp4"));
         assertFalse(requests.isEmpty());
@@ -87,19 +88,20 @@ class HttpSourceTest extends PlayerFixture {
     @Test
     void noHeadersAreHeadersToo() throws Exception {
         player.setDataSource(url("/film.mp4"), Map.of());
-        player.prepare();
+        player.prepareAndWait();
         assertEquals(10_000, player.getDuration(), 50);
     }
 
     @Test
     void whatTheServerDoesNotHaveIsRefused() throws Exception {
         player.setDataSource(url("/nothing.mp4"));
-        MediaException e = assertThrows(MediaException.class, player::prepare);
+        MediaException e = assertThrows(MediaException.class, player::prepareAndWait);
         assertEquals(
                 url("/nothing.mp4") + ": the server has no such media (HTTP status 404)",
                 e.getMessage());
-        assertEquals(MediaException.STATUS_HTTP - 404, e.status());
-        player.reset();
+        assertEquals(MediaError.HTTP, e.error());
+        assertEquals(OptionalInt.of(404), e.httpStatus());
+        player.resetAndWait();
         open(url("/film.mp4"));
     }
 
@@ -107,11 +109,11 @@ class HttpSourceTest extends PlayerFixture {
     void theCurrentTracksAreKnownWithoutAnotherRequest() throws Exception {
         open(url("/film.mp4"));
         int before = requests.size();
-        assertEquals(OptionalInt.of(0), player.tracks().currentAudio());
-        assertEquals(OptionalInt.empty(), player.tracks().currentSubtitle());
+        assertEquals(OptionalInt.of(0), player.tracks().currentIndex(Track.Kind.AUDIO));
+        assertEquals(OptionalInt.empty(), player.tracks().currentIndex(Track.Kind.SUBTITLE));
         assertEquals(before, requests.size());
-        player.reset();
-        assertEquals(OptionalInt.empty(), player.tracks().currentAudio());
+        player.resetAndWait();
+        assertEquals(Optional.empty(), player.tracks().currentAudio());
     }
 
     private String url(String path) {

@@ -36,11 +36,11 @@ class ListenerTest extends PlayerFixture {
     @Test
     void seeksAreToldOnceEach() throws Exception {
         prepare("video.mp4");
-        player.seekTo(4000);
-        player.seekTo(2000);
+        player.seekToAndWait(4000);
+        player.seekToAndWait(2000);
         Wait.until("both were told", () -> recorder.count("seek") == 2);
         player.start();
-        player.seekTo(6000);
+        player.seekToAndWait(6000);
         Wait.until("the third was told", () -> recorder.count("seek") == 3);
     }
 
@@ -48,7 +48,7 @@ class ListenerTest extends PlayerFixture {
     void theSameMediaTellsAgainAfterReset() throws Exception {
         prepare("silent.mkv");
         recorder.await("size 320x180");
-        player.reset();
+        player.resetAndWait();
         recorder.told.clear();
         prepare("silent.mkv");
         recorder.await("size 320x180");
@@ -59,7 +59,7 @@ class ListenerTest extends PlayerFixture {
     void everythingIsToldOnOneDaemonThreadByDefault() throws Exception {
         prepare("silent.mkv");
         player.start();
-        player.seekTo(0);
+        player.seekToAndWait(0);
         recorder.await("completion");
         assertEquals(1, recorder.threads.stream().distinct().count());
         assertTrue(recorder.threads.get(0).isDaemon());
@@ -90,12 +90,12 @@ class ListenerTest extends PlayerFixture {
             AtomicBoolean completed = new AtomicBoolean();
             other.addListener(new PlayerListener() {
                 @Override
-                public void onPrepared(OrvMediaPlayer told) {
+                public void onPrepared(MediaPlayer told) {
                     told.start();
                 }
 
                 @Override
-                public void onCompletion(OrvMediaPlayer told) {
+                public void onCompletion(MediaPlayer told) {
                     completed.set(true);
                 }
             });
@@ -111,16 +111,16 @@ class ListenerTest extends PlayerFixture {
         Recorder second = new Recorder();
         player.addListener(new PlayerListener() {
             @Override
-            public void onPrepared(OrvMediaPlayer told) {
+            public void onPrepared(MediaPlayer told) {
                 told.start();
-                told.seekTo(0);
+                told.seekToAndWait(0);
                 told.setLooping(false);
                 told.getCurrentPosition();
             }
 
             @Override
-            public void onCompletion(OrvMediaPlayer told) {
-                told.release();
+            public void onCompletion(MediaPlayer told) {
+                told.close();
                 released.countDown();
             }
         });
@@ -141,12 +141,12 @@ class ListenerTest extends PlayerFixture {
             AtomicInteger late = new AtomicInteger();
             other.addListener(new Recorder() {
                 @Override
-                public void onBufferingUpdate(OrvMediaPlayer told, int percent) {
+                public void onBufferingUpdate(MediaPlayer told, int percent) {
                     count();
                 }
 
                 @Override
-                public void onSeekComplete(OrvMediaPlayer told) {
+                public void onSeekComplete(MediaPlayer told) {
                     count();
                 }
 
@@ -157,10 +157,10 @@ class ListenerTest extends PlayerFixture {
                 }
             });
             other.setDataSource(Media.path("video.mp4"));
-            other.prepare();
+            other.prepareAndWait();
             other.start();
-            other.seekTo(2000);
-            other.release();
+            other.seekToAndWait(2000);
+            other.close();
             released.set(true);
             executor.submit(() -> null).get();
             executor.shutdown();
@@ -177,9 +177,9 @@ class ListenerTest extends PlayerFixture {
             slow.submit(() -> goOn.await(Wait.LIMIT.toSeconds(), TimeUnit.SECONDS));
             other.addListener(second);
             other.setDataSource(Media.path("video.mp4"));
-            other.prepare();
-            other.seekTo(4000);
-            other.reset();
+            other.prepareAndWait();
+            other.seekToAndWait(4000);
+            other.resetAndWait();
             goOn.countDown();
             slow.submit(() -> null).get();
             assertEquals(List.of(), second.told);
@@ -199,13 +199,13 @@ class ListenerTest extends PlayerFixture {
             Recorder second = new Recorder();
             other.addListener(new PlayerListener() {
                 @Override
-                public void onPrepared(OrvMediaPlayer told) {
+                public void onPrepared(MediaPlayer told) {
                     throw new IllegalStateException("a listener's own fault");
                 }
             });
             other.addListener(second);
             other.setDataSource(Media.path("silent.mkv"));
-            other.prepare();
+            other.prepareAndWait();
             second.await("prepared");
             second.await("size 320x180");
             assertEquals("a listener's own fault", caught.get().getMessage());
@@ -229,7 +229,7 @@ class ListenerTest extends PlayerFixture {
         Recorder third = new Recorder();
         player.addListener(new PlayerListener() {
             @Override
-            public void onPrepared(OrvMediaPlayer told) {
+            public void onPrepared(MediaPlayer told) {
                 told.removeListener(second);
             }
         });
@@ -297,7 +297,7 @@ class ListenerTest extends PlayerFixture {
         post("no reference", 1, 0, 0, null);
         OrvMediaPlayer gone = new OrvMediaPlayer();
         gone.addListener(recorder);
-        gone.release();
+        gone.close();
         post(new WeakReference<>(gone), 200, 951, 0, null);
         post(200, 952, 0, null);
         recorder.await("info 952 0");
@@ -324,13 +324,13 @@ class ListenerTest extends PlayerFixture {
         OrvMediaPlayer player = new OrvMediaPlayer();
         Recorder recorder = new Recorder() {
             @Override
-            public void onCompletion(OrvMediaPlayer told) {
+            public void onCompletion(MediaPlayer told) {
                 player.getState(); // A listener that holds the player must not keep it.
             }
         };
         player.addListener(recorder);
         player.setDataSource(Media.path("silent.mkv"));
-        player.prepare();
+        player.prepareAndWait();
         player.start();
         recorder.await("size 320x180");
         return new WeakReference<>(player);

@@ -26,7 +26,7 @@ class ManyPlayersTest {
 
     @AfterEach
     void releaseAll() {
-        players.forEach(OrvMediaPlayer::release);
+        players.forEach(OrvMediaPlayer::close);
     }
 
     @Test
@@ -37,7 +37,7 @@ class ManyPlayersTest {
             OrvMediaPlayer player = make(null);
             player.addListener(new Recorder());
             player.setLooping(true);
-            player.reset();
+            player.resetAndWait();
         }
         assertEquals(0, engineThreads());
         List<Thread> now = javaThreads("OrvMediaPlayer");
@@ -63,7 +63,7 @@ class ManyPlayersTest {
             OrvMediaPlayer player = make(null);
             Recorder recorder = new Recorder() {
                 @Override
-                public void onPrepared(OrvMediaPlayer told) {
+                public void onPrepared(MediaPlayer told) {
                     super.onPrepared(told);
                     told.start();
                 }
@@ -109,7 +109,7 @@ class ManyPlayersTest {
             OrvMediaPlayer player = make(Runnable::run); // On the thread that watches.
             player.addListener(new PlayerListener() {
                 @Override
-                public void onPrepared(OrvMediaPlayer told) {
+                public void onPrepared(MediaPlayer told) {
                     blocked.countDown();
                     await(goOn);
                 }
@@ -135,7 +135,7 @@ class ManyPlayersTest {
 
     private static void play(OrvMediaPlayer player) throws Exception {
         player.setDataSource(Media.path("silent.mkv"));
-        player.prepare();
+        player.prepareAndWait();
         player.setLooping(true);
         player.start();
     }

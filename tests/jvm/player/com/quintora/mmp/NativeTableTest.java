@@ -170,7 +170,7 @@ class NativeTableTest {
         Field context = OrvMediaPlayer.class.getDeclaredField("mNativeContext");
         context.setAccessible(true);
         assertEquals(true, context.getLong(player) != 0, "native_setup wrote no service");
-        player.release();
+        player.close();
         assertEquals(0, context.getLong(player));
     }
 

@@ -121,7 +121,7 @@ class NoServiceTest {
 
     private static OrvMediaPlayer released() {
         OrvMediaPlayer player = new OrvMediaPlayer();
-        player.release();
+        player.close();
         return player;
     }
 

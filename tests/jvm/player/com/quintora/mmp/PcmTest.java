@@ -53,7 +53,7 @@ class PcmTest extends PlayerFixture {
         byte[] samples = Files.readAllBytes(Path.of(Media.path("tone-s16le.pcm")));
         player.setPcmFormat(PcmMediaInfo.of(44_100, 2, 16).withLength(2000, samples.length));
         player.setDataSource(new ScriptedSource(samples));
-        player.prepare();
+        player.prepareAndWait();
         player.start();
         awaitState(PlayerState.COMPLETED);
     }
@@ -62,12 +62,12 @@ class PcmTest extends PlayerFixture {
     void theDescriptionIsForgottenWithItsMedia() throws Exception {
         player.setPcmFormat(PcmMediaInfo.of(44_100, 2, 16));
         prepare("tone-s16le.pcm");
-        player.reset();
+        player.resetAndWait();
         prepare("silent.mkv");
         assertEquals(2000, player.getDuration(), 50);
-        player.reset();
+        player.resetAndWait();
         player.setDataSource(Media.path("tone-s16le.pcm"));
-        assertThrows(MediaException.class, player::prepare);
+        assertThrows(MediaException.class, player::prepareAndWait);
     }
 
     @Test

@@ -31,7 +31,7 @@ class PicturesTest extends PlayerFixture {
     @CsvSource({"64, 36", "50, 28", "320, 180", "1, 1", "33, 1", "17, 255", "453, 255"})
     void thumbnailsLookLikeTheFrame(int width, int height) throws Exception {
         prepare("video.mp4");
-        player.seekTo(4000);
+        player.seekToAndWait(4000);
         Frame thumbnail = decode(thumbnail(width, height, ColorMode.XRGB8888));
         Frame expected = ffmpegFrame("video.mp4", 4, width, height);
         double psnr = thumbnail.psnr(expected);
@@ -42,7 +42,7 @@ class PicturesTest extends PlayerFixture {
     @EnumSource(ColorMode.class)
     void everyColourModeShowsTheFrame(ColorMode mode) throws Exception {
         prepare("video.mp4");
-        player.seekTo(4000);
+        player.seekToAndWait(4000);
         Frame thumbnail = decode(thumbnail(160, 90, mode));
         Frame expected = ffmpegFrame("video.mp4", 4, 160, 90);
         double psnr = thumbnail.psnr(mode == ColorMode.GRAY16 ? grey(expected) : expected);
@@ -53,7 +53,7 @@ class PicturesTest extends PlayerFixture {
     @Test
     void thumbnailsFollowThePosition() throws Exception {
         prepare("video.mp4");
-        player.seekTo(8000);
+        player.seekToAndWait(8000);
         Frame thumbnail = decode(thumbnail(160, 90, ColorMode.XRGB8888));
         assertTrue(thumbnail.psnr(ffmpegFrame("video.mp4", 8, 160, 90)) > LIKE);
         assertFalse(thumbnail.psnr(ffmpegFrame("video.mp4", 2, 160, 90)) > UNLIKE);
@@ -62,7 +62,7 @@ class PicturesTest extends PlayerFixture {
     @Test
     void alphaIsOpaqueWhereTheMediaIs() throws Exception {
         prepare("video.mp4");
-        byte[] pixels = thumbnail(16, 9, ColorMode.RGBA8888).pixels();
+        byte[] pixels = thumbnail(16, 9, ColorMode.RGBA8888).toByteArray();
         for (int i = 3; i < pixels.length; i += 4) {
             assertEquals((byte) 255, pixels[i]);
         }
@@ -74,7 +74,7 @@ class PicturesTest extends PlayerFixture {
     void sizesOutOfRangeAreRefused(int width, int height) throws Exception {
         prepare("video.mp4");
         assertThrows(IllegalArgumentException.class,
-                () -> player.pictures().thumbnail(width, height, ColorMode.RGB565));
+                () -> player.pictures().thumbnailAndWait(width, height, ColorMode.RGB565));
     }
 
     @ParameterizedTest
@@ -88,9 +88,9 @@ class PicturesTest extends PlayerFixture {
 
     @Test
     void mediaWithoutAPictureHasNoThumbnail() throws Exception {
-        assertEquals(Optional.empty(), player.pictures().thumbnail(16, 9, ColorMode.RGB565));
+        assertEquals(Optional.empty(), player.pictures().thumbnailAndWait(16, 9, ColorMode.RGB565));
         prepare("tone.mp3");
-        assertEquals(Optional.empty(), player.pictures().thumbnail(16, 9, ColorMode.RGB565));
+        assertEquals(Optional.empty(), player.pictures().thumbnailAndWait(16, 9, ColorMode.RGB565));
         assertEquals(Optional.empty(), player.pictures().embedded());
     }
 
@@ -105,12 +105,12 @@ class PicturesTest extends PlayerFixture {
     @Test
     void framesAreNotGrabbedHere() throws Exception {
         prepare("video.mp4");
-        assertEquals(Optional.empty(), player.pictures().frameAt(1000));
+        assertEquals(Optional.empty(), player.pictures().frameAtAndWait(1000));
     }
 
     private Thumbnail thumbnail(int width, int height, ColorMode mode) {
-        Thumbnail thumbnail = player.pictures().thumbnail(width, height, mode).orElseThrow();
-        assertEquals(width * height * mode.bytesPerPixel(), thumbnail.pixels().length);
+        Thumbnail thumbnail = player.pictures().thumbnailAndWait(width, height, mode).orElseThrow();
+        assertEquals(width * height * mode.bytesPerPixel(), thumbnail.pixels().remaining());
         return thumbnail;
     }
 
@@ -134,7 +134,7 @@ class PicturesTest extends PlayerFixture {
     }
 
     private static Frame decode(Thumbnail thumbnail) {
-        ByteBuffer bytes = ByteBuffer.wrap(thumbnail.pixels()).order(ByteOrder.nativeOrder());
+        ByteBuffer bytes = thumbnail.pixels().order(ByteOrder.nativeOrder());
         int[] pixels = new int[thumbnail.width() * thumbnail.height()];
         for (int i = 0; i < pixels.length; i++) {
             pixels[i] = pixel(thumbnail.colorMode(), bytes, i);

@@ -6,6 +6,7 @@ import static org.junit.jupiter.api.Assertions.assertFalse;
 import static org.junit.jupiter.api.Assertions.assertThrows;
 import static org.junit.jupiter.api.Assertions.assertTrue;
 
+import com.quintora.mmp.internal.events.EndOfMedia;
 import java.io.FileInputStream;
 import java.io.RandomAccessFile;
 import java.nio.file.Files;
@@ -23,7 +24,7 @@ class PlaybackTest extends PlayerFixture {
         assertEquals(PlayerState.INITIALIZED, player.getState());
         assertEquals(0, player.getDuration());
         assertEquals(0, player.getCurrentPosition());
-        player.prepare();
+        player.prepareAndWait();
         assertEquals(PlayerState.PREPARED, player.getState());
         assertEquals(10_000, player.getDuration(), 50);
         assertEquals(320, player.getVideoWidth());
@@ -52,7 +53,7 @@ class PlaybackTest extends PlayerFixture {
         player.start();
         player.stop();
         player.stop();
-        player.prepare();
+        player.prepareAndWait();
         assertEquals(PlayerState.PREPARED, player.getState());
         player.start();
         awaitMoving();
@@ -63,7 +64,7 @@ class PlaybackTest extends PlayerFixture {
         prepare("video.mp4");
         player.start();
         awaitMoving();
-        player.reset();
+        player.resetAndWait();
         assertEquals(PlayerState.IDLE, player.getState());
         assertEquals(0, player.getDuration());
         prepare("video.avi");
@@ -93,7 +94,7 @@ class PlaybackTest extends PlayerFixture {
         prepare("silent.mkv");
         player.start();
         awaitState(PlayerState.COMPLETED);
-        player.seekTo(0);
+        player.seekToAndWait(0);
         PlayerState after = player.getState();
         assertTrue(EnumSet.of(PlayerState.PAUSED, PlayerState.STARTED).contains(after),
                 after.toString());
@@ -105,7 +106,7 @@ class PlaybackTest extends PlayerFixture {
     @Test
     void anEndThatNobodySawIsToldBeforeTheSeekThatLeavesIt() throws Exception {
         playToAnUnseenEnd();
-        player.seekTo(0);
+        player.seekToAndWait(0);
         assertEquals(PlayerState.PAUSED, player.getState());
         goOnWatching();
         recorder.await("seek");
@@ -129,7 +130,7 @@ class PlaybackTest extends PlayerFixture {
         prepare("video.mp4");
         player.start();
         player.native_pause(); // As the engine does when a seek leaves the end.
-        player.seekTo(2000);
+        player.seekToAndWait(2000);
         awaitMoving();
         assertTrue(player.isPlaying());
     }
@@ -138,28 +139,29 @@ class PlaybackTest extends PlayerFixture {
     private void playToAnUnseenEnd() throws Exception {
         prepare("silent.mkv");
         player.start();
-        player.commands.lock();
-        Wait.until("the engine is at the end", player::atEnd);
+        EndOfMedia end = new EndOfMedia(new NativeCalls(player), player.units.source);
+        player.units.states.commands.lock();
+        Wait.until("the engine is at the end", end::isReached);
         assertEquals(PlayerState.STARTED, player.getState());
     }
 
     private void goOnWatching() {
-        player.commands.unlock();
-        player.events().flush();
+        player.units.states.commands.unlock();
+        player.units.events.flush();
     }
 
     @Test
     void seeksGoToTheKeyFrameBefore() throws Exception {
         prepare("video.mp4");
-        player.seekTo(5300);
+        player.seekToAndWait(5300);
         assertEquals(4000, player.getCurrentPosition(), 40);
-        player.seekTo(6000);
+        player.seekToAndWait(6000);
         assertEquals(6000, player.getCurrentPosition(), 40);
-        player.seekTo(0);
+        player.seekToAndWait(0);
         assertEquals(0, player.getCurrentPosition(), 40);
-        player.seekTo(Integer.MAX_VALUE);
+        player.seekToAndWait(Integer.MAX_VALUE);
         assertTrue(player.getCurrentPosition() >= 8000, "past the end means the end");
-        assertThrows(IllegalArgumentException.class, () -> player.seekTo(-1));
+        assertThrows(IllegalArgumentException.class, () -> player.seekToAndWait(-1));
     }
 
     @Test
@@ -194,7 +196,7 @@ class PlaybackTest extends PlayerFixture {
             player.setDataSource(file.getFD());
             assertTrue(file.getFD().valid());
         }
-        player.prepare();
+        player.prepareAndWait();
         assertEquals(10_000, player.getDuration(), 50);
     }
 
@@ -208,7 +210,7 @@ class PlaybackTest extends PlayerFixture {
             file.write(new byte[5000]);
             player.setDataSource(file.getFD(), 70_001, media.length);
         }
-        player.prepare();
+        player.prepareAndWait();
         assertEquals(2000, player.getDuration(), 50);
         player.start();
         awaitMoving();
@@ -219,7 +221,7 @@ class PlaybackTest extends PlayerFixture {
         prepare("video.mp4");
         try (OrvMediaPlayer second = new OrvMediaPlayer()) {
             second.setDataSource(Media.path("video.mkv"));
-            second.prepare();
+            second.prepareAndWait();
             second.start();
             player.start();
             awaitMoving();

@@ -18,7 +18,7 @@ abstract class PlayerFixture {
 
     @AfterEach
     void releasePlayer() {
-        player.release();
+        player.close();
     }
 
     void prepare(String media) throws Exception {
@@ -27,7 +27,11 @@ abstract class PlayerFixture {
 
     void open(String pathOrUrl) throws IOException {
         player.setDataSource(pathOrUrl);
-        player.prepare();
+        player.prepareAndWait();
+    }
+
+    void showSubtitle(int index) {
+        player.tracks().selectAndWait(player.tracks().subtitles().get(index));
     }
 
     void awaitState(PlayerState state) throws Exception {

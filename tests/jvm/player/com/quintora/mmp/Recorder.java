@@ -12,43 +12,43 @@ class Recorder implements PlayerListener {
     volatile MediaException error;
 
     @Override
-    public void onPrepared(OrvMediaPlayer player) {
+    public void onPrepared(MediaPlayer player) {
         note("prepared");
     }
 
     @Override
-    public void onCompletion(OrvMediaPlayer player) {
+    public void onCompletion(MediaPlayer player) {
         note("completion");
     }
 
     @Override
-    public void onSeekComplete(OrvMediaPlayer player) {
+    public void onSeekComplete(MediaPlayer player) {
         note("seek");
     }
 
     @Override
-    public void onVideoSizeChanged(OrvMediaPlayer player, int width, int height) {
+    public void onVideoSizeChanged(MediaPlayer player, int width, int height) {
         note("size " + width + "x" + height);
     }
 
     @Override
-    public void onBufferingUpdate(OrvMediaPlayer player, int percent) {
+    public void onBufferingUpdate(MediaPlayer player, int percent) {
         note("buffering " + percent);
     }
 
     @Override
-    public void onError(OrvMediaPlayer player, MediaException failure) {
+    public void onError(MediaPlayer player, MediaException failure) {
         error = failure;
         note("error");
     }
 
     @Override
-    public void onInfo(OrvMediaPlayer player, int what, int extra) {
-        note("info " + what + " " + extra);
+    public void onInfo(MediaPlayer player, PlaybackInfo info) {
+        note("info " + info.what() + " " + info.extra());
     }
 
     @Override
-    public void onTimedText(OrvMediaPlayer player, byte[] payload) {
+    public void onTimedText(MediaPlayer player, byte[] payload) {
         note("text " + (payload == null ? "null" : new String(payload)));
     }
 

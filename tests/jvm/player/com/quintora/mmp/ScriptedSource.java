@@ -6,30 +6,30 @@ import java.util.concurrent.Semaphore;
 import java.util.concurrent.atomic.AtomicInteger;
 
 /** A stream source over bytes in memory that can be made to misbehave. */
-class ScriptedSource implements MediaStreamSource {
+public class ScriptedSource implements MediaStreamSource {
     /** What a read does instead of reading. */
-    interface Misread {
+    public interface Misread {
         int read(byte[] buffer, int length) throws IOException;
     }
 
-    final byte[] bytes;
-    final AtomicInteger reads = new AtomicInteger();
-    final AtomicInteger cancels = new AtomicInteger();
-    final AtomicInteger closes = new AtomicInteger();
-    final Semaphore blockedReads = new Semaphore(0);
-    volatile boolean seekable = true;
-    volatile boolean failsToSeek;
-    volatile boolean sizeKnown = true;
-    volatile Misread misread;
-    volatile int misreadFrom = Integer.MAX_VALUE;
+    public final byte[] bytes;
+    public final AtomicInteger reads = new AtomicInteger();
+    public final AtomicInteger cancels = new AtomicInteger();
+    public final AtomicInteger closes = new AtomicInteger();
+    public final Semaphore blockedReads = new Semaphore(0);
+    public volatile boolean seekable = true;
+    public volatile boolean failsToSeek;
+    public volatile boolean sizeKnown = true;
+    public volatile Misread misread;
+    public volatile int misreadFrom = Integer.MAX_VALUE;
     private int position;
 
-    ScriptedSource(byte[] bytes) {
+    public ScriptedSource(byte[] bytes) {
         this.bytes = bytes;
     }
 
     /** From that position on, reads do something else. */
-    ScriptedSource misreading(int from, Misread instead) {
+    public ScriptedSource misreading(int from, Misread instead) {
         misreadFrom = from;
         misread = instead;
         return this;
@@ -77,7 +77,7 @@ class ScriptedSource implements MediaStreamSource {
     }
 
     /** A misread that blocks until it is cancelled. */
-    int block(byte[] buffer, int length) throws IOException {
+    public int block(byte[] buffer, int length) throws IOException {
         blockedReads.acquireUninterruptibly();
         throw new IOException("cancelled");
     }

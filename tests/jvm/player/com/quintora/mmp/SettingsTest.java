@@ -9,15 +9,23 @@ import static org.junit.jupiter.api.Assertions.assertTrue;
 import android.os.Parcel;
 import com.quintora.mmp.util.DivxLastMemoryFilePosition;
 import java.io.IOException;
+import java.net.URI;
+import java.nio.file.Files;
+import java.nio.file.Path;
+import java.time.Duration;
 import java.util.Optional;
 import java.util.Set;
 import org.junit.jupiter.api.Test;
+import org.junit.jupiter.api.io.TempDir;
 import org.junit.jupiter.params.ParameterizedTest;
 import org.junit.jupiter.params.provider.EnumSource;
 import org.junit.jupiter.params.provider.ValueSource;
 
 /** The sound's settings, the engine's own affairs and DivX navigation, on media that play. */
 class SettingsTest extends PlayerFixture {
+    @TempDir
+    Path folder;
+
     @Test
     void theVolumeIsZeroToOne() throws Exception {
         prepare("video.mp4");
@@ -41,7 +49,7 @@ class SettingsTest extends PlayerFixture {
         assertThrows(IllegalArgumentException.class, () -> player.audio().setSessionId(-1));
         assertThrows(IOException.class, () -> player.native_setAudioSessionId(-1));
         assertEquals(17, player.audio().getSessionId());
-        player.reset();
+        player.resetAndWait();
         assertEquals(17, player.audio().getSessionId());
     }
 
@@ -71,7 +79,7 @@ class SettingsTest extends PlayerFixture {
             } else {
                 screen.await("a picture", frame -> frame.width() == 320);
             }
-            player.release();
+            player.close();
         }
     }
 
@@ -121,5 +129,49 @@ class SettingsTest extends PlayerFixture {
         assertFalse(divx.pressButton(number, number));
         assertFalse(divx.setFilePosition(number, number));
         assertFalse(divx.setLastMemory(new DivxLastMemoryFilePosition()));
+    }
+
+    @Test
+    void theVolumeIsKnownAlsoWhileMuted() throws Exception {
+        assertEquals(1, player.getVolume());
+        assertFalse(player.audio().isMuted());
+        player.setVolume(0.5f);
+        player.audio().setMuted(true);
+        assertEquals(0.5f, player.getVolume());
+        player.audio().setVolume(0.25f, 0.75f);
+        assertTrue(player.audio().isMuted());
+        player.audio().setMuted(false);
+        assertEquals(0.25f, player.audio().getLeftVolume());
+        assertEquals(0.75f, player.audio().getRightVolume());
+        assertEquals(0.75f, player.getVolume());
+        assertThrows(IllegalArgumentException.class, () -> player.setVolume(1.5f));
+        player.resetAndWait();
+        assertEquals(0.75f, player.getVolume(), "it outlasts a reset");
+    }
+
+    @Test
+    void aListenerThatIsAddedTwiceIsCalledOnce() throws Exception {
+        player.addListener(recorder);
+        prepare("silent.mkv");
+        player.start();
+        recorder.await("completion");
+        assertEquals(1, recorder.count("prepared"));
+        assertEquals(1, recorder.count("completion"));
+    }
+
+    @Test
+    void filesArePathsAndUrisToo() throws Exception {
+        Path file = Path.of(Media.path("video.mp4"));
+        player.setDataSource(file);
+        player.prepareAndWait();
+        assertEquals(Optional.of(Duration.ofMillis(player.getDuration())), player.duration());
+        player.resetAndWait();
+        assertEquals(Optional.empty(), player.duration());
+        Path strange = Files.copy(file, folder.resolve("100% sure? #1.mp4"));
+        player.setDataSource(strange.toUri());
+        player.prepareAndWait();
+        assertEquals(Duration.ZERO, player.position());
+        assertThrows(IllegalArgumentException.class,
+                () -> player.setDataSource(URI.create("film.mp4")));
     }
 }

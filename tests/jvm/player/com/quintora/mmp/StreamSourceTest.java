@@ -7,6 +7,7 @@ import static org.junit.jupiter.api.Assertions.assertSame;
 import static org.junit.jupiter.api.Assertions.assertThrows;
 import static org.junit.jupiter.api.Assertions.assertTrue;
 
+import com.quintora.mmp.internal.source.StreamAdapter;
 import java.io.IOException;
 import java.nio.file.Files;
 import java.nio.file.Path;
@@ -30,7 +31,7 @@ class StreamSourceTest extends PlayerFixture {
         assertEquals(2000, player.getDuration(), 50);
         player.start();
         awaitState(PlayerState.COMPLETED);
-        player.release();
+        player.close();
         assertEquals(1, source.closes.get());
     }
 
@@ -41,18 +42,18 @@ class StreamSourceTest extends PlayerFixture {
         prepare(new DigestingSource(file, digest));
         player.start();
         awaitState(PlayerState.COMPLETED);
-        player.release();
+        player.close();
         assertArrayEquals(MessageDigest.getInstance("SHA-256").digest(file), digest.digest());
     }
 
     @Test
     void aStreamIsSought() throws Exception {
         prepare(source("video.mp4"));
-        player.seekTo(6000);
+        player.seekToAndWait(6000);
         assertEquals(6000, player.getCurrentPosition(), 40);
         player.start();
         awaitMoving();
-        player.seekTo(2000);
+        player.seekToAndWait(2000);
         awaitMoving();
     }
 
@@ -84,7 +85,7 @@ class StreamSourceTest extends PlayerFixture {
     @Test
     void aFilesChannelPlays() throws Exception {
         player.setDataSource(ChannelStreamSource.open(Path.of(Media.path("silent.mkv"))));
-        player.prepare();
+        player.prepareAndWait();
         player.start();
         awaitState(PlayerState.COMPLETED);
     }
@@ -96,7 +97,7 @@ class StreamSourceTest extends PlayerFixture {
         player.start();
         player.stop();
         assertEquals(0, source.closes.get());
-        player.prepare();
+        player.prepareAndWait();
         player.start();
         awaitMoving();
     }
@@ -117,7 +118,7 @@ class StreamSourceTest extends PlayerFixture {
         player.start();
         recorder.await("error");
         assertEquals(PlayerState.ERROR, player.getState());
-        assertEquals(MediaException.STATUS_IO, recorder.error.status());
+        assertEquals(MediaError.IO, recorder.error.error());
         assertTrue(recorder.error.getCause().getMessage().startsWith("the source read " + count),
                 recorder.error.toString());
         assertEquals(1, recorder.count("error"));
@@ -143,9 +144,9 @@ class StreamSourceTest extends PlayerFixture {
         player.setDataSource(new ScriptedSource(new byte[100]).misreading(0, (buffer, length) -> {
             throw broken;
         }));
-        MediaException e = assertThrows(MediaException.class, player::prepare);
+        MediaException e = assertThrows(MediaException.class, player::prepareAndWait);
         assertSame(broken, e.getCause());
-        player.reset();
+        player.resetAndWait();
         prepare("silent.mkv");
     }
 
@@ -153,19 +154,20 @@ class StreamSourceTest extends PlayerFixture {
     void aStreamThatIsNeverPreparedIsClosed() throws Exception {
         ScriptedSource source = new ScriptedSource(new byte[100]);
         player.setDataSource(source);
-        player.reset();
+        player.resetAndWait();
         assertEquals(1, source.closes.get());
         ScriptedSource another = new ScriptedSource(new byte[100]);
         player.setDataSource(another);
-        player.release();
+        player.close();
         assertEquals(1, another.closes.get());
     }
 
     @Test
     void aStreamThatTheEngineLeavesOpenIsClosed() throws Exception {
         ScriptedSource source = new ScriptedSource(new byte[100]);
-        player.useStream(new StreamAdapter(source)); // The engine does not know of it.
-        player.reset();
+        // The engine does not know of it.
+        player.units.source.use(new StreamAdapter(source, new NativeCalls(player)));
+        player.resetAndWait();
         assertEquals(1, source.closes.get());
     }
 
@@ -181,7 +183,7 @@ class StreamSourceTest extends PlayerFixture {
     @Test
     void anEmptyStreamIsNoMedia() throws Exception {
         player.setDataSource(new ScriptedSource(new byte[0]));
-        assertThrows(MediaException.class, player::prepare);
+        assertThrows(MediaException.class, player::prepareAndWait);
     }
 
     @Test
@@ -220,11 +222,11 @@ class StreamSourceTest extends PlayerFixture {
         prepare(source);
         source.failsToSeek = true;
         try {
-            player.seekTo(8000);
+            player.seekToAndWait(8000);
         } catch (IllegalStateException e) {
             assertTrue(e.getMessage().contains("seekTo(8000)"), e.getMessage());
         }
-        player.reset();
+        player.resetAndWait();
         prepare("silent.mkv");
         player.start();
         awaitMoving();
@@ -237,7 +239,7 @@ class StreamSourceTest extends PlayerFixture {
         source.misreading(0, source::block);
         player.start();
         Wait.until("a read blocks", source.blockedReads::hasQueuedThreads);
-        player.reset();
+        player.resetAndWait();
         assertTrue(source.cancels.get() > 0);
         assertEquals(1, source.closes.get());
         assertEquals(0, recorder.count("error"), "what a cancelled read throws is no failure");
@@ -251,7 +253,7 @@ class StreamSourceTest extends PlayerFixture {
         source.misreading(0, source::block);
         player.start();
         Wait.until("a read blocks", source.blockedReads::hasQueuedThreads);
-        player.release();
+        player.close();
         assertTrue(source.cancels.get() > 0);
         assertEquals(1, source.closes.get());
     }
@@ -262,7 +264,7 @@ class StreamSourceTest extends PlayerFixture {
 
     private void prepare(MediaStreamSource source) throws IOException {
         player.setDataSource(source);
-        player.prepare();
+        player.prepareAndWait();
     }
 
     private void awaitEnd() throws Exception {

@@ -7,6 +7,7 @@ import static org.junit.jupiter.api.Assertions.assertSame;
 import static org.junit.jupiter.api.Assertions.assertThrows;
 import static org.junit.jupiter.api.Assertions.assertTrue;
 
+import com.quintora.mmp.internal.source.StreamAdapter;
 import java.io.IOException;
 import java.nio.file.Files;
 import java.nio.file.Path;
@@ -17,8 +18,8 @@ import org.junit.jupiter.params.provider.ValueSource;
 
 /** Streams that stall, break off or come at the wrong time. */
 class StreamTroubleTest extends PlayerFixture {
-    private static final String WAITS = "info " + PlayerListener.INFO_BUFFERING_STARTED + " 0";
-    private static final String GOES_ON = "info " + PlayerListener.INFO_BUFFERING_ENDED + " 0";
+    private static final String WAITS = "info 701 0";
+    private static final String GOES_ON = "info 702 0";
 
     @ParameterizedTest
     @CsvSource({"long.mkv, true, 500000", "video.ts, false, 500000", "tone.mp3, false, 30000"})
@@ -77,8 +78,8 @@ class StreamTroubleTest extends PlayerFixture {
     void aStreamThatIsReadHasNotEnded() throws Exception {
         ScriptedSource source = new ScriptedSource(new byte[10]);
         source.misreading(0, source::block);
-        StreamAdapter adapter = new StreamAdapter(source);
-        adapter.describeTo(player);
+        StreamAdapter adapter = new StreamAdapter(source, new NativeCalls(player));
+        adapter.describe();
         assertFalse(adapter.isReading());
         Thread reader = new Thread(() -> adapter.read(1));
         reader.start();
@@ -98,11 +99,11 @@ class StreamTroubleTest extends PlayerFixture {
         assertThrows(IllegalStateException.class, () -> player.setDataSource(refused));
         assertEquals(1, refused.closes.get());
         int reads = playing.reads.get();
-        player.seekTo(50_000);
+        player.seekToAndWait(50_000);
         awaitMoving();
         assertTrue(playing.reads.get() > reads, "it is read on");
         assertEquals(0, playing.closes.get());
-        player.release();
+        player.close();
         assertEquals(1, playing.closes.get());
     }
 
@@ -118,7 +119,7 @@ class StreamTroubleTest extends PlayerFixture {
             throw torn;
         });
         try {
-            player.seekTo(55_000);
+            player.seekToAndWait(55_000);
         } catch (IllegalStateException e) {
             assertTrue(e.getMessage().contains("seekTo(55000)"), e.getMessage());
         }
@@ -149,7 +150,7 @@ class StreamTroubleTest extends PlayerFixture {
         ScriptedSource source = new ScriptedSource(new byte[100]) {
             @Override
             public boolean mayStall() {
-                player.release();
+                player.close();
                 return false;
             }
         };
@@ -161,7 +162,7 @@ class StreamTroubleTest extends PlayerFixture {
 
     private void reset() {
         try {
-            player.reset();
+            player.resetAndWait();
         } catch (IOException e) {
             throw new AssertionError(e);
         }
@@ -173,6 +174,6 @@ class StreamTroubleTest extends PlayerFixture {
 
     private void prepare(MediaStreamSource source) throws IOException {
         player.setDataSource(source);
-        player.prepare();
+        player.prepareAndWait();
     }
 }

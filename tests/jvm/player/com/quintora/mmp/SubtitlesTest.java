@@ -8,12 +8,14 @@ import static org.junit.jupiter.api.Assertions.assertTrue;
 import com.quintora.SubtitleAttr;
 import java.nio.file.Files;
 import java.nio.file.Path;
-import java.util.OptionalInt;
+import java.util.Optional;
+import java.util.concurrent.ExecutionException;
 import java.util.function.IntPredicate;
 import java.util.function.Predicate;
 import org.junit.jupiter.api.AfterEach;
 import org.junit.jupiter.api.BeforeEach;
 import org.junit.jupiter.api.Test;
+import org.junit.jupiter.api.function.Executable;
 import org.junit.jupiter.api.io.TempDir;
 
 /** Subtitles and their looks, seen in the picture: a still grey one of 640 x 360. */
@@ -30,53 +32,51 @@ class SubtitlesTest extends PlayerFixture {
     void prepare() throws Exception {
         player.setSurface(screen.surface());
         prepare("plain.mkv");
-        player.seekTo(2000);
+        player.seekToAndWait(2000);
         screen.await("the plain picture", SubtitlesTest::isPlain);
     }
 
     @AfterEach
     void closeScreen() {
-        player.release();
+        player.close();
         screen.close();
     }
 
     @Test
     void aTrackIsShownAndHidden() throws Exception {
-        assertEquals(OptionalInt.empty(), player.tracks().currentSubtitle());
-        player.subtitles().show(0);
+        assertEquals(Optional.empty(), player.tracks().currentSubtitle());
+        showSubtitle(0);
         Frame.Box text = awaitText().bounds(DRAWN);
         assertTrue(text.top() > 180, "it stands below the middle: " + text);
         assertEquals(320, text.left() + text.width() / 2, 6, "it stands in the middle: " + text);
-        assertEquals(OptionalInt.of(0), player.tracks().currentSubtitle());
-        player.subtitles().hide();
+        assertEquals(0, player.tracks().currentSubtitle().orElseThrow().index());
+        player.tracks().selectNoneAndWait(Track.Kind.SUBTITLE);
         screen.await("no text", SubtitlesTest::isPlain);
-        assertEquals(OptionalInt.empty(), player.tracks().currentSubtitle());
+        assertEquals(Optional.empty(), player.tracks().currentSubtitle());
     }
 
     @Test
     void tracksAreSwitched() throws Exception {
-        player.subtitles().show(0);
+        showSubtitle(0);
         int inside = awaitText().bounds(DRAWN).width();
-        player.subtitles().show(1);
+        showSubtitle(1);
         screen.await("the longer line", frame -> frame.bounds(DRAWN).width() > inside * 2);
-        assertEquals(OptionalInt.of(1), player.tracks().currentSubtitle());
-        player.subtitles().show(99);
-        player.subtitles().show(-1);
-        assertEquals(OptionalInt.of(1), player.tracks().currentSubtitle());
+        assertEquals(1, player.tracks().currentSubtitle().orElseThrow().index());
+        assertEquals(1, player.tracks().currentSubtitle().orElseThrow().index());
     }
 
     @Test
-    void tracksAreSelectedByTheirNumberOverAllKinds() throws Exception {
-        player.tracks().select(2); // Picture, sound, then the first subtitles.
+    void theNativeHalfNumbersTracksOverAllKinds() throws Exception {
+        player.native_selectTrack(2); // Picture, sound, then the first subtitles.
         awaitText();
-        assertEquals(OptionalInt.of(0), player.tracks().currentSubtitle());
-        player.tracks().deselect(2);
+        assertEquals(0, player.tracks().currentSubtitle().orElseThrow().index());
+        player.native_deselectTrack(2);
         screen.await("no text", SubtitlesTest::isPlain);
     }
 
     @Test
     void lettersTakeTheirColour() throws Exception {
-        player.subtitles().show(0);
+        showSubtitle(0);
         Frame before = awaitText();
         assertEquals(0, before.count(YELLOW));
         player.subtitles().setStyle(SubtitleAttr.builder().textColor(0xFFFFFF00).build());
@@ -85,7 +85,7 @@ class SubtitlesTest extends PlayerFixture {
 
     @Test
     void edgesTakeTheirColour() throws Exception {
-        player.subtitles().show(0);
+        showSubtitle(0);
         assertEquals(0, awaitText().count(RED));
         player.subtitles().setStyle(SubtitleAttr.builder().edgeColor(0xFFFF0000).build());
         screen.await("red edges", frame -> frame.count(RED) > 50);
@@ -93,7 +93,7 @@ class SubtitlesTest extends PlayerFixture {
 
     @Test
     void theGroundTakesItsColour() throws Exception {
-        player.subtitles().show(0);
+        showSubtitle(0);
         Frame.Box text = awaitText().bounds(DRAWN);
         player.subtitles().setStyle(SubtitleAttr.builder().backgroundColor(0xFF0000FF).build());
         Frame frame = screen.await("a blue ground",
@@ -103,7 +103,7 @@ class SubtitlesTest extends PlayerFixture {
 
     @Test
     void lettersTakeTheirSize() throws Exception {
-        player.subtitles().show(0);
+        showSubtitle(0);
         int usual = awaitText().bounds(DRAWN).height();
         player.subtitles().setStyle(SubtitleAttr.builder().fontSize(160).build());
         int large = screen.await("large letters", taller(usual * 2)).bounds(DRAWN).height();
@@ -119,7 +119,7 @@ class SubtitlesTest extends PlayerFixture {
 
     @Test
     void textsMove() throws Exception {
-        player.subtitles().show(0);
+        showSubtitle(0);
         Frame.Box usual = awaitText().bounds(DRAWN);
         player.subtitles().setStyle(SubtitleAttr.builder().displayOffset(0, -500).build());
         screen.await("the text further up",
@@ -139,7 +139,7 @@ class SubtitlesTest extends PlayerFixture {
 
     @Test
     void textsShiftInTime() throws Exception {
-        player.subtitles().add(Media.path("lines.srt"));
+        player.subtitles().addAndWait(Media.path("lines.srt"));
         awaitText();
         player.subtitles().setStyle(SubtitleAttr.builder().delay(8000).build());
         screen.await("nothing yet", SubtitlesTest::isPlain);
@@ -149,7 +149,7 @@ class SubtitlesTest extends PlayerFixture {
 
     @Test
     void severalAttributesTakeEffectTogether() throws Exception {
-        player.subtitles().show(0);
+        showSubtitle(0);
         awaitText();
         player.subtitles().setStyle(SubtitleAttr.builder()
                 .textColor(0xFFFFFF00)
@@ -162,7 +162,7 @@ class SubtitlesTest extends PlayerFixture {
 
     @Test
     void aMaskWithEveryBitSetTakesAllGroups() throws Exception {
-        player.subtitles().show(0);
+        showSubtitle(0);
         awaitText();
         SubtitleAttr attr = SubtitleAttr.builder().delay(0).fontSize(60).backgroundColor(0)
                 .textColor(0xFFFFFF00).edgeColor(0xFFFF0000).displayOffset(0, 0).build();
@@ -173,14 +173,14 @@ class SubtitlesTest extends PlayerFixture {
 
     @Test
     void attributesWithoutTheirGroupAreRefusedAndChangeNothing() throws Exception {
-        player.subtitles().show(0);
+        showSubtitle(0);
         Frame before = awaitText();
         SubtitleAttr attr = SubtitleAttr.builder().textColor(0xFFFFFF00).build();
         attr.mMask |= SubtitleAttr.FLAG_SUBTITLE_BG_COLOR;
         assertThrows(IllegalArgumentException.class, () -> player.subtitles().setStyle(attr));
         // The native half stops at the missing group, before the one after it.
         player.native_setSubtitleAttr(attr);
-        player.seekTo(2000);
+        player.seekToAndWait(2000);
         assertEquals(before.bounds(DRAWN), awaitText().bounds(DRAWN));
         assertEquals(0, awaitText().count(YELLOW));
     }
@@ -189,19 +189,19 @@ class SubtitlesTest extends PlayerFixture {
     void filesAreAddedAndShown() throws Exception {
         for (String name : new String[] {"lines.srt", "lines.ass", "latin1.srt"}) {
             int before = player.tracks().subtitles().size();
-            player.subtitles().add(Media.path(name));
+            player.subtitles().addAndWait(Media.path(name));
             awaitText();
             assertEquals(before + 1, player.tracks().subtitles().size(), name);
-            assertEquals(OptionalInt.of(before), player.tracks().currentSubtitle(), name);
+            assertEquals(before, player.tracks().currentSubtitle().orElseThrow().index(), name);
             assertTrue(player.tracks().subtitles().get(before).flags().isExternal(), name);
-            player.subtitles().hide();
+            player.tracks().selectNoneAndWait(Track.Kind.SUBTITLE);
             screen.await("no text", SubtitlesTest::isPlain);
         }
     }
 
     @Test
     void aPairOfFilesIsAddedAndShown() throws Exception {
-        player.subtitles().add(Media.path("words.sub"), Media.path("words.idx"));
+        player.subtitles().addPairAndWait(Media.path("words.sub"), Media.path("words.idx"));
         awaitText();
         assertEquals(3, player.tracks().subtitles().size());
     }
@@ -212,28 +212,41 @@ class SubtitlesTest extends PlayerFixture {
         Path index = folder.resolve("times");
         Files.copy(Path.of(Media.path("words.sub")), pictures);
         Files.copy(Path.of(Media.path("words.idx")), index);
-        player.subtitles().add(pictures.toString(), index.toString());
+        player.subtitles().addPairAndWait(pictures.toString(), index.toString());
         awaitText();
         assertEquals("en", player.tracks().subtitles().get(2).language(), "as the index says");
     }
 
     @Test
     void timedTextIsAddedAndShownWhenAskedFor() throws Exception {
-        player.subtitles().addTimedText(Media.path("lines.srt"));
+        player.subtitles().addTimedTextAndWait(Media.path("lines.srt"));
         assertEquals(3, player.tracks().subtitles().size());
-        player.subtitles().show(2);
+        showSubtitle(2);
         awaitText();
     }
 
     @Test
-    void filesThatAreMissingAddNothing() throws Exception {
-        player.subtitles().add("/no/such.srt");
-        player.subtitles().add("/no/such.sub", "/no/such.idx");
-        player.subtitles().addTimedText("/no/such.srt");
+    void filesThatCannotBeReadAreRefusedAndAddNothing(@TempDir Path folder) throws Exception {
+        String none = "/no/such.srt: no such file";
+        assertMessage(none, () -> player.subtitles().addAndWait("/no/such.srt"));
+        assertMessage(none, () -> player.subtitles().addTimedTextAndWait("/no/such.srt"));
+        assertMessage("/no/such.idx: no such file",
+                () -> player.subtitles().addPairAndWait("/no/such.sub", "/no/such.idx"));
+        Path noise = Files.write(folder.resolve("noise.srt"), new byte[] {1, 2, 3, 4});
+        assertMessage(noise + ": has no subtitles that can be read",
+                () -> player.subtitles().addAndWait(noise.toString()));
+        ExecutionException later = assertThrows(ExecutionException.class,
+                () -> player.subtitles().add("/no/such.srt").get());
+        assertEquals(none, later.getCause().getMessage());
         assertEquals(0, player.native_addTimedTextSource("/no/such.srt"));
         assertEquals(2, player.tracks().subtitles().size());
-        player.subtitles().show(0);
+        showSubtitle(0);
         awaitText();
+    }
+
+    private static void assertMessage(String message, Executable call) {
+        MediaException thrown = assertThrows(MediaException.class, call);
+        assertEquals(message, thrown.getMessage());
     }
 
     private Frame awaitText() throws InterruptedException {

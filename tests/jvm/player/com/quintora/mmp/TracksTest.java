@@ -3,12 +3,13 @@ package com.quintora.mmp;
 
 import static org.junit.jupiter.api.Assertions.assertEquals;
 import static org.junit.jupiter.api.Assertions.assertFalse;
+import static org.junit.jupiter.api.Assertions.assertThrows;
 import static org.junit.jupiter.api.Assertions.assertTrue;
 
 import java.util.List;
 import java.util.Optional;
-import java.util.OptionalInt;
 import org.junit.jupiter.api.Test;
+import org.junit.jupiter.api.function.Executable;
 
 /** The tables of tracks and chapters, and which of them play. */
 class TracksTest extends PlayerFixture {
@@ -20,9 +21,8 @@ class TracksTest extends PlayerFixture {
         assertEquals(List.of(), player.tracks().chapters());
         assertEquals(Optional.empty(), player.tracks().currentVideo());
         assertEquals(Optional.empty(), player.tracks().metadata());
-        assertEquals(OptionalInt.empty(), player.tracks().currentAudio());
-        assertEquals(OptionalInt.empty(), player.tracks().currentSubtitle());
-        assertFalse(player.tracks().selectAudio(0));
+        assertEquals(Optional.empty(), player.tracks().currentAudio());
+        assertEquals(Optional.empty(), player.tracks().currentSubtitle());
     }
 
     @Test
@@ -72,6 +72,7 @@ class TracksTest extends PlayerFixture {
         assertEquals(720, track.height());
         assertEquals(30, track.frameRate(), 0.01);
         assertEquals(Optional.of(track), player.tracks().currentVideo());
+        assertTrue(player.native_getVideoCodecInfo());
     }
 
     @Test
@@ -82,10 +83,6 @@ class TracksTest extends PlayerFixture {
         assertEquals(List.of("Captions", "Untertitel"),
                 tracks.stream().map(SubtitleTrack::title).toList());
         assertEquals(List.of(0, 1), tracks.stream().map(SubtitleTrack::index).toList());
-        assertEquals(Optional.of(tracks.get(1)), player.tracks().subtitle(1));
-        assertEquals(Optional.empty(), player.tracks().subtitle(2));
-        assertEquals(Optional.empty(), player.tracks().subtitle(-1));
-        assertEquals(Optional.empty(), player.tracks().subtitle(Integer.MAX_VALUE));
     }
 
     @Test
@@ -96,7 +93,7 @@ class TracksTest extends PlayerFixture {
                         new Chapter(1, 2500, 6000, "Глава вторая"),
                         new Chapter(2, 6000, 10_000, "終章")),
                 player.tracks().chapters());
-        player.reset();
+        player.resetAndWait();
         prepare("silent.mkv");
         assertEquals(List.of(), player.tracks().chapters());
     }
@@ -104,28 +101,68 @@ class TracksTest extends PlayerFixture {
     @Test
     void soundTracksAreSwitched() throws Exception {
         prepare("feature.mkv");
-        assertEquals(OptionalInt.of(0), player.tracks().currentAudio());
-        assertTrue(player.tracks().selectAudio(1));
-        assertEquals(OptionalInt.of(1), player.tracks().currentAudio());
+        List<AudioTrack> tracks = player.tracks().audio();
+        assertEquals(0, player.tracks().currentAudio().orElseThrow().index());
+        player.tracks().selectAndWait(tracks.get(1));
+        assertEquals(1, player.tracks().currentAudio().orElseThrow().index());
         assertTrue(player.tracks().audio().get(1).flags().isSelected());
         assertFalse(player.tracks().audio().get(0).flags().isSelected());
-        assertFalse(player.tracks().selectAudio(2));
-        assertFalse(player.tracks().selectAudio(-1));
-        assertEquals(OptionalInt.of(1), player.tracks().currentAudio());
-        player.tracks().select(1); // The picture is number 0.
-        assertEquals(OptionalInt.of(0), player.tracks().currentAudio());
+        player.tracks().select(tracks.get(0)).get();
+        assertEquals(0, player.tracks().currentAudio().orElseThrow().index());
         player.start();
         awaitMoving();
     }
 
     @Test
-    void unknownTrackNumbersAreIgnored() throws Exception {
+    void picturesAndSoundAreTurnedOffAndOn() throws Exception {
+        prepare("feature.mkv");
+        VideoTrack picture = player.tracks().video().get(0);
+        player.tracks().selectNoneAndWait(Track.Kind.VIDEO);
+        assertEquals(Optional.empty(), player.tracks().currentVideo());
+        IllegalStateException refusal = assertThrows(IllegalStateException.class,
+                () -> player.tracks().selectNoneAndWait(Track.Kind.AUDIO));
+        assertEquals("the engine cannot turn its only track off, which is a sound track",
+                refusal.getMessage());
+        player.tracks().selectAndWait(picture);
+        player.tracks().selectNone(Track.Kind.AUDIO).get();
+        assertEquals(Optional.empty(), player.tracks().currentAudio());
+        assertTrue(player.tracks().video().get(0).flags().isSelected());
+    }
+
+    @Test
+    void tracksThatTheMediaDoesNotHaveAreRefused() throws Exception {
+        prepare("feature.mkv");
+        SubtitleTrack unknown =
+                new SubtitleTrack(99, 0, "", "", "", new TrackFlags(0));
+        for (Executable call : List.<Executable>of(
+                () -> player.tracks().select(unknown), () -> player.tracks().selectAndWait(unknown))) {
+            IllegalArgumentException refusal =
+                    assertThrows(IllegalArgumentException.class, call);
+            assertEquals("there is no subtitle track 99; the media has 2", refusal.getMessage());
+        }
+        assertThrows(IllegalArgumentException.class, () -> player.tracks().select(null));
+        assertThrows(IllegalArgumentException.class, () -> player.tracks().selectNone(null));
+        assertEquals(0, player.tracks().currentAudio().orElseThrow().index());
+    }
+
+    @Test
+    void nothingIsSelectedBeforeTheMediaIsPrepared() {
+        SubtitleTrack track = new SubtitleTrack(0, 0, "", "", "", new TrackFlags(0));
+        assertThrows(IllegalStateException.class, () -> player.tracks().select(track));
+        assertThrows(IllegalStateException.class,
+                () -> player.tracks().selectNone(Track.Kind.AUDIO));
+        assertThrows(IllegalStateException.class,
+                () -> player.tracks().selectNoneAndWait(Track.Kind.AUDIO));
+    }
+
+    @Test
+    void theNativeHalfIgnoresUnknownTrackNumbers() throws Exception {
         prepare("feature.mkv");
         for (int number : new int[] {-1, 99, Integer.MIN_VALUE, Integer.MAX_VALUE}) {
-            player.tracks().select(number);
-            player.tracks().deselect(number);
+            player.native_selectTrack(number);
+            player.native_deselectTrack(number);
         }
-        assertEquals(OptionalInt.of(0), player.tracks().currentAudio());
+        assertEquals(0, player.tracks().currentAudio().orElseThrow().index());
     }
 
     @Test
@@ -135,6 +172,6 @@ class TracksTest extends PlayerFixture {
         assertEquals(Optional.empty(), player.tracks().currentVideo());
         assertEquals(0, player.getVideoWidth());
         assertEquals(1, player.tracks().audio().size());
-        assertEquals(OptionalInt.of(0), player.tracks().currentAudio());
+        assertEquals(0, player.tracks().currentAudio().orElseThrow().index());
     }
 }

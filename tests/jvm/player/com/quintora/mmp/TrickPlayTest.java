@@ -14,12 +14,12 @@ class TrickPlayTest extends PlayerFixture {
     @Test
     void trickPlayNeedsMedia() {
         assertThrows(IllegalStateException.class, () -> player.trickPlay().setSpeed(1));
-        assertThrows(IllegalStateException.class, () -> player.trickPlay().step(1));
-        assertThrows(IllegalStateException.class, () -> player.trickPlay().seekToByte(0));
+        assertThrows(IllegalStateException.class, () -> player.trickPlay().stepAndWait(1));
+        assertThrows(IllegalStateException.class, () -> player.trickPlay().seekToByteAndWait(0));
         assertThrows(IllegalStateException.class, () -> player.trickPlay().repeatFromHere());
         assertThrows(IllegalStateException.class, () -> player.trickPlay().getBytePosition());
         assertEquals(1, player.trickPlay().getSpeed());
-        assertEquals(0, player.trickPlay().getBufferedPercent());
+        assertEquals(0, player.getBufferedPercent());
     }
 
     @ParameterizedTest
@@ -45,7 +45,7 @@ class TrickPlayTest extends PlayerFixture {
     @ValueSource(doubles = {-1, -4, -16})
     void backwardSpeedsMoveBack(double speed) throws Exception {
         prepare("light.mkv");
-        player.seekTo(40_000);
+        player.seekToAndWait(40_000);
         assertTrue(player.trickPlay().canPlayAt(speed));
         player.trickPlay().setSpeed(speed);
         player.start();
@@ -79,27 +79,27 @@ class TrickPlayTest extends PlayerFixture {
         prepare("silent.mkv");
         player.start();
         IllegalStateException e = assertThrows(
-                IllegalStateException.class, () -> player.trickPlay().step(100_000));
+                IllegalStateException.class, () -> player.trickPlay().stepAndWait(100_000));
         assertTrue(e.getMessage().startsWith("the engine refused step()"), e.getMessage());
         assertEquals(PlayerState.PAUSED, player.getState());
         player.pause();
-        player.trickPlay().step(-1);
+        player.trickPlay().stepAndWait(-1);
         player.start();
         recorder.await("completion");
-        assertThrows(IllegalStateException.class, () -> player.trickPlay().step(1));
+        assertThrows(IllegalStateException.class, () -> player.trickPlay().stepAndWait(1));
         assertEquals(PlayerState.COMPLETED, player.getState());
-        assertThrows(IllegalStateException.class, () -> player.trickPlay().step(-100_000));
+        assertThrows(IllegalStateException.class, () -> player.trickPlay().stepAndWait(-100_000));
         assertEquals(PlayerState.PAUSED, player.getState(), "it left the end");
     }
 
     @Test
     void aStepWithoutAPictureChangesNothing() throws Exception {
         prepare("tone.mp3");
-        assertThrows(IllegalStateException.class, () -> player.trickPlay().step(1));
+        assertThrows(IllegalStateException.class, () -> player.trickPlay().stepAndWait(1));
         assertEquals(PlayerState.PREPARED, player.getState());
         player.start();
         awaitMoving();
-        assertThrows(IllegalStateException.class, () -> player.trickPlay().step(1));
+        assertThrows(IllegalStateException.class, () -> player.trickPlay().stepAndWait(1));
         assertEquals(PlayerState.STARTED, player.getState());
         awaitMoving();
     }
@@ -109,16 +109,16 @@ class TrickPlayTest extends PlayerFixture {
         prepare("long.mkv");
         player.start();
         awaitMoving();
-        player.trickPlay().step(1);
+        player.trickPlay().stepAndWait(1);
         assertEquals(PlayerState.PAUSED, player.getState());
         int before = player.getCurrentPosition();
-        player.trickPlay().step(1);
+        player.trickPlay().stepAndWait(1);
         Wait.until("one frame of 33 ms passed",
                 () -> Math.abs(player.getCurrentPosition() - before - 33) < 10);
-        player.trickPlay().step(3);
+        player.trickPlay().stepAndWait(3);
         Wait.until("three more passed",
                 () -> Math.abs(player.getCurrentPosition() - before - 133) < 10);
-        player.trickPlay().step(-2);
+        player.trickPlay().stepAndWait(-2);
         Wait.until("two went back",
                 () -> Math.abs(player.getCurrentPosition() - before - 67) < 10);
     }
@@ -127,9 +127,9 @@ class TrickPlayTest extends PlayerFixture {
     void aSectionIsRepeated() throws Exception {
         prepare("long.mkv");
         assertFalse(player.trickPlay().repeatUntilHere(), "nothing was begun");
-        player.seekTo(10_000);
+        player.seekToAndWait(10_000);
         assertTrue(player.trickPlay().repeatFromHere());
-        player.seekTo(11_000);
+        player.seekToAndWait(11_000);
         assertTrue(player.trickPlay().repeatUntilHere());
         player.start();
         for (int round = 0; round < 3; round++) {
@@ -147,21 +147,21 @@ class TrickPlayTest extends PlayerFixture {
         prepare("long.mkv");
         long begin = player.trickPlay().getBytePosition();
         assertTrue(begin > 0);
-        player.trickPlay().seekToByte(3_000_000);
+        player.trickPlay().seekToByteAndWait(3_000_000);
         assertEquals(30_000, player.getCurrentPosition(), 10_000);
         assertTrue(player.trickPlay().getBytePosition() > begin);
         recorder.await("seek");
-        assertThrows(IllegalArgumentException.class, () -> player.trickPlay().seekToByte(-1));
+        assertThrows(IllegalArgumentException.class, () -> player.trickPlay().seekToByteAndWait(-1));
         assertThrows(IllegalArgumentException.class,
-                () -> player.trickPlay().seekToByte(1L << 31));
+                () -> player.trickPlay().seekToByteAndWait(1L << 31));
         assertThrows(IllegalStateException.class,
-                () -> player.trickPlay().seekToByte(Integer.MAX_VALUE));
+                () -> player.trickPlay().seekToByteAndWait(Integer.MAX_VALUE));
     }
 
     @Test
     void theNativeHalfCutsBytePositions() throws Exception {
         prepare("long.mkv");
-        player.seekTo(30_000);
+        player.seekToAndWait(30_000);
         player.native_seekToPosition((1L << 32) + 16);
         assertTrue(player.getCurrentPosition() < 2000, "16 bytes from the start");
         assertThrows(IllegalStateException.class, () -> player.native_seekToPosition(1L << 31));
@@ -170,9 +170,9 @@ class TrickPlayTest extends PlayerFixture {
     @Test
     void whatIsBufferedIsAPercentage() throws Exception {
         prepare("long.mkv");
-        int percent = player.trickPlay().getBufferedPercent();
+        int percent = player.getBufferedPercent();
         assertTrue(percent >= 0 && percent <= 100, "" + percent);
-        player.seekTo(59_000);
-        Wait.until("nearly all is read", () -> player.trickPlay().getBufferedPercent() > 95);
+        player.seekToAndWait(59_000);
+        Wait.until("nearly all is read", () -> player.getBufferedPercent() > 95);
     }
 }

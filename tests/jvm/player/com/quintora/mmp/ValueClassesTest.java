@@ -9,9 +9,10 @@ import static org.junit.jupiter.api.Assertions.assertThrows;
 import static org.junit.jupiter.api.Assertions.assertTrue;
 
 import com.quintora.SubtitleAttr;
+import com.quintora.mmp.internal.media.FourCharacters;
 import com.quintora.mmp.util.DivxLastMemoryFilePosition;
-import com.quintora.mmp.util.PcmMediaInfo;
 import com.quintora.mmp.util.PcmMediaInfo.AudioPcmInfo;
+import com.quintora.mmp.util.PcmMediaInfo;
 import com.quintora.mmp.util.ThumbnailInfo;
 import java.lang.reflect.Modifier;
 import java.util.Arrays;

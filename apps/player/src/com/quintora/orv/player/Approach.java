@@ -144,13 +144,13 @@ final class Approach {
     private record PlayerFilm(OrvMediaPlayer player) implements Film {
         @Override
         public void seekTo(int millis) {
-            player.seekTo(millis);
+            player.seekToAndWait(millis);
         }
 
         @Override
         public boolean step(int frames) {
             try {
-                player.trickPlay().step(frames);
+                player.trickPlay().stepAndWait(frames);
                 return true;
             } catch (IllegalStateException e) {
                 PlayerState state = player.getState();

@@ -18,7 +18,7 @@ final class Media {
             } else {
                 player.setDataSource(StandardInput.path(source));
             }
-            player.prepare();
+            player.prepareAndWait();
             return player;
         } catch (IOException | SecurityException e) {
             player.close();

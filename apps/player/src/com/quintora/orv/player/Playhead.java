@@ -64,7 +64,7 @@ final class Playhead {
         move(
                 () -> {
                     if (approach == null || player.trickPlay().getSpeed() < 0) {
-                        player.seekTo(millis);
+                        player.seekToAndWait(millis);
                     } else {
                         approach.to(millis);
                     }
@@ -80,7 +80,7 @@ final class Playhead {
         move(
                 () -> {
                     rest();
-                    player.trickPlay().step(count);
+                    player.trickPlay().stepAndWait(count);
                 });
     }
 

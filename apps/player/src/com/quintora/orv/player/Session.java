@@ -6,15 +6,18 @@ import android.view.Surface;
 import android.view.SurfaceView;
 import com.quintora.mmp.ChannelStreamSource;
 import com.quintora.mmp.MediaException;
+import com.quintora.mmp.MediaPlayer;
 import com.quintora.mmp.OrvMediaPlayer;
 import com.quintora.mmp.PlayerListener;
 import com.quintora.mmp.PlayerRole;
+import com.quintora.mmp.Track;
 import com.quintora.mmp.VideoTrack;
 import java.io.IOException;
 import java.nio.file.AccessDeniedException;
 import java.nio.file.Files;
 import java.nio.file.NoSuchFileException;
 import java.nio.file.Path;
+import java.util.List;
 import java.util.Locale;
 import java.util.concurrent.CountDownLatch;
 import java.util.function.Consumer;
@@ -90,7 +93,7 @@ public final class Session implements AutoCloseable {
                 player.setSurface(frames.reader().getSurface());
             }
             frames.start();
-            player.prepare();
+            player.prepareAndWait();
             Silence.explain(player);
             frameRate = player.tracks().currentVideo().map(VideoTrack::frameRate).orElse(0.0);
             playhead.open();
@@ -160,37 +163,42 @@ public final class Session implements AutoCloseable {
 
     /** From 0 to 1. */
     public void setVolume(double level) {
-        player.audio().setVolume((float) level, (float) level);
+        player.setVolume((float) level);
     }
 
     public void selectAudio(int index) throws Failure {
-        if (!player.tracks().selectAudio(index)) {
-            throw new Failure(noTrack("sound", index, player.tracks().audio().size()));
-        }
+        select(index, player.tracks().audio(), "sound");
     }
 
     /** Shows a subtitle track; a negative index is for none. */
     public void selectSubtitle(int index) throws Failure {
         if (index < 0) {
-            player.subtitles().hide();
-            return;
+            player.tracks().selectNoneAndWait(Track.Kind.SUBTITLE);
+        } else {
+            select(index, player.tracks().subtitles(), "subtitle");
         }
-        int count = player.tracks().subtitles().size();
-        if (index >= count) {
-            throw new Failure(noTrack("subtitle", index, count));
+    }
+
+    private void select(int index, List<? extends Track> tracks, String kind) throws Failure {
+        if (index < 0 || index >= tracks.size()) {
+            throw new Failure(noTrack(kind, index, tracks.size()));
         }
-        player.subtitles().show(index);
+        try {
+            player.tracks().selectAndWait(tracks.get(index));
+        } catch (IllegalStateException e) {
+            throw new Failure(e.getMessage(), e);
+        }
     }
 
     public void addSubtitles(String path) throws Failure {
-        int before = player.tracks().subtitles().size();
-        if (path.toLowerCase(Locale.ROOT).endsWith(".idx")) {
-            player.subtitles().add(picturesOf(path), path);
-        } else {
-            player.subtitles().add(path);
-        }
-        if (player.tracks().subtitles().size() == before) {
-            throw new Failure("cannot read subtitles from '" + path + "'");
+        try {
+            if (path.toLowerCase(Locale.ROOT).endsWith(".idx")) {
+                player.subtitles().addPairAndWait(picturesOf(path), path);
+            } else {
+                player.subtitles().addAndWait(path);
+            }
+        } catch (IOException e) {
+            throw new Failure(e.getMessage(), e);
         }
     }
 
@@ -200,7 +208,7 @@ public final class Session implements AutoCloseable {
                 player.getDuration(),
                 playhead.isPlaying(),
                 player.trickPlay().getSpeed(),
-                player.trickPlay().getBufferedPercent(),
+                player.getBufferedPercent(),
                 frames.count().shown(),
                 frames.count().dropped());
     }
@@ -223,7 +231,7 @@ public final class Session implements AutoCloseable {
     @Override
     public void close() {
         frames.close();
-        player.release();
+        player.close();
     }
 
     private void setSource() throws IOException {
@@ -305,7 +313,7 @@ public final class Session implements AutoCloseable {
             player.tracks().subtitles().stream()
                     .filter(track -> track.flags().isDefault() || track.flags().isForced())
                     .findFirst()
-                    .ifPresent(track -> player.subtitles().show(track.index()));
+                    .ifPresent(player.tracks()::selectAndWait);
         }
     }
 
@@ -331,13 +339,13 @@ public final class Session implements AutoCloseable {
 
     private final class Ending implements PlayerListener {
         @Override
-        public void onCompletion(OrvMediaPlayer player) {
+        public void onCompletion(MediaPlayer player) {
             stopwatch.stop(player.getCurrentPosition());
             ended.countDown();
         }
 
         @Override
-        public void onError(OrvMediaPlayer player, MediaException error) {
+        public void onError(MediaPlayer player, MediaException error) {
             failure = new Failure(error.getMessage(), error);
             ended.countDown();
         }

@@ -13,7 +13,6 @@ import java.awt.image.DataBufferInt;
 import java.io.ByteArrayOutputStream;
 import java.io.IOException;
 import java.io.UncheckedIOException;
-import java.nio.ByteBuffer;
 import java.nio.ByteOrder;
 import java.nio.file.Path;
 import java.util.List;
@@ -109,7 +108,7 @@ final class ThumbnailCommand implements Callable<Integer> {
     private Thumbnail draw(OrvMediaPlayer player) throws Failure {
         Size wanted = size != null ? size : shapeOf(player);
         return player.pictures()
-                .thumbnail(wanted.width(), wanted.height(), ColorMode.XRGB8888)
+                .thumbnailAndWait(wanted.width(), wanted.height(), ColorMode.XRGB8888)
                 .orElseThrow(() -> new Failure("no picture could be made of '" + source + "'"));
     }
 
@@ -138,7 +137,7 @@ final class ThumbnailCommand implements Callable<Integer> {
         BufferedImage image =
                 new BufferedImage(picture.width(), picture.height(), BufferedImage.TYPE_INT_RGB);
         int[] pixels = ((DataBufferInt) image.getRaster().getDataBuffer()).getData();
-        ByteBuffer.wrap(picture.pixels())
+        picture.pixels()
                 .order(ByteOrder.LITTLE_ENDIAN)
                 .asIntBuffer()
                 .get(pixels);

@@ -24,14 +24,14 @@ class FramePumpTest {
         player.setDataSource(Media.path("long.mkv"));
         player.setSurface(pump.reader().getSurface());
         pump.start();
-        player.prepare();
+        player.prepareAndWait();
         Wait.until("the first frame shows", () -> !shownMs.isEmpty());
     }
 
     @AfterEach
     void close() {
         pump.close();
-        player.release();
+        player.close();
     }
 
     @Test
@@ -60,7 +60,7 @@ class FramePumpTest {
 
     private void seekAndAwaitFrame(int millis) throws Exception {
         long before = pump.reader().getFrameCount();
-        player.seekTo(millis);
+        player.seekToAndWait(millis);
         Wait.until("it is drawn", () -> pump.reader().getFrameCount() > before);
     }
 

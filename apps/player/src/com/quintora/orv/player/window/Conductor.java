@@ -3,7 +3,9 @@ package com.quintora.orv.player.window;
 
 import android.view.SurfaceView;
 import com.quintora.mmp.MediaException;
+import com.quintora.mmp.MediaPlayer;
 import com.quintora.mmp.OrvMediaPlayer;
+import com.quintora.mmp.PlaybackInfo;
 import com.quintora.mmp.PlayerListener;
 import com.quintora.mmp.PlayerState;
 import com.quintora.orv.player.Failure;
@@ -326,20 +328,21 @@ final class Conductor implements Controls {
 
     private final class Events implements PlayerListener {
         @Override
-        public void onError(OrvMediaPlayer player, MediaException error) {
+        public void onError(MediaPlayer player, MediaException error) {
             fail(new Failure(error.getMessage(), error));
         }
 
         @Override
-        public void onInfo(OrvMediaPlayer player, int what, int extra) {
-            if (what == INFO_BUFFERING_STARTED || what == INFO_BUFFERING_ENDED) {
-                boolean waits = what == INFO_BUFFERING_STARTED;
-                EventQueue.invokeLater(() -> stage.setBuffering(waits));
+        public void onInfo(MediaPlayer player, PlaybackInfo info) {
+            switch (info.kind()) {
+                case BUFFERING_STARTED -> EventQueue.invokeLater(() -> stage.setBuffering(true));
+                case BUFFERING_ENDED -> EventQueue.invokeLater(() -> stage.setBuffering(false));
+                default -> { }
             }
         }
 
         @Override
-        public void onVideoSizeChanged(OrvMediaPlayer player, int width, int height) {
+        public void onVideoSizeChanged(MediaPlayer player, int width, int height) {
             EventQueue.invokeLater(() -> stage.showVideoSize(width, height));
         }
     }

@@ -5,13 +5,14 @@ import com.quintora.mmp.AudioTrack;
 import com.quintora.mmp.MediaMetadata;
 import com.quintora.mmp.OrvMediaPlayer;
 import com.quintora.mmp.SubtitleTrack;
+import com.quintora.mmp.Track;
 import com.quintora.orv.player.TrackNames;
 import java.awt.image.BufferedImage;
 import java.io.ByteArrayInputStream;
 import java.io.IOException;
 import java.util.ArrayList;
 import java.util.List;
-import java.util.OptionalInt;
+import java.util.Optional;
 import java.util.function.IntConsumer;
 import javax.imageio.ImageIO;
 
@@ -76,20 +77,20 @@ final class MediaDetails {
     }
 
     List<ChoiceMenu.Choice> audioChoices(IntConsumer select) {
-        OptionalInt current = player.tracks().currentAudio();
+        Optional<AudioTrack> current = player.tracks().currentAudio();
         List<ChoiceMenu.Choice> choices = new ArrayList<>();
         for (AudioTrack track : player.tracks().audio()) {
-            boolean isChosen = isAt(current, track.index());
+            boolean isChosen = isAt(current, track);
             choices.add(choice(TrackNames.of(track), isChosen, track.index(), select));
         }
         return choices;
     }
 
     List<ChoiceMenu.Choice> subtitleChoices(IntConsumer select) {
-        OptionalInt current = player.tracks().currentSubtitle();
+        Optional<SubtitleTrack> current = player.tracks().currentSubtitle();
         List<ChoiceMenu.Choice> choices = new ArrayList<>();
         for (SubtitleTrack track : player.tracks().subtitles()) {
-            boolean isChosen = isAt(current, track.index());
+            boolean isChosen = isAt(current, track);
             choices.add(choice(TrackNames.of(track), isChosen, track.index(), select));
         }
         if (!choices.isEmpty()) {
@@ -103,8 +104,8 @@ final class MediaDetails {
         return new ChoiceMenu.Choice(text, chosen, () -> select.accept(index));
     }
 
-    private static boolean isAt(OptionalInt current, int index) {
-        return current.isPresent() && current.getAsInt() == index;
+    private static boolean isAt(Optional<? extends Track> current, Track track) {
+        return current.isPresent() && current.get().index() == track.index();
     }
 
     private static BufferedImage decode(byte[] bytes) {

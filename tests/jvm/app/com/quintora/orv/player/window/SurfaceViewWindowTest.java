@@ -36,7 +36,7 @@ class SurfaceViewWindowTest {
     @AfterEach
     void close() throws Exception {
         EventQueue.invokeAndWait(() -> frame.dispose());
-        player.release();
+        player.close();
     }
 
     private void open(boolean byGpu) throws Exception {
@@ -52,7 +52,7 @@ class SurfaceViewWindowTest {
                 });
         Wait.until("the surface has a size", () -> onEvents(() -> calls.contains("320 x 180")));
         player.setDataSource(Media.path("video.mp4"));
-        player.prepare();
+        player.prepareAndWait();
         player.start();
         awaitPicture();
         assertEquals(byGpu, view.isDrawnByGpu(), view.describeDrawing());
@@ -101,11 +101,11 @@ class SurfaceViewWindowTest {
         open(byGpu);
         player.pause();
         view.hold(true);
-        player.seekTo(5_000);
+        player.seekToAndWait(5_000);
         while (view.awaitFrame(100) >= 0) {
             // Those from before.
         }
-        player.seekTo(7_000);
+        player.seekToAndWait(7_000);
         assertEquals(-1, view.awaitFrame(300));
         view.hold(false);
         Wait.until(
