@@ -92,7 +92,7 @@ class PlayCommandTest {
         "--audio-track, 2, 'there is no sound track 2; they are 0 to 1'",
         "--audio-track, -1, 'there is no sound track -1; they are 0 to 1'",
         "--subtitle-track, 7, 'there is no subtitle track 7; they are 0 to 1'",
-        "--subtitle, /none.srt, 'cannot read subtitles from ''/none.srt'''"
+        "--subtitle, /none.srt, '/none.srt: no such file'"
     })
     void whatTheMediaCannotDoIsOneSentence(String option, String value, String sentence)
             throws Exception {
