@@ -25,8 +25,9 @@ jlong windowOf(JAWT_DrawingSurface* surface) {
 }  // namespace
 
 // 0 for a component that is not on an X screen.
-extern "C" JNIEXPORT jlong JNICALL Java_android_view_SurfaceView_nativeWindowOf(JNIEnv* env, jclass,
-                                                                                jobject component) {
+extern "C" JNIEXPORT jlong JNICALL
+Java_com_quintora_mmp_platform_internal_ViewWindow_nativeWindowOf(JNIEnv* env, jclass,
+                                                                  jobject component) {
     const GetAwt getAwt = findGetAwt();
     JAWT awt = {};
     awt.version = JAWT_VERSION_9;

@@ -4,6 +4,7 @@
 
 #include <new>
 
+#include "JavaSurface.h"
 #include "NativeHandle.h"
 
 namespace android {
@@ -28,6 +29,15 @@ sp<Surface> android_view_Surface_getSurface(JNIEnv* env, jobject surfaceObj) {
     const sp<Surface> surface = fromHandle<Surface>(env->GetLongField(surfaceObj, field));
     env->MonitorExit(surfaceObj);
     return surface;
+}
+
+// Through the surface's own constructor, which takes a producer.
+jobject newJavaSurface(JNIEnv* env, IGraphicBufferProducer* producer) {
+    jclass const clazz = env->FindClass("android/view/Surface");
+    if (clazz == nullptr) return nullptr;
+    jmethodID const constructor = env->GetMethodID(clazz, "<init>", "(J)V");
+    if (constructor == nullptr) return nullptr;
+    return env->NewObject(clazz, constructor, toHandle(producer));
 }
 
 }  // namespace android

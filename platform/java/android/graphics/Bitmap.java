@@ -30,6 +30,11 @@ public final class Bitmap {
      * Makes a bitmap from a copy of the pixels.
      *
      * @param colors the rows, top first, without gaps; at least width times height of them
+     * @param width pixels in a row, 1 or more
+     * @param height the number of rows, 1 or more
+     * @param config how the pixels are stored
+     * @return a new bitmap
+     * @throws NullPointerException for no colors or no config
      * @throws IllegalArgumentException for a size that is not positive
      * @throws ArrayIndexOutOfBoundsException for too few colors
      */
@@ -48,17 +53,29 @@ public final class Bitmap {
         return new Bitmap(pixels, width, height, config);
     }
 
-    /** Pixels in a row. */
+    /**
+     * The width.
+     *
+     * @return pixels in a row
+     */
     public int getWidth() {
         return mWidth;
     }
 
-    /** Number of rows. */
+    /**
+     * The height.
+     *
+     * @return the number of rows
+     */
     public int getHeight() {
         return mHeight;
     }
 
-    /** How the pixels are stored. */
+    /**
+     * How the pixels are stored.
+     *
+     * @return never null
+     */
     public Config getConfig() {
         return mConfig;
     }
@@ -66,6 +83,9 @@ public final class Bitmap {
     /**
      * One pixel.
      *
+     * @param x its column, from 0
+     * @param y its row, from 0
+     * @return its color, 0xAARRGGBB
      * @throws IllegalArgumentException for a position outside the bitmap
      */
     public int getPixel(int x, int y) {
@@ -81,12 +101,14 @@ public final class Bitmap {
      *
      * @param pixels receives the colors
      * @param offset the first index written
-     * @param stride array entries between rows, at least width
+     * @param stride array entries from one row to the next, at least width; negative to write the
+     *        rows towards the start of the array
      * @param x the rectangle's left column
      * @param y its top row
      * @param width its pixels in a row
      * @param height its number of rows
-     * @throws IllegalArgumentException for a rectangle outside the bitmap or a stride below width
+     * @throws IllegalArgumentException for a rectangle outside the bitmap or a stride whose
+     *         magnitude is below width
      * @throws ArrayIndexOutOfBoundsException for an array too small
      */
     public void getPixels(
@@ -95,7 +117,7 @@ public final class Bitmap {
                 || height > mHeight - y) {
             throw new IllegalArgumentException("rectangle outside " + mWidth + "x" + mHeight);
         }
-        if (stride < width) {
+        if (Math.abs(stride) < width) {
             throw new IllegalArgumentException("stride " + stride + " is below width " + width);
         }
         for (int row = 0; row < height; row++) {

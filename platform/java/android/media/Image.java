@@ -2,105 +2,87 @@
 package android.media;
 
 import java.nio.ByteBuffer;
-import java.util.Objects;
 
 /**
- * One video frame lent by an {@link ImageReader}: 32 bits a pixel, bytes B, G, R, X in memory. The
- * reader lends one frame at a time, so close it as soon as it is shown or copied. Not thread-safe,
- * but any one thread may use it.
+ * A frame that was taken from an {@link ImageReader}. Close it soon: a reader has only so many.
+ * Once it or its reader is closed, every method but {@link #close} throws
+ * {@link IllegalStateException}. Not thread-safe, but any one thread may use it. Nothing blocks.
  */
-public class Image implements AutoCloseable {
-    /** The pixels of a frame. */
-    public static final class Plane {
-        private final Image mImage;
+public abstract class Image implements AutoCloseable {
+    Image() {}
 
-        private Plane(Image image) {
-            mImage = image;
-        }
-
-        /** Bytes from the start of one row to the start of the next, a multiple of 64. */
-        public int getRowStride() {
-            mImage.checkOpen();
-            return mImage.mRowStride;
-        }
-
-        /** Bytes from one pixel to the next: 4. */
-        public int getPixelStride() {
-            mImage.checkOpen();
-            return 4;
-        }
+    /** The pixels of an image. */
+    public abstract static class Plane {
+        Plane() {}
 
         /**
-         * The rows, top first: a direct, read-only, little-endian buffer of row stride times height
-         * bytes at position 0. Read as ints, each pixel is 0xXXRRGGBB with X undefined. Once the
-         * image is closed the content changes under the reader, usually not before another frame
-         * was taken, but reading stays harmless.
+         * The distance of rows.
+         *
+         * @return bytes from the start of one row to the start of the next
+         * @throws IllegalStateException if the image is closed
          */
-        public ByteBuffer getBuffer() {
-            mImage.checkOpen();
-            return mImage.mPixels;
-        }
-    }
+        public abstract int getRowStride();
 
-    private final ImageReader mReader;
-    private final int mSlot;
-    private final int mWidth;
-    private final int mHeight;
-    private final int mRowStride;
-    private final long mTimestampUs;
-    private final ByteBuffer mPixels;
-    private boolean mClosed;
+        /**
+         * The distance of pixels.
+         *
+         * @return bytes from one pixel of a row to the next
+         * @throws IllegalStateException if the image is closed
+         */
+        public abstract int getPixelStride();
 
-    Image(ImageReader reader, int slot, int width, int height, int rowStride, long timestampUs,
-            ByteBuffer pixels) {
-        mReader = Objects.requireNonNull(reader);
-        mSlot = slot;
-        mWidth = width;
-        mHeight = height;
-        mRowStride = rowStride;
-        mTimestampUs = timestampUs;
-        mPixels = pixels;
-    }
-
-    /** Pixels in a row. */
-    public int getWidth() {
-        checkOpen();
-        return mWidth;
-    }
-
-    /** Number of rows. */
-    public int getHeight() {
-        checkOpen();
-        return mHeight;
-    }
-
-    /** The frame's media time in nanoseconds. */
-    public long getTimestamp() {
-        checkOpen();
-        return mTimestampUs * 1000;
-    }
-
-    /** One plane that holds whole pixels. */
-    public Plane[] getPlanes() {
-        checkOpen();
-        return new Plane[] {new Plane(this)};
+        /**
+         * The pixels, row by row, the top one first, as the image's format says.
+         *
+         * @return a direct buffer in native byte order, with the first pixel at index 0; the same
+         *         one in each call. Do not use it once the image is closed: the pixels may be
+         *         those of another then
+         * @throws IllegalStateException if the image is closed
+         */
+        public abstract ByteBuffer getBuffer();
     }
 
     /**
-     * Gives the frame back to the reader. The other methods throw
-     * {@link IllegalStateException} from now on; closing again does nothing.
+     * How the pixels are stored.
+     *
+     * @return the format that the reader was made with, of {@link android.graphics.PixelFormat}
+     * @throws IllegalStateException if the image is closed
      */
-    @Override
-    public void close() {
-        if (!mClosed) {
-            mClosed = true;
-            mReader.release(mSlot);
-        }
-    }
+    public abstract int getFormat();
 
-    private void checkOpen() {
-        if (mClosed) {
-            throw new IllegalStateException("Image is already closed");
-        }
-    }
+    /**
+     * The width.
+     *
+     * @return pixels in a row
+     * @throws IllegalStateException if the image is closed
+     */
+    public abstract int getWidth();
+
+    /**
+     * The height.
+     *
+     * @return the number of rows
+     * @throws IllegalStateException if the image is closed
+     */
+    public abstract int getHeight();
+
+    /**
+     * When the frame shows.
+     *
+     * @return its media time in nanoseconds
+     * @throws IllegalStateException if the image is closed
+     */
+    public abstract long getTimestamp();
+
+    /**
+     * The pixels.
+     *
+     * @return one plane, with whole pixels
+     * @throws IllegalStateException if the image is closed
+     */
+    public abstract Plane[] getPlanes();
+
+    /** Gives the image back to its reader. May be called again. */
+    @Override
+    public abstract void close();
 }

@@ -1,149 +1,161 @@
 // SPDX-License-Identifier: Apache-2.0
 package android.media;
 
+import android.graphics.PixelFormat;
+import android.os.Handler;
+import android.os.Looper;
 import android.view.Surface;
-import java.lang.ref.Cleaner;
+import com.quintora.mmp.desktop.FrameReader;
+import com.quintora.mmp.desktop.VideoFrame;
 import java.nio.ByteBuffer;
 import java.nio.ByteOrder;
-import java.util.concurrent.Executor;
+import java.nio.IntBuffer;
+import java.util.ArrayDeque;
+import java.util.Deque;
+import java.util.HashSet;
+import java.util.Set;
 
 /**
- * Hands the frames that a player draws to Java: the consumer behind a {@link Surface}.
+ * Gives a program the frames that a player draws, as images of one size and format.
  *
- * <p>The newest frame wins: one that was not taken before the next arrives is dropped, so a slow
- * reader never holds up the player. All methods may be called from any thread; only
- * {@link #awaitImage} blocks. Close the reader after use: the player then draws nowhere.
+ * <p>One frame waits to be taken at most: the next one takes its place, so that a slow program
+ * never holds up the player. Each image is a copy of its frame; {@link FrameReader} lends the
+ * desktop's frames themselves. All methods may be called from any thread and none blocks.
  */
 public class ImageReader implements AutoCloseable {
-    static {
-        System.loadLibrary("orv_platform");
-    }
-
-    /** Called when a new frame can be taken. */
+    /** Is notified of new frames. */
     public interface OnImageAvailableListener {
         /**
-         * Called once for one or several new frames; take the newest with
-         * {@link ImageReader#acquireLatestImage()}.
+         * Called once for one or several new frames.
+         *
+         * @param reader has them; take the newest with {@link ImageReader#acquireLatestImage()}
          */
         void onImageAvailable(ImageReader reader);
     }
 
-    private static final Cleaner CLEANER = Cleaner.create();
+    // What a frame, read as little-endian ints, has beside blue in its low byte.
+    private static final int BLUE = 0xff;
+    private static final int GREEN = 0xff00;
+    private static final int OPAQUE = 0xff000000;
 
-    // What the native queue answers, as in the platform's error numbers.
-    private static final int NO_ERROR = 0;
-    private static final int WOULD_BLOCK = -11;
-    private static final int NO_INIT = -19;
+    private final FrameReader mFrames;
+    private final int mWidth;
+    private final int mHeight;
+    private final int mFormat;
+    private final int mMaxImages;
 
-    // The long[] that nativeAcquire fills.
-    private static final int SLOT = 0;
-    private static final int WIDTH = 1;
-    private static final int HEIGHT = 2;
-    private static final int STRIDE = 3;
-    private static final int TIMESTAMP_US = 4;
-    private static final int MEMORY = 5;
-    private static final int FIELD_COUNT = 6;
+    // All under the lock of mOpen.
+    private final Set<ReaderImage> mOpen = new HashSet<>();
+    private final Deque<ByteBuffer> mSpare = new ArrayDeque<>();
+    private boolean mClosed;
 
-    // Waits are cut into pieces of this length, to see interruptions.
-    private static final int WAIT_SLICE_MS = 50;
-
-    // The native queue lives as long as this object; close() only abandons it,
-    // so that no call can meet a queue that is gone.
-    private final long mQueue;
-    private final Surface mSurface;
-    private final Object mListenerLock = new Object();
-    private FrameNotifier mNotifier;
-    private volatile boolean mClosed;
-
-    private ImageReader() {
-        long queue = nativeCreate();
-        if (queue == 0) {
-            throw new OutOfMemoryError("native buffer queue");
-        }
-        mQueue = queue;
-        CLEANER.register(this, () -> nativeDestroy(queue));
-        mSurface = nativeCreateSurface(queue);
+    private ImageReader(int width, int height, int format, int maxImages) {
+        mFrames = new FrameReader(width, height);
+        mWidth = width;
+        mHeight = height;
+        mFormat = format;
+        mMaxImages = maxImages;
     }
 
     /**
-     * Makes a reader.
+     * Makes a reader. Close it after use: the player then draws nowhere.
      *
-     * @param width pixels, up to 16384; 0 with a height of 0 for the video's own size
-     * @param height rows, up to 16384
-     * @throws IllegalArgumentException for any other size
+     * @param width of the images in pixels, 1 to 16384
+     * @param height of the images in rows, 1 to 16384
+     * @param format {@link PixelFormat#RGBA_8888} or {@link PixelFormat#RGBX_8888}; the images of
+     *        both are opaque
+     * @param maxImages how many images may be open at a time, 1 or more
+     * @return a new reader
+     * @throws IllegalArgumentException for anything else
      */
-    public static ImageReader newInstance(int width, int height) {
-        ImageReader reader = new ImageReader();
-        try {
-            reader.setDefaultSize(width, height);
-        } catch (IllegalArgumentException e) {
-            reader.close();
-            throw e;
+    public static ImageReader newInstance(int width, int height, int format, int maxImages) {
+        if (width < 1 || height < 1) {
+            throw new IllegalArgumentException("The image dimensions must be positive");
         }
-        return reader;
+        if (maxImages < 1) {
+            throw new IllegalArgumentException("maxImages must be at least 1");
+        }
+        if (format != PixelFormat.RGBA_8888 && format != PixelFormat.RGBX_8888) {
+            throw new IllegalArgumentException("Format " + format + " is not supported");
+        }
+        return new ImageReader(width, height, format, maxImages);
     }
 
-    /** The surface to give to a player; always the same one, released by {@link #close()}. */
+    /**
+     * The width that the reader was made with.
+     *
+     * @return pixels
+     */
+    public int getWidth() {
+        return mWidth;
+    }
+
+    /**
+     * The height that the reader was made with.
+     *
+     * @return rows
+     */
+    public int getHeight() {
+        return mHeight;
+    }
+
+    /**
+     * The format of the images.
+     *
+     * @return one of {@link PixelFormat}
+     */
+    public int getImageFormat() {
+        return mFormat;
+    }
+
+    /**
+     * How many images may be open at a time.
+     *
+     * @return 1 or more
+     */
+    public int getMaxImages() {
+        return mMaxImages;
+    }
+
+    /**
+     * The surface to give to a player.
+     *
+     * @return always the same one; {@link #close()} releases it
+     */
     public Surface getSurface() {
-        return mSurface;
+        return mFrames.getSurface();
     }
 
     /**
-     * Asks the player for frames of another size, from one of its next frames on.
+     * Takes the newest frame.
      *
-     * @param width pixels, up to 16384; 0 with a height of 0 for the video's own size
-     * @param height rows, up to 16384
-     * @throws IllegalArgumentException for any other size
-     */
-    public void setDefaultSize(int width, int height) {
-        if (nativeSetDefaultSize(mQueue, width, height) != NO_ERROR) {
-            throw new IllegalArgumentException("Invalid frame size " + width + "x" + height);
-        }
-    }
-
-    /**
-     * Takes the newest frame, without waiting.
-     *
-     * @return the frame, or null when there is none newer than the one taken before
-     * @throws IllegalStateException while an earlier image is not closed, or after {@link #close()}
+     * @return null when there is none newer than the one that was taken before
+     * @throws IllegalStateException while {@link #getMaxImages()} images are open, or after
+     *         {@link #close()}
      */
     public Image acquireLatestImage() {
-        long[] fields = new long[FIELD_COUNT];
-        int status = nativeAcquire(mQueue, fields);
-        switch (status) {
-            case NO_ERROR:
-                return imageOf(fields);
-            case WOULD_BLOCK:
-                return null;
-            case NO_INIT:
-                throw new IllegalStateException("ImageReader is closed");
-            default:
-                throw new IllegalStateException("The image taken before is not closed");
-        }
+        return acquireNextImage();
     }
 
     /**
-     * Takes the newest frame, waiting for one when there is none.
+     * Takes the frame that waits longest; as one waits at most, this is the newest, too.
      *
-     * @param timeoutMillis the longest wait in milliseconds; 0 or less for none
-     * @return the frame, or null when none came in time
-     * @throws IllegalStateException while an earlier image is not closed, or when the reader is
-     *         closed before or during the wait
-     * @throws InterruptedException when the thread is interrupted while it waits
+     * @return null when there is none newer than the one that was taken before
+     * @throws IllegalStateException while {@link #getMaxImages()} images are open, or after
+     *         {@link #close()}
      */
-    public Image awaitImage(long timeoutMillis) throws InterruptedException {
-        long start = System.nanoTime();
-        while (true) {
-            long seen = nativeGetQueuedCount(mQueue);
-            Image image = acquireLatestImage();
-            long leftMillis = timeoutMillis - (System.nanoTime() - start) / 1_000_000;
-            if (image != null || leftMillis <= 0) {
-                return image;
+    public Image acquireNextImage() {
+        synchronized (mOpen) {
+            if (mClosed) {
+                throw new IllegalStateException("ImageReader is closed");
             }
-            if (Thread.interrupted()) {
-                throw new InterruptedException();
+            if (mOpen.size() >= mMaxImages) {
+                throw new IllegalStateException("maxImages (" + mMaxImages
+                        + ") has already been acquired, call #close before acquiring more.");
             }
-            nativeAwaitFrame(mQueue, seen, (int) Math.min(leftMillis, WAIT_SLICE_MS));
+            try (VideoFrame frame = mFrames.acquireLatestFrame()) {
+                return frame == null ? null : open(frame);
+            }
         }
     }
 
@@ -151,113 +163,76 @@ public class ImageReader implements AutoCloseable {
      * Sets who is notified of new frames; at most one listener at a time.
      *
      * @param listener null for none
-     * @param executor runs the listener, such as {@code SwingUtilities::invokeLater}; null for the
-     *        reader's own thread
+     * @param handler its thread runs the listener; null for that of the calling thread's looper
+     * @throws IllegalArgumentException for a listener without a handler on a thread that has no
+     *         looper
      */
-    public void setOnImageAvailableListener(OnImageAvailableListener listener, Executor executor) {
-        synchronized (mListenerLock) {
-            if (mNotifier != null) {
-                mNotifier.mStopped = true;
-                mNotifier = null;
-            }
-            if (listener != null && !mClosed) {
-                mNotifier = new FrameNotifier(listener, executor != null ? executor : Runnable::run);
-                mNotifier.start();
-            }
+    public void setOnImageAvailableListener(OnImageAvailableListener listener, Handler handler) {
+        if (listener == null) {
+            mFrames.setOnFrameAvailable(null, null);
+            return;
         }
-    }
-
-    /** Number of frames the player has drawn so far. */
-    public long getFrameCount() {
-        return nativeGetQueuedCount(mQueue);
-    }
-
-    /** Of those, the frames that were overtaken by a newer one before anybody took them. */
-    public long getDroppedFrameCount() {
-        return nativeGetDroppedCount(mQueue);
+        Looper looper = handler == null ? Looper.myLooper() : handler.getLooper();
+        if (looper == null) {
+            throw new IllegalArgumentException(
+                    "handler is null but the current thread is not a looper");
+        }
+        Handler notified = handler == null ? new Handler(looper) : handler;
+        mFrames.setOnFrameAvailable(() -> listener.onImageAvailable(this), notified::post);
     }
 
     /**
-     * Ends the reading: the surface is released, the player's frames go nowhere, waiting threads
-     * return, the listener is dropped. An image that is still open stays readable. May be called
-     * again.
+     * Ends the reading: the surface is released, the player's frames go nowhere, the listener is
+     * dropped, images that are open are closed. May be called again.
      */
     @Override
     public void close() {
-        mClosed = true;
-        setOnImageAvailableListener(null, null);
-        mSurface.release();
-        nativeAbandon(mQueue);
-    }
-
-    void release(int slot) {
-        nativeRelease(mQueue, slot);
-    }
-
-    // The buffer keeps the frame's memory, beyond the image and the reader.
-    private Image imageOf(long[] fields) {
-        long memory = fields[MEMORY];
-        ByteBuffer bytes = nativeWrapMemory(memory, fields[STRIDE] * fields[HEIGHT]);
-        CLEANER.register(bytes, () -> nativeReleaseMemory(memory));
-        ByteBuffer pixels = bytes.asReadOnlyBuffer().order(ByteOrder.LITTLE_ENDIAN);
-        return new Image(this, (int) fields[SLOT], (int) fields[WIDTH], (int) fields[HEIGHT],
-                (int) fields[STRIDE], fields[TIMESTAMP_US], pixels);
-    }
-
-    /** Waits for frames and notifies the listener. */
-    private final class FrameNotifier extends Thread {
-        private final OnImageAvailableListener mListener;
-        private final Executor mExecutor;
-        private long mSeen = nativeGetQueuedCount(mQueue);
-        volatile boolean mStopped;
-
-        FrameNotifier(OnImageAvailableListener listener, Executor executor) {
-            super("ImageReader");
-            setDaemon(true);
-            mListener = listener;
-            mExecutor = executor;
+        mFrames.close();
+        synchronized (mOpen) {
+            mClosed = true;
+            mOpen.forEach(ReaderImage::invalidate);
+            mOpen.clear();
+            mSpare.clear();
         }
+    }
 
-        @Override
-        public void run() {
-            while (!mStopped) {
-                long queued = nativeAwaitFrame(mQueue, mSeen, WAIT_SLICE_MS);
-                if (queued > mSeen) {
-                    mSeen = queued;
-                    mExecutor.execute(this::notifyListener);
-                }
-            }
-        }
-
-        private void notifyListener() {
-            if (!mStopped) {
-                mListener.onImageAvailable(ImageReader.this);
+    void takeBack(ReaderImage image) {
+        synchronized (mOpen) {
+            if (mOpen.remove(image)) {
+                mSpare.add(image.pixels());
             }
         }
     }
 
-    private static native long nativeCreate();
+    private Image open(VideoFrame frame) {
+        int width = frame.getWidth();
+        int height = frame.getHeight();
+        ByteBuffer pixels = pixelsOf(width * height * ReaderImage.BYTES_PER_PIXEL);
+        int[] row = new int[width];
+        IntBuffer source = frame.getPixels().asIntBuffer();
+        IntBuffer target = pixels.order(ByteOrder.LITTLE_ENDIAN).asIntBuffer();
+        for (int y = 0; y < height; y++) {
+            source.get(y * (frame.getRowStride() / ReaderImage.BYTES_PER_PIXEL), row);
+            turnRound(row);
+            target.put(row);
+        }
+        ReaderImage image = new ReaderImage(
+                this, width, height, frame.getTimestamp(), pixels.order(ByteOrder.nativeOrder()));
+        mOpen.add(image);
+        return image;
+    }
 
-    private static native void nativeDestroy(long queue);
+    // Spare ones are mostly of that size, as a reader's frames have one.
+    private ByteBuffer pixelsOf(int bytes) {
+        mSpare.removeIf(spare -> spare.capacity() != bytes);
+        ByteBuffer spare = mSpare.poll();
+        return spare == null ? ByteBuffer.allocateDirect(bytes) : spare.clear();
+    }
 
-    private static native ByteBuffer nativeWrapMemory(long memory, long bytes);
-
-    private static native void nativeReleaseMemory(long memory);
-
-    // Not static: a call in progress keeps this object, and with it the queue.
-    private native Surface nativeCreateSurface(long queue);
-
-    private native int nativeSetDefaultSize(long queue, int width, int height);
-
-    private native int nativeAcquire(long queue, long[] fields);
-
-    private native int nativeRelease(long queue, int slot);
-
-    private native long nativeAwaitFrame(long queue, long seen, int timeoutMs);
-
-    private native void nativeAbandon(long queue);
-
-    private native long nativeGetQueuedCount(long queue);
-
-    private native long nativeGetDroppedCount(long queue);
+    private static void turnRound(int[] pixels) {
+        for (int i = 0; i < pixels.length; i++) {
+            int pixel = pixels[i];
+            pixels[i] = OPAQUE | (pixel & BLUE) << 16 | pixel & GREEN | pixel >> 16 & BLUE;
+        }
+    }
 }

@@ -8,7 +8,7 @@ import java.util.Arrays;
 /**
  * A growing block of values in the format of native parcels: native byte order, every value padded
  * with zeros to a multiple of 4 bytes. One position serves reading and writing. A read past the end
- * yields 0 or null and leaves the position. Not thread-safe.
+ * yields 0 or null and leaves the position. Not thread-safe; nothing blocks.
  */
 public final class Parcel {
     private static final int INITIAL_CAPACITY = 64;
@@ -20,7 +20,11 @@ public final class Parcel {
 
     private Parcel() {}
 
-    /** An empty parcel. */
+    /**
+     * Makes a parcel.
+     *
+     * @return an empty one
+     */
     public static Parcel obtain() {
         return new Parcel();
     }
@@ -32,17 +36,29 @@ public final class Parcel {
         mPosition = 0;
     }
 
-    /** Bytes in the parcel. */
+    /**
+     * The size.
+     *
+     * @return bytes in the parcel
+     */
     public int dataSize() {
         return mSize;
     }
 
-    /** Bytes from the position to the end. */
+    /**
+     * What is left to read.
+     *
+     * @return bytes from the position to the end
+     */
     public int dataAvail() {
         return mSize - mPosition;
     }
 
-    /** Where the next value is read or written, in bytes. */
+    /**
+     * The position.
+     *
+     * @return where the next value is read or written, in bytes from the start
+     */
     public int dataPosition() {
         return mPosition;
     }
@@ -50,6 +66,7 @@ public final class Parcel {
     /**
      * Moves the position.
      *
+     * @param pos bytes from the start
      * @throws IllegalArgumentException for one outside 0 to {@link #dataSize()}
      */
     public void setDataPosition(int pos) {
@@ -62,6 +79,7 @@ public final class Parcel {
     /**
      * Cuts the parcel, or extends it with zeros; a position behind the new end moves there.
      *
+     * @param size bytes
      * @throws IllegalArgumentException for a negative size
      */
     public void setDataSize(int size) {
@@ -76,7 +94,11 @@ public final class Parcel {
         mPosition = Math.min(mPosition, size);
     }
 
-    /** A copy of the whole content. */
+    /**
+     * Copies the whole content.
+     *
+     * @return bytes for {@link #unmarshall}
+     */
     public byte[] marshall() {
         return Arrays.copyOf(mData.array(), mSize);
     }
@@ -84,6 +106,9 @@ public final class Parcel {
     /**
      * Replaces the whole content and puts the position at its start.
      *
+     * @param data holds the new content
+     * @param offset its first byte there
+     * @param length bytes
      * @throws IndexOutOfBoundsException for a range outside the array
      */
     public void unmarshall(byte[] data, int offset, int length) {
@@ -94,31 +119,51 @@ public final class Parcel {
         mPosition = 0;
     }
 
-    /** Writes 4 bytes. */
+    /**
+     * Writes 4 bytes.
+     *
+     * @param value any
+     */
     public void writeInt(int value) {
         int begin = advanceToWrite(Integer.BYTES);
         mData.putInt(begin, value);
     }
 
-    /** Writes 8 bytes. */
+    /**
+     * Writes 8 bytes.
+     *
+     * @param value any
+     */
     public void writeLong(long value) {
         int begin = advanceToWrite(Long.BYTES);
         mData.putLong(begin, value);
     }
 
-    /** Writes 4 bytes. */
+    /**
+     * Writes 4 bytes.
+     *
+     * @param value any
+     */
     public void writeFloat(float value) {
         int begin = advanceToWrite(Float.BYTES);
         mData.putFloat(begin, value);
     }
 
-    /** Writes 8 bytes. */
+    /**
+     * Writes 8 bytes.
+     *
+     * @param value any
+     */
     public void writeDouble(double value) {
         int begin = advanceToWrite(Double.BYTES);
         mData.putDouble(begin, value);
     }
 
-    /** Writes the length in UTF-16 units, the units and a zero unit; the length -1 for null. */
+    /**
+     * Writes the length in UTF-16 units, the units and a zero unit; the length -1 for null.
+     *
+     * @param text may be null
+     */
     public void writeString(String text) {
         if (text == null) {
             writeInt(NULL_LENGTH);
@@ -133,7 +178,11 @@ public final class Parcel {
         mData.putChar(begin + length * Character.BYTES, '\0');
     }
 
-    /** Writes the length in bytes and the bytes; the length -1 for null. */
+    /**
+     * Writes the length in bytes and the bytes; the length -1 for null.
+     *
+     * @param bytes may be null
+     */
     public void writeByteArray(byte[] bytes) {
         if (bytes == null) {
             writeInt(NULL_LENGTH);
@@ -144,27 +193,47 @@ public final class Parcel {
         System.arraycopy(bytes, 0, mData.array(), begin, bytes.length);
     }
 
-    /** Reads what {@link #writeInt} wrote. */
+    /**
+     * Reads what {@link #writeInt} wrote.
+     *
+     * @return 0 when fewer than 4 bytes are left
+     */
     public int readInt() {
         return has(Integer.BYTES) ? mData.getInt(advanceToRead(Integer.BYTES)) : 0;
     }
 
-    /** Reads what {@link #writeLong} wrote. */
+    /**
+     * Reads what {@link #writeLong} wrote.
+     *
+     * @return 0 when fewer than 8 bytes are left
+     */
     public long readLong() {
         return has(Long.BYTES) ? mData.getLong(advanceToRead(Long.BYTES)) : 0;
     }
 
-    /** Reads what {@link #writeFloat} wrote. */
+    /**
+     * Reads what {@link #writeFloat} wrote.
+     *
+     * @return 0 when fewer than 4 bytes are left
+     */
     public float readFloat() {
         return has(Float.BYTES) ? mData.getFloat(advanceToRead(Float.BYTES)) : 0;
     }
 
-    /** Reads what {@link #writeDouble} wrote. */
+    /**
+     * Reads what {@link #writeDouble} wrote.
+     *
+     * @return 0 when fewer than 8 bytes are left
+     */
     public double readDouble() {
         return has(Double.BYTES) ? mData.getDouble(advanceToRead(Double.BYTES)) : 0;
     }
 
-    /** Reads what {@link #writeString} wrote; null also for a broken length. */
+    /**
+     * Reads what {@link #writeString} wrote.
+     *
+     * @return null for a null that was written and for a broken length
+     */
     public String readString() {
         int start = mPosition;
         int length = readLength();
@@ -180,7 +249,11 @@ public final class Parcel {
         return new String(units);
     }
 
-    /** Reads what {@link #writeByteArray} wrote; null also for a broken length. */
+    /**
+     * Reads what {@link #writeByteArray} wrote.
+     *
+     * @return null for a null that was written and for a broken length
+     */
     public byte[] createByteArray() {
         int start = mPosition;
         int length = readLength();

@@ -4,8 +4,9 @@ package android.view;
 import java.lang.ref.Cleaner;
 
 /**
- * A place to draw video frames on, owned by the one that made it: usually an
- * {@link android.media.ImageReader}. All methods may be called from any thread and none blocks.
+ * A place to draw video frames on: that of an {@link android.media.ImageReader}, of a
+ * {@link SurfaceHolder} or of a {@link com.quintora.mmp.desktop.FrameReader}. All methods may be
+ * called from any thread and none blocks.
  */
 public class Surface {
     static {
@@ -19,9 +20,8 @@ public class Surface {
 
     private final Cleaner.Cleanable mCleanable;
 
-    /** Makes a surface without a consumer: a player refuses to draw on it. */
-    @SuppressWarnings("this-escape")
-    public Surface() {
+    // Without a consumer: a player refuses to draw on it.
+    Surface() {
         this(0);
     }
 
@@ -36,7 +36,11 @@ public class Surface {
         mCleanable = CLEANER.register(this, () -> nativeRelease(surface));
     }
 
-    /** Whether the surface can be given to a player: true until {@link #release()}. */
+    /**
+     * Whether the surface can be given to a player.
+     *
+     * @return true until {@link #release()}
+     */
     public synchronized boolean isValid() {
         return mNativeObject != 0;
     }

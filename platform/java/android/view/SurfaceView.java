@@ -1,8 +1,10 @@
 // SPDX-License-Identifier: Apache-2.0
 package android.view;
 
-import android.media.Image;
-import android.media.ImageReader;
+import android.graphics.PixelFormat;
+import com.quintora.mmp.desktop.FrameReader;
+import com.quintora.mmp.desktop.VideoFrame;
+import com.quintora.mmp.platform.internal.ViewDrawing;
 import java.awt.Canvas;
 import java.awt.Color;
 import java.awt.Dimension;
@@ -19,39 +21,47 @@ import java.util.concurrent.CopyOnWriteArrayList;
 
 /**
  * A part of a window that a player draws on: by the graphics processor where there is one, else by
- * software. It is a window of its own to the desktop, and covers what Swing paints.
+ * software.
  *
- * <p>For the window's thread, except where it says otherwise.
+ * <p>On a television this is one of the platform's views; here it is a heavyweight AWT component
+ * instead, for a program to add to a window as it adds any other. It is a window of its own to the
+ * desktop, and covers what Swing paints. Of the platform's methods it has {@link #getHolder()},
+ * whose {@link SurfaceHolder} is as on a television; the others are AWT's. The surface is there
+ * while the component is displayable. {@link com.quintora.mmp.desktop.DesktopSurfaceView} also says
+ * what draws.
+ *
+ * <p>For the thread of AWT's events.
+ *
+ * @serial exclude
  */
 @SuppressWarnings("serial") // Nobody serializes it.
 public class SurfaceView extends Canvas {
-    static {
-        System.loadLibrary("orv_platform");
-    }
+    private static final int FORMAT = PixelFormat.RGBX_8888;
 
-    /** As on a television: 32 bits a pixel, none of them transparent. */
-    private static final int FORMAT_RGBX = 2;
-
-    private final boolean mAcceptsSoftwareGl;
+    private final ViewDrawing mDrawing;
     private final Holder mHolder = new Holder();
-    private volatile ViewWindow mWindow;
-    private volatile ImageReader mReader;
-    private Surface mSurface;
+    private FrameReader mReader;
+    private volatile Surface mSurface;
     private BufferedImage mPicture;
     private long mPictureNs; // Its media time.
     private boolean mIsPictureNew;
-    private volatile boolean mHeld;
     private Dimension mPixels = new Dimension();
 
-    /** A view that leaves a graphics processor that is itself software alone. */
+    /** Makes a view that leaves a graphics processor alone which is itself software. */
     public SurfaceView() {
-        this(false);
+        this(new ViewDrawing(false));
     }
 
-    /** acceptsSoftwareGl: draw by OpenGL also where that is software. The desktop's alone. */
-    @SuppressWarnings("this-escape")
-    public SurfaceView(boolean acceptsSoftwareGl) {
-        mAcceptsSoftwareGl = acceptsSoftwareGl;
+    /**
+     * For the desktop's view, which shares what draws.
+     *
+     * @param drawing draws on this view alone
+     * @hidden
+     */
+    @SuppressWarnings({"exports", "this-escape"})
+    protected SurfaceView(ViewDrawing drawing) {
+        mDrawing = drawing;
+        mDrawing.setOnRelease(() -> EventQueue.invokeLater(this::showNewPicture));
         setBackground(Color.BLACK);
         addComponentListener(new ComponentAdapter() {
             @Override
@@ -61,53 +71,13 @@ public class SurfaceView extends Canvas {
         });
     }
 
+    /**
+     * What holds the surface.
+     *
+     * @return always the same one
+     */
     public SurfaceHolder getHolder() {
         return mHolder;
-    }
-
-    /** Whether the graphics processor draws now. Any thread. The desktop's alone. */
-    public boolean isDrawnByGpu() {
-        ViewWindow window = mWindow;
-        return window != null && window.isDrawnByGpu();
-    }
-
-    /**
-     * The name of the graphics processor, or why software draws; empty before a player has the
-     * surface. Any thread. The desktop's alone.
-     */
-    public String describeDrawing() {
-        ViewWindow window = mWindow;
-        return window == null ? "" : window.describeDrawing();
-    }
-
-    /**
-     * Waits for the next frame that is drawn, be it one from before drawn anew. For one thread,
-     * any. The desktop's alone.
-     *
-     * @return its media time in nanoseconds, or -1 when none came in time
-     */
-    public long awaitFrame(int timeoutMillis) throws InterruptedException {
-        ViewWindow window = mWindow;
-        if (window == null) {
-            Thread.sleep(timeoutMillis);
-            return -1;
-        }
-        return window.awaitFrame(timeoutMillis);
-    }
-
-    /**
-     * While it is held, the view keeps its picture whatever the player draws; afterwards it shows
-     * the newest. Any thread. The desktop's alone.
-     */
-    public void hold(boolean held) {
-        mHeld = held;
-        ViewWindow window = mWindow;
-        if (window != null) {
-            window.hold(held);
-        }
-        if (!held) {
-            EventQueue.invokeLater(this::showNewPicture);
-        }
     }
 
     @Override
@@ -115,15 +85,10 @@ public class SurfaceView extends Canvas {
         super.addNotify();
         // The window must be there for others, too.
         Toolkit.getDefaultToolkit().sync();
-        ImageReader reader = ImageReader.newInstance(0, 0);
-        reader.setOnImageAvailableListener(this::onImage, EventQueue::invokeLater);
+        FrameReader reader = new FrameReader();
+        reader.setOnFrameAvailable(() -> takePicture(reader), EventQueue::invokeLater);
         mReader = reader;
-        long id = ViewWindow.idOf(this);
-        mWindow = id == 0 ? null : new ViewWindow(id, mAcceptsSoftwareGl);
-        if (mWindow != null) {
-            mWindow.hold(mHeld);
-        }
-        mSurface = mWindow == null ? reader.getSurface() : mWindow.surface(reader.getSurface());
+        mSurface = mDrawing.open(this, reader.getSurface());
         mPixels = new Dimension();
         mHolder.callbacks().forEach(callback -> callback.surfaceCreated(mHolder));
         mHolder.change();
@@ -136,9 +101,7 @@ public class SurfaceView extends Canvas {
             mHolder.callbacks().forEach(callback -> callback.surfaceDestroyed(mHolder));
             mSurface.release();
             mSurface = null;
-            if (mWindow != null) {
-                mWindow.close();
-            }
+            mDrawing.close();
             mReader.close();
             mPicture = null;
             mIsPictureNew = false;
@@ -153,8 +116,8 @@ public class SurfaceView extends Canvas {
 
     @Override
     public void paint(Graphics graphics) {
-        if (isDrawnByGpu()) {
-            mWindow.redraw();
+        if (mDrawing.isByGpu()) {
+            mDrawing.redraw();
         } else if (mPicture != null) {
             graphics.drawImage(mPicture, 0, 0, getWidth(), getHeight(), null);
         } else {
@@ -163,14 +126,14 @@ public class SurfaceView extends Canvas {
     }
 
     // A picture that was drawn by software.
-    private void onImage(ImageReader reader) {
+    private void takePicture(FrameReader reader) {
         if (reader != mReader || mSurface == null) {
             return;
         }
-        try (Image image = reader.acquireLatestImage()) {
-            if (image != null) {
-                mPicture = copyOf(image);
-                mPictureNs = image.getTimestamp();
+        try (VideoFrame frame = reader.acquireLatestFrame()) {
+            if (frame != null) {
+                mPicture = copyOf(frame);
+                mPictureNs = frame.getTimestamp();
                 mIsPictureNew = true;
             }
         }
@@ -178,27 +141,25 @@ public class SurfaceView extends Canvas {
     }
 
     private void showNewPicture() {
-        if (mHeld || !mIsPictureNew || mSurface == null) {
+        if (mDrawing.isHeld() || !mIsPictureNew || mSurface == null) {
             return;
         }
         mIsPictureNew = false;
-        if (mWindow != null) {
-            mWindow.reportFrame(mPictureNs);
-        }
+        mDrawing.reportFrame(mPictureNs);
         Graphics graphics = getGraphics();
-        if (graphics != null && !isDrawnByGpu()) {
+        if (graphics != null && !mDrawing.isByGpu()) {
             paint(graphics);
             graphics.dispose();
         }
     }
 
-    private static BufferedImage copyOf(Image image) {
-        int width = image.getWidth();
-        int height = image.getHeight();
+    private static BufferedImage copyOf(VideoFrame frame) {
+        int width = frame.getWidth();
+        int height = frame.getHeight();
         var picture = new BufferedImage(width, height, BufferedImage.TYPE_INT_RGB);
         int[] target = ((DataBufferInt) picture.getRaster().getDataBuffer()).getData();
-        var source = image.getPlanes()[0].getBuffer().asIntBuffer();
-        int stride = image.getPlanes()[0].getRowStride() / 4;
+        var source = frame.getPixels().asIntBuffer();
+        int stride = frame.getRowStride() / 4;
         for (int y = 0; y < height; y++) {
             source.get(y * stride, target, y * width, width);
         }
@@ -225,7 +186,7 @@ public class SurfaceView extends Canvas {
             if (mSurface != null) {
                 callback.surfaceCreated(this);
                 if (mPixels.width > 0) {
-                    callback.surfaceChanged(this, FORMAT_RGBX, mPixels.width, mPixels.height);
+                    callback.surfaceChanged(this, FORMAT, mPixels.width, mPixels.height);
                 }
             }
         }
@@ -250,37 +211,11 @@ public class SurfaceView extends Canvas {
                 return;
             }
             mPixels = now;
-            mReader.setDefaultSize(now.width, now.height);
-            if (mWindow != null) {
-                mWindow.redraw();
-            }
+            mReader.setFrameSize(now.width, now.height);
+            mDrawing.redraw();
             for (Callback callback : mCallbacks) {
-                callback.surfaceChanged(this, FORMAT_RGBX, now.width, now.height);
+                callback.surfaceChanged(this, FORMAT, now.width, now.height);
             }
         }
     }
-
-    static native long nativeWindowOf(java.awt.Component component);
-
-    static native long nativeCreate(long id, boolean acceptsSoftwareGl);
-
-    static native void nativeDestroy(long window);
-
-    static native long nativeCreateProducer(long window, Surface buffers);
-
-    static native void nativeReleaseProducer(long producer);
-
-    static native void nativeRedraw(long window);
-
-    static native void nativeHold(long window, boolean held);
-
-    static native void nativeReportFrame(long window, long timeUs);
-
-    static native void nativeClose(long window);
-
-    static native boolean nativeIsDrawnByGpu(long window);
-
-    static native String nativeDescribeDrawing(long window);
-
-    static native void nativeAwaitFrame(long window, long seen, int timeoutMs, long[] frame);
 }

@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: Apache-2.0
 package com.quintora.mmp;
 
-import android.media.ImageReader;
+import com.quintora.mmp.desktop.FrameReader;
 import com.quintora.mmp.util.PcmMediaInfo;
 import java.nio.file.Path;
 import java.util.Arrays;
@@ -172,7 +172,7 @@ final class Workloads {
 
     /** With a film that is prepared and paused, and a surface for it. */
     private abstract static class FilmWorkload extends Workload {
-        private final ImageReader screen = ImageReader.newInstance(0, 0);
+        private final FrameReader screen = new FrameReader();
 
         FilmWorkload() throws Exception {
             player.setSurface(screen.getSurface());

@@ -26,6 +26,8 @@ class BitmapTest {
         int[] out = new int[6];
         bitmap.getPixels(out, 1, 3, 1, 0, 2, 2);
         assertArrayEquals(new int[] {0, 2, 3, 0, 5, 6 | 0xff000000}, out);
+        bitmap.getPixels(out, 3, -3, 0, 0, 3, 2);
+        assertArrayEquals(new int[] {4, 5, 0xff000006, 1, 2, 3}, out);
     }
 
     @Test

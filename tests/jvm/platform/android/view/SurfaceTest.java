@@ -5,14 +5,14 @@ import static org.junit.jupiter.api.Assertions.assertEquals;
 import static org.junit.jupiter.api.Assertions.assertFalse;
 import static org.junit.jupiter.api.Assertions.assertTrue;
 
-import android.media.ImageReader;
 import android.os.PlatformNatives;
+import com.quintora.mmp.desktop.FrameReader;
 import org.junit.jupiter.api.Test;
 
 class SurfaceTest {
     @Test
     void aReadersSurfaceHasAProducer() {
-        try (ImageReader reader = ImageReader.newInstance(0, 0)) {
+        try (FrameReader reader = new FrameReader()) {
             assertTrue(reader.getSurface().isValid());
             assertTrue(PlatformNatives.hasProducer(reader.getSurface()));
         }
@@ -54,7 +54,7 @@ class SurfaceTest {
 
     @Test
     void aPlayerKeepsDrawingWhenTheSurfaceIsReleased() {
-        try (ImageReader reader = ImageReader.newInstance(0, 0)) {
+        try (FrameReader reader = new FrameReader()) {
             long producer = PlatformNatives.holdProducer(reader.getSurface());
             reader.getSurface().release();
             assertEquals(0, PlatformNatives.draw(producer, 4, 4, 0, 0));

@@ -7,9 +7,10 @@ import static org.junit.jupiter.api.Assertions.assertThrows;
 import static org.junit.jupiter.api.Assertions.assertTrue;
 import static org.junit.jupiter.api.Assumptions.assumeFalse;
 
-import android.media.ImageReader;
 import android.os.Parcel;
 import android.view.Surface;
+import android.view.Surfaces;
+import com.quintora.mmp.desktop.FrameReader;
 import java.io.FileDescriptor;
 import java.io.FileInputStream;
 import java.io.IOException;
@@ -238,7 +239,7 @@ class BadInputTest extends PlayerFixture {
 
     @Test
     void aSurfaceThatWasReleased() throws Exception {
-        try (ImageReader reader = ImageReader.newInstance(0, 0)) {
+        try (FrameReader reader = new FrameReader()) {
             Surface surface = reader.getSurface();
             player.setSurface(surface);
             surface.release();
@@ -251,8 +252,9 @@ class BadInputTest extends PlayerFixture {
 
     @Test
     void aSurfaceWithoutAConsumer() {
+        Surface surface = Surfaces.withoutConsumer();
         IllegalArgumentException e = assertThrows(
-                IllegalArgumentException.class, () -> player.setSurface(new Surface()));
+                IllegalArgumentException.class, () -> player.setSurface(surface));
         assertEquals("The surface does not have a binding SurfaceTexture!", e.getMessage());
         player.setSurface(null);
     }

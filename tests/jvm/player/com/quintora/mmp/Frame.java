@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: Apache-2.0
 package com.quintora.mmp;
 
-import android.media.Image;
+import com.quintora.mmp.desktop.VideoFrame;
 import java.nio.ByteBuffer;
 import java.util.Arrays;
 import java.util.function.IntPredicate;
@@ -15,11 +15,11 @@ record Frame(int width, int height, int[] pixels) {
     /** A box around pixels; empty when its width is 0. */
     record Box(int left, int top, int width, int height) {}
 
-    static Frame of(Image image) {
-        int width = image.getWidth();
-        int height = image.getHeight();
-        int stride = image.getPlanes()[0].getRowStride();
-        ByteBuffer rows = image.getPlanes()[0].getBuffer();
+    static Frame of(VideoFrame frame) {
+        int width = frame.getWidth();
+        int height = frame.getHeight();
+        int stride = frame.getRowStride();
+        ByteBuffer rows = frame.getPixels();
         int[] pixels = new int[width * height];
         for (int y = 0; y < height; y++) {
             for (int x = 0; x < width; x++) {

@@ -3,14 +3,14 @@ package com.quintora.mmp;
 
 import static org.junit.jupiter.api.Assertions.fail;
 
-import android.media.Image;
-import android.media.ImageReader;
 import android.view.Surface;
+import com.quintora.mmp.desktop.FrameReader;
+import com.quintora.mmp.desktop.VideoFrame;
 import java.util.function.Predicate;
 
 /** What a player draws on. */
 final class Screen implements AutoCloseable {
-    private final ImageReader reader = ImageReader.newInstance(0, 0);
+    private final FrameReader reader = new FrameReader();
     private Frame last;
 
     Surface surface() {
@@ -24,8 +24,8 @@ final class Screen implements AutoCloseable {
             if (System.nanoTime() > end) {
                 fail("no frame showed " + what);
             }
-            try (Image image = reader.awaitImage(100)) {
-                last = image == null ? last : Frame.of(image);
+            try (VideoFrame frame = reader.awaitFrame(100)) {
+                last = frame == null ? last : Frame.of(frame);
             }
         }
         return last;
@@ -33,8 +33,8 @@ final class Screen implements AutoCloseable {
 
     /** Whether no frame has ever been shown. */
     boolean isBlank() {
-        try (Image image = reader.acquireLatestImage()) {
-            return last == null && image == null;
+        try (VideoFrame frame = reader.acquireLatestFrame()) {
+            return last == null && frame == null;
         }
     }
 

@@ -1,31 +1,31 @@
 // SPDX-License-Identifier: Apache-2.0
 package com.quintora.orv.player;
 
-import android.media.Image;
-import android.media.ImageReader;
-import android.view.SurfaceView;
+import com.quintora.mmp.desktop.DesktopSurfaceView;
+import com.quintora.mmp.desktop.FrameReader;
+import com.quintora.mmp.desktop.VideoFrame;
 import java.util.function.Consumer;
 
 /** Takes the frames that the player draws, on a thread of its own, and counts them. */
 final class FramePump implements AutoCloseable {
     private static final int WAIT_MS = 100;
 
-    private final ImageReader reader = ImageReader.newInstance(0, 0);
+    private final FrameReader reader = new FrameReader();
     private final Thread thread = new Thread(this::run, "frames");
-    private final Consumer<Image> screen;
+    private final Consumer<VideoFrame> screen;
 
     private final FrameCount count = new FrameCount();
     private boolean hidden; // Under the lock of this object.
-    private volatile SurfaceView view; // That is drawn on in place of the reader's surface.
+    private volatile DesktopSurfaceView view; // That is drawn on in place of the reader's surface.
     private volatile boolean closed;
 
     /** The screen is called with each frame on the pump's thread, and must not keep it. */
-    FramePump(Consumer<Image> screen) {
+    FramePump(Consumer<VideoFrame> screen) {
         this.screen = screen;
         thread.setDaemon(true);
     }
 
-    ImageReader reader() {
+    FrameReader reader() {
         return reader;
     }
 
@@ -34,7 +34,7 @@ final class FramePump implements AutoCloseable {
     }
 
     /** Also counts, and hides, the frames that are drawn on that view. */
-    void watch(SurfaceView watched) {
+    void watch(DesktopSurfaceView watched) {
         view = watched;
         Thread watcher = new Thread(() -> countFramesOf(watched), "window frames");
         watcher.setDaemon(true);
@@ -66,15 +66,15 @@ final class FramePump implements AutoCloseable {
     }
 
     private void takeFrame() throws InterruptedException {
-        try (Image image = reader.awaitImage(WAIT_MS)) {
-            if (image != null && !isOvertaken()) {
-                count.add(image.getTimestamp());
-                screen.accept(image);
+        try (VideoFrame frame = reader.awaitFrame(WAIT_MS)) {
+            if (frame != null && !isOvertaken()) {
+                count.add(frame.getTimestamp());
+                screen.accept(frame);
             }
         }
     }
 
-    private void countFramesOf(SurfaceView view) {
+    private void countFramesOf(DesktopSurfaceView view) {
         try {
             while (!closed) {
                 long timeNs = view.awaitFrame(WAIT_MS);

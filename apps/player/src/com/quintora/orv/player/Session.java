@@ -1,9 +1,7 @@
 // SPDX-License-Identifier: Apache-2.0
 package com.quintora.orv.player;
 
-import android.media.Image;
 import android.view.Surface;
-import android.view.SurfaceView;
 import com.quintora.mmp.ChannelStreamSource;
 import com.quintora.mmp.MediaException;
 import com.quintora.mmp.MediaPlayer;
@@ -12,6 +10,8 @@ import com.quintora.mmp.PlayerListener;
 import com.quintora.mmp.PlayerRole;
 import com.quintora.mmp.Track;
 import com.quintora.mmp.VideoTrack;
+import com.quintora.mmp.desktop.DesktopSurfaceView;
+import com.quintora.mmp.desktop.VideoFrame;
 import java.io.IOException;
 import java.nio.file.AccessDeniedException;
 import java.nio.file.Files;
@@ -38,7 +38,7 @@ public final class Session implements AutoCloseable {
     private volatile Failure failure;
 
     /** The screen is called with each frame, on a thread of its own, and must not keep it. */
-    public Session(PlayOptions options, Consumer<Image> screen) {
+    public Session(PlayOptions options, Consumer<VideoFrame> screen) {
         this.options = options;
         frames = new FramePump(screen);
         playhead = new Playhead(player, frames);
@@ -51,7 +51,7 @@ public final class Session implements AutoCloseable {
 
     /** Asks for frames of that size from now on; 0 x 0 for the video's own. */
     public void requestFrameSize(int width, int height) {
-        frames.reader().setDefaultSize(width, height);
+        frames.reader().setFrameSize(width, height);
     }
 
     /** Whether anybody sees the frames: otherwise none is drawn, and afterwards the newest is. */
@@ -66,7 +66,7 @@ public final class Session implements AutoCloseable {
      *
      * @return false when it does not: frames go to the screen
      */
-    public boolean drawOn(SurfaceView view) {
+    public boolean drawOn(DesktopSurfaceView view) {
         player.setSurface(view.getHolder().getSurface());
         isOnView = view.isDrawnByGpu();
         if (isOnView) {
@@ -78,7 +78,7 @@ public final class Session implements AutoCloseable {
     }
 
     /** Goes on with the surface that such a view has now; without one, the picture waits. */
-    public void drawOnNewSurfaceOf(SurfaceView view) {
+    public void drawOnNewSurfaceOf(DesktopSurfaceView view) {
         Surface surface = view.getHolder().getSurface();
         if (surface != null && surface.isValid()) {
             player.setSurface(surface);

@@ -3,7 +3,7 @@ package com.quintora.orv.player;
 
 import static org.junit.jupiter.api.Assertions.assertEquals;
 
-import android.view.SurfaceView;
+import com.quintora.mmp.desktop.DesktopSurfaceView;
 import java.util.ArrayList;
 import java.util.List;
 import org.junit.jupiter.api.Test;
@@ -24,7 +24,7 @@ class HeldViewWindowTest {
     }
 
     @SuppressWarnings("serial") // Nobody serializes it.
-    private final class RecordedView extends SurfaceView {
+    private final class RecordedView extends DesktopSurfaceView {
         @Override
         public void hold(boolean held) {
             holds.add(held);

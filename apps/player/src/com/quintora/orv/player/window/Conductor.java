@@ -1,13 +1,13 @@
 // SPDX-License-Identifier: Apache-2.0
 package com.quintora.orv.player.window;
 
-import android.view.SurfaceView;
 import com.quintora.mmp.MediaException;
 import com.quintora.mmp.MediaPlayer;
 import com.quintora.mmp.OrvMediaPlayer;
 import com.quintora.mmp.PlaybackInfo;
 import com.quintora.mmp.PlayerListener;
 import com.quintora.mmp.PlayerState;
+import com.quintora.mmp.desktop.DesktopSurfaceView;
 import com.quintora.orv.player.Failure;
 import com.quintora.orv.player.PlayOptions;
 import com.quintora.orv.player.Session;
@@ -77,7 +77,7 @@ final class Conductor implements Controls {
         }
     }
 
-    private void tryGpu(SurfaceView view) {
+    private void tryGpu(DesktopSurfaceView view) {
         boolean draws = session.drawOn(view);
         EventQueue.invokeLater(
                 () -> {

@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: Apache-2.0
 package com.quintora.orv.player.window;
 
-import android.view.SurfaceView;
+import com.quintora.mmp.desktop.DesktopSurfaceView;
 import com.quintora.orv.player.GpuUse;
 import java.io.IOException;
 import java.nio.file.DirectoryStream;
@@ -16,7 +16,7 @@ final class PictureWay {
 
     private final GpuUse use;
     private final boolean isTried;
-    private volatile SurfaceView view;
+    private volatile DesktopSurfaceView view;
 
     PictureWay(GpuUse use) {
         this.use = use;
@@ -29,8 +29,8 @@ final class PictureWay {
     }
 
     /** A view for it to be tried on. */
-    SurfaceView makeView() {
-        view = new SurfaceView(use == GpuUse.ALWAYS);
+    DesktopSurfaceView makeView() {
+        view = new DesktopSurfaceView(use == GpuUse.ALWAYS);
         return view;
     }
 

@@ -1,8 +1,8 @@
 // SPDX-License-Identifier: Apache-2.0
 package com.quintora.orv.player.window;
 
-import android.media.Image;
-import android.view.SurfaceView;
+import com.quintora.mmp.desktop.DesktopSurfaceView;
+import com.quintora.mmp.desktop.VideoFrame;
 import com.quintora.orv.player.Snapshot;
 import java.awt.Color;
 import java.awt.Component;
@@ -56,8 +56,8 @@ final class Stage {
     private int seekingLooks;
     private Runnable onClosed;
     private final PictureWay way;
-    private final CompletableFuture<Optional<SurfaceView>> view = new CompletableFuture<>();
-    private SurfaceView surface; // Once the graphics processor draws on it.
+    private final CompletableFuture<Optional<DesktopSurfaceView>> view = new CompletableFuture<>();
+    private DesktopSurfaceView surface; // Once the graphics processor draws on it.
     private String shown = VIDEO;
 
     /** The name stands in the title bar. */
@@ -111,11 +111,11 @@ final class Stage {
     }
 
     /** A view with a surface, out of sight, for the graphics processor to be tried on. */
-    private Optional<SurfaceView> addView() {
+    private Optional<DesktopSurfaceView> addView() {
         if (!way.isTried()) {
             return Optional.empty();
         }
-        SurfaceView made = way.makeView();
+        DesktopSurfaceView made = way.makeView();
         made.setFocusable(false);
         room.add(made, SURFACE);
         frame.validate();
@@ -123,7 +123,7 @@ final class Stage {
     }
 
     /** Waits for the window, if that is to have a view. Not for the window's thread. */
-    Optional<SurfaceView> awaitView() throws InterruptedException {
+    Optional<DesktopSurfaceView> awaitView() throws InterruptedException {
         try {
             return way.isTried() ? view.get() : Optional.empty();
         } catch (ExecutionException e) {
@@ -132,7 +132,7 @@ final class Stage {
     }
 
     /** The graphics processor draws on the view, whose window covers what is painted. */
-    void drawOn(SurfaceView drawn, Runnable onNewSurface) {
+    void drawOn(DesktopSurfaceView drawn, Runnable onNewSurface) {
         surface = drawn;
         JPopupMenu.setDefaultLightWeightPopupEnabled(false);
         ToolTipManager.sharedInstance().setLightWeightPopupEnabled(false);
@@ -155,7 +155,7 @@ final class Stage {
     }
 
     /** Nothing is drawn on the view that was tried. */
-    void dropView(SurfaceView unused) {
+    void dropView(DesktopSurfaceView unused) {
         room.remove(unused);
     }
 
@@ -171,9 +171,8 @@ final class Stage {
     }
 
     /** Called with each frame, on the frames' thread. */
-    void draw(Image image) {
-        Image.Plane plane = image.getPlanes()[0];
-        video.draw(plane.getBuffer(), image.getWidth(), image.getHeight(), plane.getRowStride());
+    void draw(VideoFrame frame) {
+        video.draw(frame.getPixels(), frame.getWidth(), frame.getHeight(), frame.getRowStride());
     }
 
     private void showOpening() {

@@ -6,10 +6,10 @@ import static org.junit.jupiter.api.Assertions.assertNull;
 import static org.junit.jupiter.api.Assertions.assertTrue;
 
 import android.view.SurfaceHolder;
-import android.view.SurfaceView;
 import com.quintora.mmp.Media;
 import com.quintora.mmp.OrvMediaPlayer;
 import com.quintora.mmp.Wait;
+import com.quintora.mmp.desktop.DesktopSurfaceView;
 import java.awt.Color;
 import java.awt.Dimension;
 import java.awt.EventQueue;
@@ -30,7 +30,7 @@ class SurfaceViewWindowTest {
     private final List<String> calls = new ArrayList<>();
     private final OrvMediaPlayer player = new OrvMediaPlayer();
     private Frame frame;
-    private SurfaceView view;
+    private DesktopSurfaceView view;
     private volatile boolean keepsSurface;
 
     @AfterEach
@@ -42,7 +42,7 @@ class SurfaceViewWindowTest {
     private void open(boolean byGpu) throws Exception {
         EventQueue.invokeAndWait(
                 () -> {
-                    view = new SurfaceView(byGpu);
+                    view = new DesktopSurfaceView(byGpu);
                     view.getHolder().addCallback(new Calls());
                     frame = new Frame();
                     frame.setUndecorated(true);

@@ -4,6 +4,7 @@
 #include <new>
 
 #include "BufferQueue.h"
+#include "JavaSurface.h"
 #include "NativeHandle.h"
 
 using namespace android;
@@ -13,7 +14,7 @@ namespace {
 // The reference id of the Java objects' references; any fixed address does.
 const int kJavaReference = 0;
 
-// The layout of the long[] that nativeAcquire fills, as ImageReader reads it.
+// The layout of the long[] that nativeAcquire fills, as FrameReader reads it.
 enum FrameField { SLOT, WIDTH, HEIGHT, STRIDE, TIMESTAMP_US, MEMORY, FIELD_COUNT };
 
 BufferQueue* queueOf(jlong handle) { return fromHandle<BufferQueue>(handle); }
@@ -21,7 +22,7 @@ BufferQueue* queueOf(jlong handle) { return fromHandle<BufferQueue>(handle); }
 }  // namespace
 
 #define READER_METHOD(type, name) \
-    extern "C" JNIEXPORT type JNICALL Java_android_media_ImageReader_##name
+    extern "C" JNIEXPORT type JNICALL Java_com_quintora_mmp_desktop_FrameReader_##name
 
 READER_METHOD(jlong, nativeCreate)(JNIEnv*, jclass) {
     BufferQueue* const queue = new (std::nothrow) BufferQueue;
@@ -33,17 +34,11 @@ READER_METHOD(void, nativeDestroy)(JNIEnv*, jclass, jlong queue) {
     queueOf(queue)->decStrong(&kJavaReference);
 }
 
-// Through the surface's private constructor, which takes a producer: the base
-// class has another address than the queue.
 READER_METHOD(jobject, nativeCreateSurface)(JNIEnv* env, jobject, jlong queue) {
-    jclass const clazz = env->FindClass("android/view/Surface");
-    if (clazz == nullptr) return nullptr;
-    jmethodID const constructor = env->GetMethodID(clazz, "<init>", "(J)V");
-    if (constructor == nullptr) return nullptr;
-    return env->NewObject(clazz, constructor, toHandle<IGraphicBufferProducer>(queueOf(queue)));
+    return newJavaSurface(env, queueOf(queue));
 }
 
-READER_METHOD(jint, nativeSetDefaultSize)(JNIEnv*, jobject, jlong queue, jint width, jint height) {
+READER_METHOD(jint, nativeSetFrameSize)(JNIEnv*, jobject, jlong queue, jint width, jint height) {
     return queueOf(queue)->setDefaultSize(width, height);
 }
 
