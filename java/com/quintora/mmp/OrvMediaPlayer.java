@@ -8,6 +8,7 @@ import com.quintora.SubtitleAttr;
 import com.quintora.mmp.internal.PlayerUnits;
 import com.quintora.mmp.internal.media.EngineDivxNavigation;
 import com.quintora.mmp.internal.media.FourCharacters;
+import com.quintora.mmp.internal.natives.NativeLibrary;
 import com.quintora.mmp.util.DivxLastMemoryFilePosition;
 import com.quintora.mmp.util.PcmMediaInfo;
 import com.quintora.mmp.util.ThumbnailInfo;

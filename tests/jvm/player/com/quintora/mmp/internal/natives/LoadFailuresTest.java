@@ -1,0 +1,54 @@
+// SPDX-License-Identifier: Apache-2.0
+package com.quintora.mmp.internal.natives;
+
+import static org.junit.jupiter.api.Assertions.assertEquals;
+import static org.junit.jupiter.api.Assertions.assertSame;
+import static org.junit.jupiter.api.Assertions.assertTrue;
+
+import org.junit.jupiter.api.Test;
+
+class LoadFailuresTest {
+    private static String refused(String message) {
+        return LoadFailures.refused("/x/lib.so", new UnsatisfiedLinkError(message)).getMessage();
+    }
+
+    @Test
+    void aMissingSystemLibraryIsNamedWithItsPackage() {
+        String message = "/x/liborvtarn.so: libmpv.so.2: cannot open shared object file: No such"
+                + " file or directory";
+        String refused = refused(message);
+        assertTrue(refused.startsWith(
+                "The native library /x/lib.so did not load: " + message + "."), refused);
+        assertTrue(refused.contains("The system library libmpv.so.2 is missing; in Debian it is of"
+                + " the package libmpv2."), refused);
+    }
+
+    @Test
+    void debiansRuleGivesThePackages() {
+        assertEquals("libavcodec59", DebianPackages.of("libavcodec.so.59"));
+        assertEquals("libstdc++6", DebianPackages.of("libstdc++.so.6"));
+        assertEquals("libgcc-s1", DebianPackages.of("libgcc_s.so.1"));
+        assertEquals("libx264-164", DebianPackages.of("libx264.so.164"));
+        assertEquals("libcurl3-gnutls", DebianPackages.of("libcurl-gnutls.so.4"));
+        assertEquals("android-libutils", DebianPackages.of("libutils.so.0"));
+        assertEquals("p7zip-full", DebianPackages.of("7z.so"));
+        assertEquals("strange", DebianPackages.of("strange"));
+    }
+
+    @Test
+    void otherReasonsHaveTheirAdvice() {
+        assertTrue(refused("/x/lib.so: failed to map segment from shared object: Operation not"
+                + " permitted").contains("-Dcom.quintora.mmp.cache=FOLDER"));
+        assertTrue(refused("/lib/libc.so.6: version `GLIBC_2.38' not found (required by"
+                + " /x/lib.so)").contains("built on a newer system"));
+        assertTrue(refused("Native Library /x/lib.so already loaded in another classloader")
+                .contains("one class loader"));
+        assertEquals("The native library /x/lib.so did not load: strange.", refused("strange"));
+    }
+
+    @Test
+    void theMachinesOwnErrorIsTheCause() {
+        UnsatisfiedLinkError cause = new UnsatisfiedLinkError("strange");
+        assertSame(cause, LoadFailures.refused("/x/lib.so", cause).getCause());
+    }
+}
