@@ -1,6 +1,7 @@
 // SPDX-License-Identifier: Apache-2.0
 package android.view;
 
+import com.quintora.mmp.platform.internal.PlatformLibrary;
 import java.lang.ref.Cleaner;
 
 /**
@@ -10,7 +11,7 @@ import java.lang.ref.Cleaner;
  */
 public class Surface {
     static {
-        System.loadLibrary("orv_platform");
+        PlatformLibrary.load();
     }
 
     private static final Cleaner CLEANER = Cleaner.create();

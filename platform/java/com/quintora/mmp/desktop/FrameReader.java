@@ -2,6 +2,7 @@
 package com.quintora.mmp.desktop;
 
 import android.view.Surface;
+import com.quintora.mmp.platform.internal.PlatformLibrary;
 import java.lang.ref.Cleaner;
 import java.nio.ByteBuffer;
 import java.nio.ByteOrder;
@@ -18,7 +19,7 @@ import java.util.concurrent.Executor;
  */
 public final class FrameReader implements AutoCloseable {
     static {
-        System.loadLibrary("orv_platform");
+        PlatformLibrary.load();
     }
 
     private static final Cleaner CLEANER = Cleaner.create();

@@ -9,7 +9,7 @@ import java.lang.ref.Reference;
 /** The native half of a view's window. Thread-safe. */
 final class ViewWindow {
     static {
-        System.loadLibrary("orv_platform");
+        PlatformLibrary.load();
     }
 
     private static final Cleaner CLEANER = Cleaner.create();

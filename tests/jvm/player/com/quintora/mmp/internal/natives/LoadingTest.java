@@ -1,7 +1,6 @@
 // SPDX-License-Identifier: Apache-2.0
 package com.quintora.mmp.internal.natives;
 
-import static org.junit.jupiter.api.Assertions.assertArrayEquals;
 import static org.junit.jupiter.api.Assertions.assertEquals;
 import static org.junit.jupiter.api.Assertions.assertNotNull;
 import static org.junit.jupiter.api.Assertions.assertTrue;
@@ -85,16 +84,32 @@ class LoadingTest {
         }
     }
 
-    @Test
-    void thePlayerComesOutOfTheNativeJar() throws Exception {
+    /** Loads in a new process, out of a native JAR; gives the file that was loaded. */
+    private String loadFromJar(String what) throws Exception {
         Path jar = Bundles.jar(
                 folder.resolve("native.jar"), HERE, JavaVersion.read(), builtLibraries());
-        BufferedReader out = start(jar, folder, "load");
+        BufferedReader out = start(jar, folder, what);
         release();
-        assertEquals("loaded", result(out));
+        return result(out);
+    }
+
+    /** The place in the cache of that library out of the JAR. */
+    private String unpacked(String name) throws IOException {
+        NativeBundle bundle = Bundles.bundle(JavaVersion.read(), builtLibraries());
+        return "loaded [" + cache().resolve(bundle.identity()).resolve(name) + "]";
+    }
+
+    @Test
+    void thePlayerComesOutOfTheNativeJar() throws Exception {
+        assertEquals(unpacked("libmediaplayer_orv.so"), loadFromJar("load"));
         try (Stream<Path> unpacked = Files.walk(cache())) {
             assertEquals(3, unpacked.filter(Files::isRegularFile).count());
         }
+    }
+
+    @Test
+    void theDesktopsClassesComeOutOfTheNativeJarThoughUsedFirst() throws Exception {
+        assertEquals(unpacked("liborv_platform.so"), loadFromJar("surface"));
     }
 
     @Test
@@ -104,7 +119,7 @@ class LoadingTest {
         Path libraries = Path.of(System.getProperty("java.library.path"));
         BufferedReader out = start(jar, libraries, "load");
         release();
-        assertEquals("loaded", result(out));
+        assertEquals("loaded [" + libraries.resolve("libmediaplayer_orv.so") + "]", result(out));
         assertTrue(Files.notExists(cache()));
     }
 
@@ -139,9 +154,7 @@ class LoadingTest {
         }
         release();
         for (BufferedReader out : outs) {
-            Path unpacked = Path.of(result(out));
-            assertTrue(unpacked.startsWith(cache()), unpacked::toString);
-            assertArrayEquals(files.get("liblarge.so"), Files.readAllBytes(unpacked));
+            assertEquals(Digests.crc32(files.get("liblarge.so")), result(out));
         }
         try (Stream<Path> left = Files.walk(cache())) {
             assertEquals(3, left.filter(Files::isRegularFile).count());
