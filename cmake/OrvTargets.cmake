@@ -1,6 +1,5 @@
 # SPDX-License-Identifier: Apache-2.0
-# What every native target of this project is compiled with, and the platform
-# libraries that Debian packages.
+# What every native target of this project is compiled with.
 
 set(CMAKE_CXX_STANDARD 17)
 set(CMAKE_CXX_STANDARD_REQUIRED ON)
@@ -25,15 +24,6 @@ if(CMAKE_COMPILE_WARNING_AS_ERROR)
   list(APPEND ORV_JAVA_FLAGS -Werror)
 endif()
 
-# Debian's Android libraries: utils, log and nativehelper. Their headers warn,
-# so they are system headers; jni.h stands in a folder of its own.
-find_path(ANDROID_INCLUDE_DIR utils/RefBase.h PATH_SUFFIXES android REQUIRED)
-find_library(ANDROID_UTILS_LIBRARY utils PATH_SUFFIXES android ${CMAKE_LIBRARY_ARCHITECTURE}/android REQUIRED)
-get_filename_component(ANDROID_LIBRARY_DIR ${ANDROID_UTILS_LIBRARY} DIRECTORY)
-add_library(android_packages INTERFACE)
-target_include_directories(android_packages SYSTEM INTERFACE
-  ${ANDROID_INCLUDE_DIR} ${ANDROID_INCLUDE_DIR}/nativehelper)
-target_link_directories(android_packages INTERFACE ${ANDROID_LIBRARY_DIR})
-target_link_libraries(android_packages INTERFACE utils log nativehelper)
+include(AndroidPackages)
 set(CMAKE_BUILD_RPATH ${ANDROID_LIBRARY_DIR})
 find_package(Threads REQUIRED)
