@@ -4,10 +4,12 @@
 # dev, doc.
 include(GNUInstallDirs)
 include(CMakePackageConfigHelpers)
+include(OrvManuals)
 
 set(ORV_INSTALL_LIBDIR ${CMAKE_INSTALL_LIBDIR} CACHE STRING
   "Where the libraries go, below the prefix")
 option(ORV_BUNDLE_JARS "Install copies of the player's picocli and gson, not links to the system's" ON)
+option(ORV_RELOCATABLE "pkg-config's files find the prefix from their own place" ON)
 set(ORV_JAVADIR ${CMAKE_INSTALL_DATADIR}/java)
 set(ORV_PLAYERDIR ${CMAKE_INSTALL_DATADIR}/orv-player)
 set(ORV_HEADERDIR ${CMAKE_INSTALL_INCLUDEDIR}/mediaplayer_orv)
@@ -83,8 +85,18 @@ function(orv_install_player target)
   set(version "${PROJECT_VERSION}")
   file(RELATIVE_PATH player /prefix/${CMAKE_INSTALL_BINDIR} /prefix/${ORV_PLAYERDIR})
   file(RELATIVE_PATH libraries /prefix/${CMAKE_INSTALL_BINDIR} /prefix/${ORV_INSTALL_LIBDIR})
-  configure_file(${PROJECT_SOURCE_DIR}/cmake/orv.in ${PROJECT_BINARY_DIR}/install/orv @ONLY)
+  configure_file(${PROJECT_SOURCE_DIR}/cmake/orv.in ${PROJECT_BINARY_DIR}/install/orv @ONLY
+    FILE_PERMISSIONS OWNER_READ OWNER_WRITE OWNER_EXECUTE)
   install(PROGRAMS ${PROJECT_BINARY_DIR}/install/orv DESTINATION ${CMAKE_INSTALL_BINDIR} COMPONENT player)
+
+  set(desktop ${PROJECT_SOURCE_DIR}/cmake/desktop/com.quintora.orv.player)
+  install(FILES ${desktop}.desktop DESTINATION ${CMAKE_INSTALL_DATADIR}/applications COMPONENT player)
+  install(FILES ${desktop}.svg DESTINATION ${CMAKE_INSTALL_DATADIR}/icons/hicolor/scalable/apps
+    COMPONENT player)
+  install(FILES ${desktop}.metainfo.xml DESTINATION ${CMAKE_INSTALL_DATADIR}/metainfo COMPONENT player)
+  if(ORV_MANUALS)
+    orv_install_manuals(${target})
+  endif()
 endfunction()
 
 # For who builds against what was installed: a CMake package, and pkg-config's files,
@@ -112,7 +124,11 @@ endfunction()
 # orv_install_pkgconfig(NAME DESCRIPTION REQUIRES LIBRARY)
 function(orv_install_pkgconfig name description requires library)
   file(RELATIVE_PATH prefix /prefix/${ORV_PKGCONFIGDIR} /prefix)
-  string(REGEX REPLACE "/$" "" prefix ${prefix})
+  string(REGEX REPLACE "/$" "" prefix "\${pcfiledir}/${prefix}")
+  # Then no program's run-time path goes by way of a folder that developers alone have.
+  if(NOT ORV_RELOCATABLE)
+    set(prefix ${CMAKE_INSTALL_PREFIX})
+  endif()
   set(libraries -l${library})
   set(android_flags)
   set(android_libraries)

@@ -17,7 +17,7 @@ check_machine() {
 
 check_packages() {
     local list missing status=0
-    for list in play test armhf inspect tree corpus bench; do
+    for list in play test armhf inspect tree corpus bench deb; do
         missing=$(missing_packages "$list" | awk '{print $1}' | paste -sd' ')
         if [ -z "$missing" ]; then
             row packages ok "all of tools/packages-$list.txt are installed"
