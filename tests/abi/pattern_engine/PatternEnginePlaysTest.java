@@ -7,10 +7,10 @@ import static org.junit.jupiter.api.Assertions.assertThrows;
 import static org.junit.jupiter.api.Assertions.assertTrue;
 import static org.junit.jupiter.api.Assertions.fail;
 
-import android.media.Image;
-import android.media.ImageReader;
 import com.quintora.mmp.MediaException;
 import com.quintora.mmp.OrvMediaPlayer;
+import com.quintora.mmp.desktop.FrameReader;
+import com.quintora.mmp.desktop.VideoFrame;
 import java.nio.ByteBuffer;
 import java.util.function.BooleanSupplier;
 import org.junit.jupiter.api.AfterEach;
@@ -22,7 +22,7 @@ class PatternEnginePlaysTest {
     private static final int LIMIT_MS = 20_000;
     private static final long FRAME_NS = 40_000_000;
 
-    private final ImageReader reader = ImageReader.newInstance(0, 0);
+    private final FrameReader reader = new FrameReader();
     private final OrvMediaPlayer player = new OrvMediaPlayer();
 
     private record Frame(long timeNs, int width, int height, int hash) {}
@@ -31,12 +31,12 @@ class PatternEnginePlaysTest {
     void open() throws Exception {
         player.setDataSource("pattern://60");
         player.setSurface(reader.getSurface());
-        player.prepare();
+        player.prepareAndWait();
     }
 
     @AfterEach
     void close() {
-        player.release();
+        player.close();
         reader.close();
     }
 
@@ -68,7 +68,7 @@ class PatternEnginePlaysTest {
         int stands = player.getCurrentPosition();
         try (OrvMediaPlayer other = new OrvMediaPlayer()) {
             other.setDataSource("pattern://60");
-            other.prepare();
+            other.prepareAndWait();
             other.start();
             await("another player moved", () -> other.getCurrentPosition() > 200);
         }
@@ -79,16 +79,16 @@ class PatternEnginePlaysTest {
     @Test
     void seeksToAFrameThatIsShownWhenTheCallReturns() throws Exception {
         frame();
-        player.seekTo(30_010);
+        player.seekToAndWait(30_010);
         assertEquals(30_000, player.getCurrentPosition());
         assertEquals(750 * FRAME_NS, frame().timeNs());
-        player.trickPlay().step(-1);
+        player.trickPlay().stepAndWait(-1);
         assertEquals(749 * FRAME_NS, frame().timeNs());
     }
 
     @Test
     void completesAtItsEndAndPlaysAgain() throws Exception {
-        player.seekTo(59_800);
+        player.seekToAndWait(59_800);
         player.start();
         await("the media ended", () -> player.getState().name().equals("COMPLETED"));
         assertEquals(60_000, player.getCurrentPosition());
@@ -100,7 +100,7 @@ class PatternEnginePlaysTest {
     @Test
     void beginsAgainWhileLooping() throws Exception {
         player.setLooping(true);
-        player.seekTo(59_800);
+        player.seekToAndWait(59_800);
         player.start();
         await("it began again", () -> player.getCurrentPosition() < 30_000);
         assertTrue(player.isPlaying());
@@ -108,19 +108,19 @@ class PatternEnginePlaysTest {
 
     @Test
     void resetsToOtherMediaAndRefusesWhatItDoesNotKnow() throws Exception {
-        player.reset();
+        player.resetAndWait();
         assertThrows(MediaException.class, () -> player.setDataSource("http://localhost/film"));
         player.setDataSource("pattern://2");
-        player.prepare();
+        player.prepareAndWait();
         assertEquals(2_000, player.getDuration());
     }
 
     private Frame frame() throws InterruptedException {
-        try (Image image = reader.awaitImage(LIMIT_MS)) {
+        try (VideoFrame image = reader.awaitFrame(LIMIT_MS)) {
             if (image == null) {
                 return fail("no frame came");
             }
-            ByteBuffer pixels = image.getPlanes()[0].getBuffer();
+            ByteBuffer pixels = image.getPixels();
             return new Frame(image.getTimestamp(), image.getWidth(), image.getHeight(),
                     pixels.hashCode());
         }

@@ -32,6 +32,9 @@ public class PcmMediaInfo {
     /** The samples; never null in a description that is given to a player. */
     public AudioPcmInfo audioPcmInfo = new AudioPcmInfo();
 
+    /** A description of samples that are not described yet. */
+    public PcmMediaInfo() {}
+
     /**
      * Signed whole-number samples, or unsigned ones when they have 8 bits.
      *

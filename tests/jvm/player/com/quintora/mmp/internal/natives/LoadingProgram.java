@@ -1,8 +1,8 @@
 // SPDX-License-Identifier: Apache-2.0
 package com.quintora.mmp.internal.natives;
 
-import android.view.Surface;
 import com.quintora.mmp.OrvMediaPlayer;
+import com.quintora.mmp.desktop.FrameReader;
 import java.io.IOException;
 import java.nio.file.Files;
 import java.nio.file.Path;
@@ -30,7 +30,7 @@ final class LoadingProgram {
     private static String run(String[] arguments) throws IOException {
         switch (arguments[0]) {
             case "surface":
-                new Surface().release();
+                new FrameReader().close();
                 new OrvMediaPlayer().close();
                 return "loaded " + mapped("liborv_platform.so");
             case "unpack":
