@@ -45,7 +45,7 @@ class SampleTest(unittest.TestCase):
             shutil.copytree(environment.SOURCE / "engine/include", include)
             shutil.copytree(environment.SOURCE / "platform/include", include, dirs_exist_ok=True)
             (folder / "prefix/lib").mkdir()
-            shutil.copy(PLATFORM, folder / "prefix/lib")
+            shutil.copy(PLATFORM, folder / "prefix/lib/liborv_platform.so")
             shutil.copytree(SAMPLE, folder / "sample")
             for command in (["-S", folder / "sample", "-B", folder / "out",
                              f"-DCMAKE_PREFIX_PATH={folder}/prefix"],

@@ -1,6 +1,7 @@
 // SPDX-License-Identifier: Apache-2.0
 package com.quintora.mmp;
 
+import com.quintora.mmp.internal.base.Times;
 import java.time.Duration;
 import java.util.Optional;
 

@@ -2,6 +2,8 @@
 package com.quintora.mmp;
 
 import android.view.Surface;
+import com.quintora.mmp.internal.base.SourceNames;
+import com.quintora.mmp.internal.base.Times;
 import com.quintora.mmp.util.PcmMediaInfo;
 import java.io.FileDescriptor;
 import java.io.IOException;

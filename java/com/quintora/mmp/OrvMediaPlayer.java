@@ -107,19 +107,29 @@ public final class OrvMediaPlayer implements MediaPlayer {
 
     // The interface, by the units.
 
-    @Override public void addListener(PlayerListener l) { units.events.addListener(l); }
-    @Override public void removeListener(PlayerListener l) { units.events.removeListener(l); }
-    @Override public PlayerState getState() { return units.states.state(); }
-    @Override public void setDataSource(String s) throws IOException { units.sources.set(s); }
-    @Override public void setDataSource(String url, Map<String, String> headers)
-            throws IOException { units.sources.set(url, headers); }
-    @Override public void setDataSource(FileDescriptor fd, long offset, long length)
-            throws IOException { units.sources.set(fd, offset, length); }
-    @Override public void setDataSource(MediaStreamSource s) throws IOException {
-        units.sources.set(s);
+    @Override public void addListener(PlayerListener listener) {
+        units.events.addListener(listener);
     }
-    @Override public void setPcmFormat(PcmMediaInfo f) { units.sources.setPcmFormat(f); }
-    @Override public void setSurface(@Nullable Surface s) { units.surface.set(s); }
+    @Override public void removeListener(PlayerListener listener) {
+        units.events.removeListener(listener);
+    }
+    @Override public PlayerState getState() { return units.states.state(); }
+    @Override public void setDataSource(String pathOrUrl) throws IOException {
+        units.sources.set(pathOrUrl);
+    }
+    @Override public void setDataSource(String url, Map<String, String> headers)
+            throws IOException {
+        units.sources.set(url, headers);
+    }
+    @Override public void setDataSource(FileDescriptor fd, long offset, long length)
+            throws IOException {
+        units.sources.set(fd, offset, length);
+    }
+    @Override public void setDataSource(MediaStreamSource source) throws IOException {
+        units.sources.set(source);
+    }
+    @Override public void setPcmFormat(PcmMediaInfo format) { units.sources.setPcmFormat(format); }
+    @Override public void setSurface(@Nullable Surface surface) { units.surface.set(surface); }
     @Override public CompletableFuture<Void> prepareAsync() throws IOException {
         return units.preparation.prepareAsync();
     }
@@ -133,7 +143,9 @@ public final class OrvMediaPlayer implements MediaPlayer {
     @Override public void resetAndWait() throws IOException { units.lifetime.resetAndWait(); }
     @Override public CompletableFuture<Void> release() { return units.lifetime.release(); }
     @Override public void close() { units.lifetime.close(); }
-    @Override public CompletableFuture<Boolean> seekTo(int ms) { return units.seeking.seekTo(ms); }
+    @Override public CompletableFuture<Boolean> seekTo(int millis) {
+        return units.seeking.seekTo(millis);
+    }
     @Override public void seekToAndWait(int millis) { units.seeking.seekToAndWait(millis); }
     @Override public boolean isPlaying() { return units.playback.isPlaying(); }
     @Override public int getCurrentPosition() { return units.playback.position(); }
@@ -141,7 +153,7 @@ public final class OrvMediaPlayer implements MediaPlayer {
     @Override public int getBufferedPercent() { return units.playback.bufferedPercent(); }
     @Override public int getVideoWidth() { return units.playback.videoWidth(); }
     @Override public int getVideoHeight() { return units.playback.videoHeight(); }
-    @Override public void setLooping(boolean on) { units.playback.setLooping(on); }
+    @Override public void setLooping(boolean looping) { units.playback.setLooping(looping); }
     @Override public boolean isLooping() { return units.playback.isLooping(); }
     @Override public Tracks tracks() { return units.tracks; }
     @Override public Subtitles subtitles() { return units.subtitles; }

@@ -2,6 +2,7 @@
 package com.quintora.mmp;
 
 import com.quintora.SubtitleAttr;
+import com.quintora.mmp.internal.base.SourceNames;
 import java.io.IOException;
 import java.net.URI;
 import java.nio.file.Path;

@@ -20,7 +20,7 @@ class EventsTest extends PlayerFixture {
         player.resetAndWait();
         prepare("video.mp4");
         player.seekToAndWait(4000);
-        recorder.told.clear();
+        recorder.reported.clear();
         // A start after which the engine stands.
         int epoch = player.units.states.epoch();
         player.units.states.move(epoch, StateMachine.WITH_MEDIA, PlayerState.STARTED);

@@ -19,7 +19,7 @@ import java.util.concurrent.atomic.AtomicInteger;
 import java.util.concurrent.atomic.AtomicReference;
 import org.junit.jupiter.api.Test;
 
-/** What listeners are told, in which order, on which thread, and when no more. */
+/** What is reported to listeners, in which order, on which thread, and when no more. */
 class ListenerTest extends PlayerFixture {
     @Test
     void aMediumsLifeIsToldOnceAndInOrder() throws Exception {
@@ -30,7 +30,7 @@ class ListenerTest extends PlayerFixture {
         assertEquals(
                 List.of("prepared", "size 320x180", "info 3 0", "completion"),
                 recorder.withoutBuffering());
-        assertTrue(recorder.told.stream().anyMatch(what -> what.startsWith("buffering")));
+        assertTrue(recorder.reported.stream().anyMatch(what -> what.startsWith("buffering")));
     }
 
     @Test
@@ -38,10 +38,10 @@ class ListenerTest extends PlayerFixture {
         prepare("video.mp4");
         player.seekToAndWait(4000);
         player.seekToAndWait(2000);
-        Wait.until("both were told", () -> recorder.count("seek") == 2);
+        Wait.until("both were reported", () -> recorder.count("seek") == 2);
         player.start();
         player.seekToAndWait(6000);
-        Wait.until("the third was told", () -> recorder.count("seek") == 3);
+        Wait.until("the third was reported", () -> recorder.count("seek") == 3);
     }
 
     @Test
@@ -49,7 +49,7 @@ class ListenerTest extends PlayerFixture {
         prepare("silent.mkv");
         recorder.await("size 320x180");
         player.resetAndWait();
-        recorder.told.clear();
+        recorder.reported.clear();
         prepare("silent.mkv");
         recorder.await("size 320x180");
         assertEquals(List.of("prepared", "size 320x180"), recorder.withoutBuffering());
@@ -90,12 +90,12 @@ class ListenerTest extends PlayerFixture {
             AtomicBoolean completed = new AtomicBoolean();
             other.addListener(new PlayerListener() {
                 @Override
-                public void onPrepared(MediaPlayer told) {
-                    told.start();
+                public void onPrepared(MediaPlayer from) {
+                    from.start();
                 }
 
                 @Override
-                public void onCompletion(MediaPlayer told) {
+                public void onCompletion(MediaPlayer from) {
                     completed.set(true);
                 }
             });
@@ -111,16 +111,16 @@ class ListenerTest extends PlayerFixture {
         Recorder second = new Recorder();
         player.addListener(new PlayerListener() {
             @Override
-            public void onPrepared(MediaPlayer told) {
-                told.start();
-                told.seekToAndWait(0);
-                told.setLooping(false);
-                told.getCurrentPosition();
+            public void onPrepared(MediaPlayer from) {
+                from.start();
+                from.seekToAndWait(0);
+                from.setLooping(false);
+                from.getCurrentPosition();
             }
 
             @Override
-            public void onCompletion(MediaPlayer told) {
-                told.close();
+            public void onCompletion(MediaPlayer from) {
+                from.close();
                 released.countDown();
             }
         });
@@ -129,7 +129,7 @@ class ListenerTest extends PlayerFixture {
         player.prepareAsync();
         assertTrue(released.await(Wait.LIMIT.toSeconds(), TimeUnit.SECONDS));
         assertEquals(PlayerState.RELEASED, player.getState());
-        assertEquals(0, second.count("completion"), "told after a release that another did");
+        assertEquals(0, second.count("completion"), "reported after a release that another did");
     }
 
     @Test
@@ -141,12 +141,12 @@ class ListenerTest extends PlayerFixture {
             AtomicInteger late = new AtomicInteger();
             other.addListener(new Recorder() {
                 @Override
-                public void onBufferingUpdate(MediaPlayer told, int percent) {
+                public void onBufferingUpdate(MediaPlayer from, int percent) {
                     count();
                 }
 
                 @Override
-                public void onSeekComplete(MediaPlayer told) {
+                public void onSeekComplete(MediaPlayer from) {
                     count();
                 }
 
@@ -182,7 +182,7 @@ class ListenerTest extends PlayerFixture {
             other.resetAndWait();
             goOn.countDown();
             slow.submit(() -> null).get();
-            assertEquals(List.of(), second.told);
+            assertEquals(List.of(), second.reported);
         }
         slow.shutdown();
     }
@@ -199,7 +199,7 @@ class ListenerTest extends PlayerFixture {
             Recorder second = new Recorder();
             other.addListener(new PlayerListener() {
                 @Override
-                public void onPrepared(MediaPlayer told) {
+                public void onPrepared(MediaPlayer from) {
                     throw new IllegalStateException("a listener's own fault");
                 }
             });
@@ -220,7 +220,7 @@ class ListenerTest extends PlayerFixture {
         player.removeListener(recorder);
         prepare("silent.mkv");
         second.await("prepared");
-        assertEquals(List.of(), recorder.told);
+        assertEquals(List.of(), recorder.reported);
     }
 
     @Test
@@ -229,8 +229,8 @@ class ListenerTest extends PlayerFixture {
         Recorder third = new Recorder();
         player.addListener(new PlayerListener() {
             @Override
-            public void onPrepared(MediaPlayer told) {
-                told.removeListener(second);
+            public void onPrepared(MediaPlayer from) {
+                from.removeListener(second);
             }
         });
         player.addListener(second);
@@ -260,7 +260,7 @@ class ListenerTest extends PlayerFixture {
                 List.of("prepared", "size 320x180", "size 640x360", "info 3 7", "info 901 2",
                         "text Hallo", "text null"),
                 recorder.withoutBuffering());
-        assertTrue(recorder.told.contains("buffering 100"), "140 is shown as 100");
+        assertTrue(recorder.reported.contains("buffering 100"), "140 is shown as 100");
         player.start();
         post(2, 0, 0, null);
         recorder.await("completion");
@@ -324,7 +324,7 @@ class ListenerTest extends PlayerFixture {
         OrvMediaPlayer player = new OrvMediaPlayer();
         Recorder recorder = new Recorder() {
             @Override
-            public void onCompletion(MediaPlayer told) {
+            public void onCompletion(MediaPlayer from) {
                 player.getState(); // A listener that holds the player must not keep it.
             }
         };

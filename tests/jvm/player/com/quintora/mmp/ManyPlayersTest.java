@@ -63,9 +63,9 @@ class ManyPlayersTest {
             OrvMediaPlayer player = make(null);
             Recorder recorder = new Recorder() {
                 @Override
-                public void onPrepared(MediaPlayer told) {
-                    super.onPrepared(told);
-                    told.start();
+                public void onPrepared(MediaPlayer from) {
+                    super.onPrepared(from);
+                    from.start();
                 }
             };
             player.addListener(recorder);
@@ -77,12 +77,12 @@ class ManyPlayersTest {
         }
         for (Recorder recorder : recorders) {
             recorder.await("completion");
-            assertEquals("prepared", recorder.told.get(0));
+            assertEquals("prepared", recorder.reported.get(0));
             assertEquals(1, recorder.count("prepared"));
             assertEquals(1, recorder.count("size 320x180"));
             assertEquals(1, recorder.count("info 3 0"));
             assertEquals(1, recorder.count("completion"));
-            assertTrue(recorder.told.indexOf("info 3 0") < recorder.told.indexOf("completion"));
+            assertTrue(recorder.reported.indexOf("info 3 0") < recorder.reported.indexOf("completion"));
             assertEquals(1, recorder.threads.stream().distinct().count());
         }
     }
@@ -109,7 +109,7 @@ class ManyPlayersTest {
             OrvMediaPlayer player = make(Runnable::run); // On the thread that watches.
             player.addListener(new PlayerListener() {
                 @Override
-                public void onPrepared(MediaPlayer told) {
+                public void onPrepared(MediaPlayer from) {
                     blocked.countDown();
                     await(goOn);
                 }

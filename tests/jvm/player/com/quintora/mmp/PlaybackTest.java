@@ -86,7 +86,7 @@ class PlaybackTest extends PlayerFixture {
         assertEquals(PlayerState.STARTED, player.getState());
         Wait.until("it plays from the start", () -> player.getCurrentPosition() < 1500);
         awaitState(PlayerState.COMPLETED);
-        Wait.until("both ends were told", () -> recorder.count("completion") == 2);
+        Wait.until("both ends were reported", () -> recorder.count("completion") == 2);
     }
 
     @Test
@@ -110,7 +110,7 @@ class PlaybackTest extends PlayerFixture {
         assertEquals(PlayerState.PAUSED, player.getState());
         goOnWatching();
         recorder.await("seek");
-        assertTrue(recorder.told.indexOf("completion") < recorder.told.indexOf("seek"));
+        assertTrue(recorder.reported.indexOf("completion") < recorder.reported.indexOf("seek"));
         assertEquals(1, recorder.count("completion"));
         player.start();
         awaitMoving();

@@ -5,9 +5,9 @@ import java.util.ArrayList;
 import java.util.List;
 import java.util.concurrent.CopyOnWriteArrayList;
 
-/** Writes down what a player tells. */
+/** Writes down what a player reports. */
 class Recorder implements PlayerListener {
-    final List<String> told = new CopyOnWriteArrayList<>();
+    final List<String> reported = new CopyOnWriteArrayList<>();
     final List<Thread> threads = new CopyOnWriteArrayList<>();
     volatile MediaException error;
 
@@ -53,22 +53,22 @@ class Recorder implements PlayerListener {
     }
 
     void await(String what) throws Exception {
-        Wait.until(what + " was told; it was " + told, () -> told.contains(what));
+        Wait.until(what + " was reported; it was " + reported, () -> reported.contains(what));
     }
 
     long count(String what) {
-        return told.stream().filter(what::equals).count();
+        return reported.stream().filter(what::equals).count();
     }
 
-    /** What was told, without the amounts of buffered media, which vary. */
+    /** What was reported, without the amounts of buffered media, which vary. */
     List<String> withoutBuffering() {
-        List<String> rest = new ArrayList<>(told);
+        List<String> rest = new ArrayList<>(reported);
         rest.removeIf(what -> what.startsWith("buffering"));
         return rest;
     }
 
     private void note(String what) {
         threads.add(Thread.currentThread());
-        told.add(what);
+        reported.add(what);
     }
 }

@@ -121,7 +121,7 @@ class StreamTroubleTest extends PlayerFixture {
         try {
             player.seekToAndWait(55_000);
         } catch (IllegalStateException e) {
-            assertTrue(e.getMessage().contains("seekTo(55000)"), e.getMessage());
+            assertTrue(e.getMessage().contains("seekToAndWait(55000)"), e.getMessage());
         }
         recorder.await("error");
         assertEquals(PlayerState.ERROR, player.getState());

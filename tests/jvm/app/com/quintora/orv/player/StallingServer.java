@@ -14,7 +14,7 @@ import java.util.concurrent.ExecutorService;
 import java.util.concurrent.Executors;
 
 /**
- * A server on this machine that sends a file only up to a place, and the rest once it is told to.
+ * A server on this machine that sends a file only up to a place, and the rest on demand.
  * The index at the file's end comes at once. It knows byte ranges.
  */
 public final class StallingServer implements AutoCloseable {

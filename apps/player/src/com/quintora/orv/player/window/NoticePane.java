@@ -42,7 +42,7 @@ final class NoticePane extends JPanel {
         noticeEnd.restart();
     }
 
-    /** Writes a few words until others come, or none; what is told for a moment goes first. */
+    /** Writes a few words until others come, or none; what is shown for a moment goes first. */
     void keepTelling(String words) {
         if (!words.equals(lasting)) {
             lasting = words;

@@ -60,7 +60,7 @@ class GpuWindowTest extends WindowFixture {
         open("video.mp4", "--gpu");
         awaitScreen();
         press("UP");
-        Wait.until("the volume is told", GpuWindowTest::hasWords);
+        Wait.until("the volume is shown", GpuWindowTest::hasWords);
         Wait.until("it goes again", () -> !hasWords());
     }
 

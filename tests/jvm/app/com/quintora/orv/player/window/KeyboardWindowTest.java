@@ -96,11 +96,11 @@ class KeyboardWindowTest {
     @Test
     void theBarIsASliderOfSeconds() throws Exception {
         AccessibleContext slider = bar.seekBar().getAccessibleContext();
-        List<Object> told = new ArrayList<>();
+        List<Object> values = new ArrayList<>();
         // The window may get the keyboard meanwhile, of which the slider tells, too.
         slider.addPropertyChangeListener(change -> {
             if (AccessibleContext.ACCESSIBLE_VALUE_PROPERTY.equals(change.getPropertyName())) {
-                told.add(change.getNewValue());
+                values.add(change.getNewValue());
             }
         });
         assertEquals(AccessibleRole.SLIDER, slider.getAccessibleRole());
@@ -109,7 +109,7 @@ class KeyboardWindowTest {
         SwingUtilities.invokeAndWait(
                 () -> slider.getAccessibleValue().setCurrentAccessibleValue(45));
         assertEquals(List.of("seekTo[45000]"), calls);
-        assertEquals(List.of(45), told);
+        assertEquals(List.of(45), values);
     }
 
     @Test

@@ -1,16 +1,15 @@
 // SPDX-License-Identifier: Apache-2.0
-package com.quintora.mmp;
+package com.quintora.mmp.internal.base;
 
-import com.quintora.mmp.internal.base.Arguments;
 import java.net.URI;
 import java.nio.file.FileSystems;
 import java.nio.file.Path;
 
 /** What the engine calls a file or URI. */
-final class SourceNames {
+public final class SourceNames {
     private SourceNames() {}
 
-    static String of(Path file) {
+    public static String of(Path file) {
         if (Arguments.require(file, "the file").getFileSystem() != FileSystems.getDefault()) {
             throw new IllegalArgumentException(
                     file + " is in " + file.getFileSystem()
@@ -20,7 +19,7 @@ final class SourceNames {
     }
 
     // The engine takes what follows file:// as it stands, without percent signs.
-    static String of(URI uri) {
+    public static String of(URI uri) {
         if (!Arguments.require(uri, "the URI").isAbsolute()) {
             throw new IllegalArgumentException("the URI " + uri + " names no scheme");
         }

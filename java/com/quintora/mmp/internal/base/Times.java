@@ -1,17 +1,16 @@
 // SPDX-License-Identifier: Apache-2.0
-package com.quintora.mmp;
+package com.quintora.mmp.internal.base;
 
-import com.quintora.mmp.internal.base.Arguments;
 import java.time.Duration;
 import java.util.Optional;
 
 /** The engine's milliseconds as durations, and back. */
-final class Times {
+public final class Times {
     private static final Duration MAX = Duration.ofMillis(Integer.MAX_VALUE);
 
     private Times() {}
 
-    static int toMillis(Duration time) {
+    public static int toMillis(Duration time) {
         Arguments.require(time, "the time");
         if (time.isNegative() || time.compareTo(MAX) > 0) {
             throw new IllegalArgumentException(
@@ -21,7 +20,7 @@ final class Times {
     }
 
     /** Empty for 0, which the engine reports for unknown. */
-    static Optional<Duration> known(int millis) {
+    public static Optional<Duration> known(int millis) {
         return millis == 0 ? Optional.empty() : Optional.of(Duration.ofMillis(millis));
     }
 }

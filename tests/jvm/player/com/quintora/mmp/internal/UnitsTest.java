@@ -1,0 +1,152 @@
+// SPDX-License-Identifier: Apache-2.0
+package com.quintora.mmp.internal;
+
+import static org.junit.jupiter.api.Assertions.assertEquals;
+import static org.junit.jupiter.api.Assertions.assertSame;
+import static org.junit.jupiter.api.Assertions.assertThrows;
+import static org.junit.jupiter.api.Assertions.assertTrue;
+
+import com.quintora.mmp.MediaError;
+import com.quintora.mmp.MediaException;
+import com.quintora.mmp.PlayerState;
+import com.quintora.mmp.SubtitleTrack;
+import com.quintora.mmp.TrackFlags;
+import com.quintora.mmp.Wait;
+import java.io.IOException;
+import java.util.ArrayList;
+import java.util.List;
+import java.util.concurrent.CompletableFuture;
+import java.util.concurrent.CompletionException;
+import java.util.concurrent.CountDownLatch;
+import java.util.concurrent.atomic.AtomicInteger;
+import org.junit.jupiter.api.AfterEach;
+import org.junit.jupiter.api.Test;
+
+/** The units of a player, without a native library. */
+class UnitsTest {
+    private final ScriptedNatives natives = new ScriptedNatives();
+    private final PlayerUnits units = natives.units();
+
+    @AfterEach
+    void close() {
+        units.lifetime.close();
+    }
+
+    @Test
+    void aPlayersWayLeadsThroughTheNativeHalf() throws Exception {
+        prepare();
+        units.playback.start();
+        assertEquals(PlayerState.STARTED, units.states.state());
+        units.lifetime.close();
+        assertEquals(PlayerState.RELEASED, units.states.state());
+        assertTrue(natives.calls.containsAll(List.of("setDataSource", "prepare", "start")));
+        assertEquals(1, natives.count("release"));
+    }
+
+    @Test
+    void ofSeeksThatWaitForAnotherOnlyTheLastIsCarriedOut() throws Exception {
+        prepare();
+        CountDownLatch go = new CountDownLatch(1);
+        AtomicInteger seeks = new AtomicInteger();
+        natives.answer("seekTo", () -> {
+            seeks.incrementAndGet();
+            go.await();
+            return null;
+        });
+        CompletableFuture<Boolean> first = units.seeking.seekTo(1);
+        Wait.until("the first is under way", () -> seeks.get() == 1);
+        List<CompletableFuture<Boolean>> others = new ArrayList<>();
+        for (int i = 2; i <= 5; i++) {
+            others.add(units.seeking.seekTo(i));
+        }
+        for (CompletableFuture<Boolean> overtaken : others.subList(0, 3)) {
+            assertEquals(false, overtaken.join(), "overtaken while the first still runs");
+        }
+        go.countDown();
+        assertTrue(first.join());
+        assertTrue(others.get(3).join());
+        assertEquals(2, seeks.get());
+    }
+
+    @Test
+    void whatWaitsInTheBackgroundEndsWithItsMedia() throws Exception {
+        prepare();
+        CountDownLatch go = new CountDownLatch(1);
+        natives.answer("step", () -> {
+            go.await();
+            return null;
+        });
+        CompletableFuture<Void> running = units.trickPlay.step(1);
+        Wait.until("the first runs", () -> natives.count("step") == 1);
+        CompletableFuture<Void> waiting = units.trickPlay.step(2);
+        units.lifetime.resetAndWait();
+        prepare();
+        go.countDown();
+        running.handle((done, thrown) -> null).join();
+        Throwable thrown = assertThrows(CompletionException.class, waiting::join).getCause();
+        assertEquals("step() was ended by a reset", thrown.getMessage());
+        assertEquals(1, natives.count("step"), "no step of the new media");
+    }
+
+    @Test
+    void anEngineThatFailsToReleaseIsReportedOnceAndReleasedAllTheSame() {
+        natives.answer("release", () -> {
+            throw new IllegalStateException("stuck");
+        });
+        IllegalStateException thrown =
+                assertThrows(IllegalStateException.class, units.lifetime::close);
+        assertEquals("the engine refused release(): stuck", thrown.getMessage());
+        assertEquals(PlayerState.RELEASED, units.states.state());
+        units.lifetime.close();
+        CompletableFuture<Void> released = units.lifetime.release();
+        assertSame(thrown, assertThrows(CompletionException.class, released::join).getCause());
+        assertEquals(1, natives.count("release"));
+    }
+
+    @Test
+    void aResetThatFailsLeavesThePlayerInError() throws Exception {
+        prepare();
+        natives.answer("reset", () -> {
+            throw new IOException("stuck");
+        });
+        Throwable thrown =
+                assertThrows(CompletionException.class, units.lifetime.reset()::join).getCause();
+        assertEquals(MediaError.UNKNOWN, ((MediaException) thrown).error());
+        assertEquals(PlayerState.ERROR, units.states.state());
+    }
+
+    @Test
+    void aTrackThatTheEngineDoesNotShowIsRefused() throws Exception {
+        prepare();
+        natives.answer("getAllSubtitleTrackInfo", () -> {
+            units.tables.addSubtitle(0, 1, 0, "eng;Captions", 0);
+            return 1;
+        });
+        natives.answer("getCurrentSubtitleIndex", () -> -1);
+        SubtitleTrack track = units.tracks.subtitles().get(0);
+        IllegalStateException thrown = assertThrows(
+                IllegalStateException.class, () -> units.tracks.selectAndWait(track));
+        assertEquals("the engine cannot play subtitle track 0", thrown.getMessage());
+        assertEquals(new SubtitleTrack(0, 1, "", "eng", "Captions", new TrackFlags(0)), track);
+    }
+
+    @Test
+    void whileMutedAVolumeIsKeptForLater() {
+        units.audio.setVolume(0.5f, 0.5f);
+        units.audio.setMuted(true);
+        units.audio.setVolume(0.75f, 0.75f);
+        assertEquals(2, natives.count("setVolume"));
+        units.audio.setMuted(false);
+        assertEquals(3, natives.count("setVolume"));
+        natives.answer("setVolume", () -> {
+            throw new IllegalStateException("no");
+        });
+        assertThrows(IllegalStateException.class, () -> units.audio.setVolume(1, 1));
+        assertEquals(0.75f, units.audio.getLeftVolume(), "a refused volume is not remembered");
+    }
+
+    private void prepare() throws IOException {
+        units.sources.set("film.mkv");
+        units.preparation.prepareAndWait();
+    }
+}
