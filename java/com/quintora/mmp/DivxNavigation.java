@@ -46,7 +46,12 @@ public interface DivxNavigation {
      * @param text1 the first text
      * @param text2 the second text
      */
-    record DisplayInfo(List<Integer> values, String text1, String text2) {}
+    record DisplayInfo(List<Integer> values, String text1, String text2) {
+        /** Copies the list. */
+        public DisplayInfo {
+            values = List.copyOf(values);
+        }
+    }
 
     /**
      * How many titles there are.

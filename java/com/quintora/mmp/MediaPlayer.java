@@ -411,6 +411,26 @@ public interface MediaPlayer extends AutoCloseable {
     }
 
     /**
+     * Silences the sound, or has it at its volume again; as {@link AudioOutput#setMuted}.
+     *
+     * @param muted true for silence
+     * @throws IllegalStateException after release, or when the engine refuses
+     */
+    default void setMuted(boolean muted) {
+        audio().setMuted(muted);
+    }
+
+    /**
+     * Whether the sound is muted. Every state.
+     *
+     * @return what was last set; false at first
+     * @throws IllegalStateException after release
+     */
+    default boolean isMuted() {
+        return audio().isMuted();
+    }
+
+    /**
      * The media's tracks, chapters and metadata.
      *
      * @return the same object always

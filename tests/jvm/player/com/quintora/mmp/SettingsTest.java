@@ -136,10 +136,10 @@ class SettingsTest extends PlayerFixture {
         assertEquals(1, player.getVolume());
         assertFalse(player.audio().isMuted());
         player.setVolume(0.5f);
-        player.audio().setMuted(true);
+        player.setMuted(true);
         assertEquals(0.5f, player.getVolume());
         player.audio().setVolume(0.25f, 0.75f);
-        assertTrue(player.audio().isMuted());
+        assertTrue(player.isMuted());
         player.audio().setMuted(false);
         assertEquals(0.25f, player.audio().getLeftVolume());
         assertEquals(0.75f, player.audio().getRightVolume());
