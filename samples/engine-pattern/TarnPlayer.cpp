@@ -43,9 +43,8 @@ enum : unsigned { COMPLETED = 32, STOPPED = 64, OPEN = 60, ALIVE = 127, RELEASED
 class TarnPlayer::Engine {
 public:
     explicit Engine(std::function<void(int, int, int)> listener) : mListener(std::move(listener)) {}
-    // Runs an operation under the lock and returns its status; in other phases that is
-    // INVALID_OPERATION. A failure is one line in the log, without a name none. The surface has
-    // the frame of the time afterwards.
+    // Runs an operation under the lock and returns its status, in other phases INVALID_OPERATION.
+    // With a name, a failure is logged. The surface has the frame of the time afterwards.
     status_t run(const char* name, unsigned phases, const std::function<void(Engine&)>& operation) {
         std::lock_guard<std::mutex> lock(mMutex);
         settle();
@@ -212,10 +211,11 @@ bool TarnPlayer::canDoSeek(int) { return mEngine->is(OPEN); }
 bool TarnPlayer::isPlaying() { return mEngine->is(STARTED); }
 int TarnPlayer::getBufferPercent() { return mEngine->is(OPEN) ? 100 : 0; }
 status_t TarnPlayer::getCurrentPosition(int* msec) {
-    return mEngine->run(nullptr, OPEN, [=](Engine& e) { *msec = e.time / 1ms; });
+    return mEngine->run(nullptr, OPEN, [=](Engine& e) { *msec = static_cast<int>(e.time / 1ms); });
 }
 status_t TarnPlayer::getDuration(int* msec) {
-    return mEngine->run(__func__, OPEN | STOPPED, [=](Engine& e) { *msec = e.duration / 1ms; });
+    return mEngine->run(__func__, OPEN | STOPPED,
+                        [=](Engine& e) { *msec = static_cast<int>(e.duration / 1ms); });
 }
 status_t TarnPlayer::getVideoWidth(int* w) { return *w = mEngine->is(OPEN) * kWidth, NO_ERROR; }
 status_t TarnPlayer::getVideoHeight(int* h) { return *h = mEngine->is(OPEN) * kHeight, NO_ERROR; }

@@ -186,13 +186,27 @@ TEST_F(PatternEngineTest, ANewSurfaceGetsThePictureAndTheEarlierOneNothingMore) 
     EXPECT_EQ(sink->frameCount(), before);
 }
 
-TEST_F(PatternEngineTest, ASurfaceThatHadNoBufferGetsThePictureLater) {
+// Refuses its buffer and counts how often.
+class BusySink : public FrameSink {
+public:
+    android::status_t dequeueBuffer(int width, int height, PixelBuffer* buffer) override {
+        const android::status_t status = FrameSink::dequeueBuffer(width, height, buffer);
+        if (status == android::WOULD_BLOCK) refused++;
+        return status;
+    }
+    std::atomic<int> refused{0};
+};
+
+TEST_F(PatternEngineTest, ASurfaceWithoutABufferIsAskedUntilItHasOne) {
+    const sp<BusySink> busy = new BusySink;
     prepare();
-    sink->block(true);
+    ASSERT_EQ(player->setVideoSurfaceTexture(busy), 0);
+    busy->block(true);
     ASSERT_EQ(player->seekTo(2000, 0), 0);
-    sink->block(false);
+    EXPECT_TRUE(becomes([&] { return busy->refused > 20; }));
+    busy->block(false);
     EXPECT_TRUE(
-        sink->waitFor(1, [](const auto& picture) { return picture.timestampUs == 50 * kFrameUs; }));
+        busy->waitFor(1, [](const auto& picture) { return picture.timestampUs == 50 * kFrameUs; }));
 }
 
 TEST_F(PatternEngineTest, ASurfaceWithoutAConsumerIsGivenUp) {
@@ -239,6 +253,28 @@ TEST_F(PatternEngineTest, AListenerMayReleaseThePlayer) {
     prepare();
     EXPECT_TRUE(recorder->sees(android::MEDIA_SET_VIDEO_SIZE));
     EXPECT_EQ(player->start(), android::INVALID_OPERATION);
+}
+
+TEST_F(PatternEngineTest, AReleaseWaitsForTheListener) {
+    std::atomic<bool> inside{false};
+    std::atomic<bool> released{false};
+    std::atomic<bool> early{false};
+    recorder->action = [&](int) {
+        inside = true;
+        int duration = 0;
+        becomes([&] { return player->getDuration(&duration) != 0; });
+        // Only a release that does not wait ends this before its last round.
+        for (int i = 0; i < 50 && !early; i++) {
+            early = released.load();
+            std::this_thread::sleep_for(std::chrono::milliseconds(1));
+        }
+    };
+    prepare();
+    ASSERT_TRUE(becomes([&] { return inside.load(); }));
+    EXPECT_EQ(player->release(), 0);
+    released = true;
+    EXPECT_TRUE(recorder->sees(android::MEDIA_SET_VIDEO_SIZE));
+    EXPECT_FALSE(early);
 }
 
 TEST_F(PatternEngineTest, AnyThreadMayCallAnythingUntilTheReleaseAndAfter) {
