@@ -45,7 +45,10 @@ final class LoadFailures {
                         + ": give both dependencies one version. (" + bundle.place() + ")");
     }
 
-    /** The virtual machine did not load that library; its message says why, not what to do. */
+    /**
+     * The virtual machine did not load that library, of which more may be said; its message says
+     * why, but not what to do.
+     */
     static UnsatisfiedLinkError refused(String library, UnsatisfiedLinkError cause) {
         String message = String.valueOf(cause.getMessage());
         String text = "The native library " + library + " did not load: " + message + ".";

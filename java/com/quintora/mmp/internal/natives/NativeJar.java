@@ -10,6 +10,8 @@ final class NativeJar {
     /** Where this process has its libraries, once they are unpacked: all come from one folder. */
     private static Path unpacked;
 
+    private static String system;
+
     private NativeJar() {}
 
     /**
@@ -21,8 +23,14 @@ final class NativeJar {
             NativeBundle bundle =
                     choose(BundleFinder.ofThisVm(), Machine.ofThisVm(), JavaVersion.read());
             unpacked = CacheFolder.ofThisVm().unpack(bundle);
+            system = bundle.system();
         }
         return unpacked.resolve(fileName);
+    }
+
+    /** What the unpacked libraries were built on, as in "Debian 12"; null before there are any. */
+    static synchronized String system() {
+        return system;
     }
 
     /** The bundle for that machine and of that version; of any version where that is null. */

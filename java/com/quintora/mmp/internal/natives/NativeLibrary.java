@@ -55,7 +55,7 @@ public final class NativeLibrary {
         try {
             System.load(file);
         } catch (UnsatisfiedLinkError e) {
-            throw LoadFailures.refused(file, e);
+            throw LoadFailures.refused(file + ", built on " + NativeJar.system() + ",", e);
         }
     }
 }
