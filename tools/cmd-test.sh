@@ -28,7 +28,7 @@ done
 # run once more. ctest shows both runs. Many tests wait more than they compute, so one
 # more than there are processors runs at a time.
 test_native() {
-    need_packages "build and test" play test tree
+    need_packages "build and test" play test tree maven
     build_targets on all
     [ -z "$with_lint" ] || [ -n "$filter" ] || lint_everything
     on_some_display ctest --test-dir "$ORV_BUILD" --output-on-failure --no-tests=error \

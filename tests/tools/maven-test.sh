@@ -1,0 +1,56 @@
+#!/usr/bin/env bash
+# SPDX-License-Identifier: Apache-2.0
+# The Maven repository: made twice it is the same, its sums are right, and the sample
+# builds from it without a network and plays with an empty cache, also twice at once.
+# ORV_BUILD is a build folder, ORV_MEDIA one with test media. Ends with 77 without Maven.
+set -euo pipefail
+
+root=$(dirname -- "$(dirname -- "$(dirname -- "$(readlink -f -- "$0")")")")
+command -v mvn >/dev/null || { echo "there is no mvn here" && exit 77; }
+folder=$(mktemp -d)
+trap 'rm -rf -- "$folder"' EXIT
+export ORV_NO_INSTALL=1 ORV_LOG=silent
+unset DISPLAY JAVA_TOOL_OPTIONS
+
+fail() {
+    echo "FAILED $*"
+    exit 1
+}
+
+package() {
+    "$root/orv" package maven --without-armhf --into "$folder/$1" >"$folder/$1.log" 2>&1
+}
+
+package first &
+package second || fail "no repository: $(cat "$folder/second.log")"
+wait $! || fail "no repository: $(cat "$folder/first.log")"
+diff -r "$folder/first" "$folder/second" || fail "two repositories of the same sources differ"
+"$root/tests/tools/maven_metadata.py" "$folder/first" || fail "the repository contradicts itself"
+
+native=$(find "$folder/first" -name '*-linux-x86_64.jar')
+mkdir "$folder/native"
+(cd "$folder/native" && "$JAVA_HOME/bin/jar" xf "$native")
+! grep -rl -e "$root" -e "$ORV_BUILD" "$folder/native" || fail "a library names the folder it was built in"
+
+cp -r -- "$root/samples/maven" "$folder/sample"
+(cd "$folder/sample" && mvn -B -o -q -s debian-settings.xml -Duser.home="$folder" \
+    -Dorv.local="$folder/local" -Dorv.repository="$folder/first" package) >"$folder/mvn.log" 2>&1 ||
+    fail "the sample does not build: $(cat "$folder/mvn.log")"
+
+# play NAME CACHE: plays with that cache, into an output of that name.
+play() {
+    XDG_CACHE_HOME=$folder/$2 "$JAVA_HOME/bin/java" --enable-native-access=ALL-UNNAMED \
+        -Djava.library.path="$folder" -cp "$folder/sample/target/*:$folder/sample/target/lib/*" \
+        sample.Play "$ORV_MEDIA/short.mp4" >"$folder/$1.out" 2>&1 || true
+    for line in '^duration: [1-9][0-9]* ms$' '^VideoTrack' '^AudioTrack' '^played to the end$'; do
+        grep -q "$line" "$folder/$1.out" || fail "the sample printed: $(cat "$folder/$1.out")"
+    done
+}
+
+play alone cache
+find "$folder/cache/mediaplayer-orv" -name libmediaplayer_orv.so | grep -q . ||
+    fail "nothing was unpacked"
+play left shared &
+play right shared
+wait $! || exit 1
+[ -z "$(find "$folder/shared" -name '*.part')" ] || fail "something half is left in the cache"
