@@ -30,7 +30,8 @@ diff -r "$folder/first" "$folder/second" || fail "two repositories of the same s
 native=$(find "$folder/first" -name '*-linux-x86_64.jar')
 mkdir "$folder/native"
 (cd "$folder/native" && "$JAVA_HOME/bin/jar" xf "$native")
-! grep -rl -e "$root" -e "$ORV_BUILD" "$folder/native" || fail "a library names the folder it was built in"
+! grep -rl -e "$root" -e "$ORV_BUILD" "$folder/native" ||
+    fail "a library names the folder that it was built in"
 
 cp -r -- "$root/samples/maven" "$folder/sample"
 (cd "$folder/sample" && mvn -B -o -q -s debian-settings.xml -Duser.home="$folder" \

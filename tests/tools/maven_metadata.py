@@ -65,7 +65,8 @@ def check_artefact(folder, name, version):
               for d in variant.get("dependencies", [])}
     require(gradle == dependencies(pom), f"{name} needs other things with Maven than with Gradle")
     for other, number in gradle:
-        require((folder.parent / other / number).is_dir(), f"{name} needs {other}, which is missing")
+        require((folder.parent / other / number).is_dir(),
+                f"{name} needs {other}, which is missing")
 
 
 def main():

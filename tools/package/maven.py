@@ -69,7 +69,8 @@ class Repository:
         with open(os.path.join(options.source, "LICENSE"), "rb") as licence:
             self.licence = {"META-INF/LICENSE": licence.read()}
         self.class_path = [os.path.join(options.build, "java", target + ".jar")
-                           for target in options.jars] + cached(options.build, r"\w+:FILEPATH(?==.*\.jar$)")
+                           for target in options.jars]
+        self.class_path += cached(options.build, r"\w+:FILEPATH(?==.*\.jar$)")
 
     def place(self, artefact, *name):
         return os.path.join(self.root, *project.GROUP.split("."), artefact.name, *name)

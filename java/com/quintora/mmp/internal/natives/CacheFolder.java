@@ -22,7 +22,7 @@ final class CacheFolder {
     private final Path temporary;
     private final NativeCache.Writer writer;
 
-    /** The preferred folder is null where the user has none; the other is the temporary files'. */
+    /** The preferred folder is null where the user has none; the other is for temporary files. */
     CacheFolder(Path preferred, Path temporary, NativeCache.Writer writer) {
         this.preferred = preferred;
         this.temporary = temporary;
@@ -35,7 +35,7 @@ final class CacheFolder {
                 preferred(System.getProperties(), System.getenv()), temporary, NativeCache.TO_DISK);
     }
 
-    /** The folder of the user's settings; null where they name none, as for users without a home. */
+    /** The folder that the user's settings name; null for users without a home. */
     static Path preferred(Properties properties, Map<String, String> environment) {
         String named = properties.getProperty(PROPERTY, "");
         if (!named.isEmpty()) {
@@ -70,9 +70,9 @@ final class CacheFolder {
             deleteAtExit(root, bundle);
             Path folder = new NativeCache(root, writer).unpack(bundle);
             System.getLogger("com.quintora.mmp").log(Level.WARNING,
-                    "The native libraries are unpacked into " + root + " for this process alone, as "
-                            + reason + ". The system property " + PROPERTY
-                            + " names another folder.");
+                    "The native libraries are unpacked into " + root
+                            + " for this process alone, as " + reason + ". The system property "
+                            + PROPERTY + " names another folder.");
             return folder;
         } catch (IOException e) {
             throw LoadFailures.because("The native libraries cannot be unpacked: " + reason

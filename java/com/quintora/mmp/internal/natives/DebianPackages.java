@@ -25,8 +25,7 @@ final class DebianPackages {
             return "android-" + name;
         }
         String number = library.substring(end + 3).replaceFirst("^\\.", "");
-        boolean endsWithDigit = !name.isEmpty() && Character.isDigit(name.charAt(name.length() - 1));
-        String dash = endsWithDigit && !number.isEmpty() ? "-" : "";
+        String dash = name.matches(".*\\d") && !number.isEmpty() ? "-" : "";
         return (name.replace('_', '-') + dash + number).toLowerCase(Locale.ROOT);
     }
 }

@@ -46,14 +46,25 @@ final class LoadFailures {
     }
 
     /**
-     * The virtual machine did not load that library, of which more may be said; its message says
-     * why, but not what to do.
+     * The virtual machine did not load that library, which may be null where no file is known; its
+     * message says why, but not what to do. The system is that which it was built on, or null.
      */
-    static UnsatisfiedLinkError refused(String library, UnsatisfiedLinkError cause) {
+    static UnsatisfiedLinkError refused(String file, String system, UnsatisfiedLinkError cause) {
         String message = String.valueOf(cause.getMessage());
-        String text = "The native library " + library + " did not load: " + message + ".";
+        String text = "The native library ";
+        if (file != null) {
+            text += file + " ";
+        }
+        if (system != null) {
+            text += "was built on " + system + " and ";
+        }
+        text += "did not load: " + withoutFile(message, file) + ".";
         String advice = advice(message);
         return because(advice.isEmpty() ? text : text + " " + advice, cause);
+    }
+
+    private static String withoutFile(String message, String file) {
+        return message.startsWith(file + ": ") ? message.substring(file.length() + 2) : message;
     }
 
     private static String advice(String message) {
@@ -62,8 +73,9 @@ final class LoadFailures {
             String library = missing.group(1);
             return "The system library " + library + " is missing; in Debian it is of the package "
                     + DebianPackages.of(library)
-                    + ". A release without that package has another version of the library, and"
-                    + " needs native libraries that are built on it: ./orv package maven.";
+                    + ". There, libmpv2 and libcurl3-gnutls bring all that the player needs. Where"
+                    + " the system has another version of it, ./orv package maven builds native"
+                    + " libraries for that system.";
         }
         if (message.contains("failed to map segment")) {
             return "Its file system does not allow programs (noexec); name a folder on another with"

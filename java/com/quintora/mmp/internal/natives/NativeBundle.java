@@ -9,10 +9,10 @@ import java.util.List;
 /**
  * The native libraries that a JAR holds for one machine, as the list in it names them.
  *
- * <p>The list is text, a fact a line: {@code version 1.0.0}, {@code system Debian 12}, {@code digest}
- * with hexadecimal digits that another set of libraries does not have and, for each library, {@code
- * file NAME BYTES CRC-32 SHA-256}. The first sum is for each start, at which the second would take
- * longer than all the rest; the second is for unpacking.
+ * <p>The list is text, a fact a line: {@code version 1.0.0}, {@code system Debian 12}, {@code
+ * digest} with hexadecimal digits that another set of libraries does not have and, for each
+ * library, {@code file NAME BYTES CRC-32 SHA-256}. The first sum is for each start, at which the
+ * second would take longer than all the rest; the second is for unpacking.
  */
 final class NativeBundle {
     /** The name of the list, which stands beside the libraries. */

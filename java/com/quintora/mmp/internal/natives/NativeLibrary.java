@@ -44,10 +44,11 @@ public final class NativeLibrary {
             System.loadLibrary(name);
             return true;
         } catch (UnsatisfiedLinkError e) {
-            if (onPath == null && String.valueOf(e.getMessage()).startsWith("no " + name + " in ")) {
+            String message = String.valueOf(e.getMessage());
+            if (onPath == null && message.startsWith("no " + name + " in ")) {
                 return false;
             }
-            throw LoadFailures.refused(onPath == null ? System.mapLibraryName(name) : onPath, e);
+            throw LoadFailures.refused(onPath, null, e);
         }
     }
 
@@ -55,7 +56,7 @@ public final class NativeLibrary {
         try {
             System.load(file);
         } catch (UnsatisfiedLinkError e) {
-            throw LoadFailures.refused(file + ", built on " + NativeJar.system() + ",", e);
+            throw LoadFailures.refused(file, NativeJar.system(), e);
         }
     }
 }

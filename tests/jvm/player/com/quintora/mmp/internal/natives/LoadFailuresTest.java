@@ -9,18 +9,28 @@ import org.junit.jupiter.api.Test;
 
 class LoadFailuresTest {
     private static String refused(String message) {
-        return LoadFailures.refused("/x/lib.so", new UnsatisfiedLinkError(message)).getMessage();
+        return LoadFailures.refused("/x/lib.so", null, new UnsatisfiedLinkError(message))
+                .getMessage();
     }
 
     @Test
     void aMissingSystemLibraryIsNamedWithItsPackage() {
-        String message = "/x/liborvtarn.so: libmpv.so.2: cannot open shared object file: No such"
-                + " file or directory";
-        String refused = refused(message);
-        assertTrue(refused.startsWith(
-                "The native library /x/lib.so did not load: " + message + "."), refused);
-        assertTrue(refused.contains("The system library libmpv.so.2 is missing; in Debian it is of"
-                + " the package libmpv2."), refused);
+        String reason =
+                "libavcodec.so.59: cannot open shared object file: No such file or directory";
+        String refused = refused("/x/lib.so: " + reason);
+        assertTrue(refused.startsWith("The native library /x/lib.so did not load: " + reason + "."
+                + " The system library libavcodec.so.59 is missing; in Debian it is of the package"
+                + " libavcodec59. There, libmpv2 and libcurl3-gnutls bring all"), refused);
+    }
+
+    @Test
+    void theSystemThatItWasBuiltOnIsNamedWhereItIsKnown() {
+        UnsatisfiedLinkError cause = new UnsatisfiedLinkError("strange");
+        assertEquals(
+                "The native library /x/lib.so was built on Debian 12 and did not load: strange.",
+                LoadFailures.refused("/x/lib.so", "Debian 12", cause).getMessage());
+        assertEquals("The native library did not load: strange.",
+                LoadFailures.refused(null, null, cause).getMessage());
     }
 
     @Test
@@ -49,6 +59,6 @@ class LoadFailuresTest {
     @Test
     void theMachinesOwnErrorIsTheCause() {
         UnsatisfiedLinkError cause = new UnsatisfiedLinkError("strange");
-        assertSame(cause, LoadFailures.refused("/x/lib.so", cause).getCause());
+        assertSame(cause, LoadFailures.refused("/x/lib.so", null, cause).getCause());
     }
 }

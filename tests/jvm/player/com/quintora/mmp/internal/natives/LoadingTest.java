@@ -46,6 +46,7 @@ class LoadingTest {
     private BufferedReader start(Path jar, Path libraryPath, String... arguments) throws Exception {
         List<String> command =
                 new ArrayList<>(List.of(System.getProperty("orv.test.java").split("\\|")));
+        command.addAll(List.of("-XX:+UseSerialGC", "-XX:TieredStopAtLevel=1"));
         command.add("--enable-native-access=ALL-UNNAMED");
         command.add("-Djava.library.path=" + libraryPath);
         command.add("-Dcom.quintora.mmp.cache=" + cache());
