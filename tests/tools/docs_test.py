@@ -91,6 +91,18 @@ class PagesTest(Project):
         self.assertIn('href="../samples/README.html"', self.page("docs/more.html"))
         self.assertIn("Samples</h1>", self.page("samples/README.html"))
 
+    def test_folders_that_are_linked_to_are_listed(self):
+        self.write("samples/one/Sample.txt", "A sample.\n")
+        self.write("samples/one/NOTES.md", "# Notes\n\n[gone](gone.md)\n")
+        self.write("docs/more.md", "# More\n\n[samples](../samples)\n")
+        self.assert_fails("samples/one/NOTES.md:3: gone.md: there is no such file")
+        self.write("samples/one/NOTES.md", "# Notes\n")
+        self.assert_builds()
+        self.assertIn('href="../samples/index.html"', self.page("docs/more.html"))
+        self.assertIn('<a href="one/index.html">one/</a>', self.page("samples/index.html"))
+        self.assertIn('<a href="Sample.txt">Sample.txt</a>', self.page("samples/one/index.html"))
+        self.assertEqual(self.page("samples/one/Sample.txt"), "A sample.\n")
+
     def test_addresses_elsewhere_are_listed(self):
         self.write("docs/more.md", "# More\n\n[a](https://example.org/x#y) <https://example.org/>\n")
         self.assert_builds()
@@ -120,7 +132,7 @@ the next line, an [anchor](guide.md#none) and [one here](#none).
 
 - <a href="none.txt">raw</a>
 
-[folder](../docs) [out](../../out.md)
+[out](../../out.md)
 """)
         self.assert_fails(
             "docs/more.md:3: none.md: there is no such file",
@@ -129,7 +141,6 @@ the next line, an [anchor](guide.md#none) and [one here](#none).
             "docs/more.md:6: none.html: there is no such file",
             "docs/more.md:8: none.png: there is no such file",
             "docs/more.md:10: none.txt: there is no such file",
-            "docs/more.md:12: ../docs: is a folder without a page",
             "docs/more.md:12: ../../out.md: leads out of the documentation")
 
     def test_what_is_loaded_from_elsewhere_is_refused(self):

@@ -9,18 +9,23 @@ import subprocess
 import diagrams
 from problem import Problem
 
-FOLDERS = pathlib.Path(__file__).with_name("modules.txt")
+LIST = pathlib.Path(__file__).with_name("modules.txt")
 
 # folder: as modules.txt has it; sources: the folder of its module-info.java;
 # both below the project's root.
 Module = collections.namedtuple("Module", "name folder sources")
 
 
+def listed(kind):
+    """What the list has of that kind: module or jar."""
+    words = (line.split("#")[0].split() for line in LIST.read_text("utf-8").splitlines())
+    return [entry[1] for entry in words if entry and entry[0] == kind]
+
+
 def find_modules(root):
     modules = []
-    for line in FOLDERS.read_text("utf-8").splitlines():
-        folder = line.split("#")[0].strip()
-        for info in sorted((root / folder).rglob("module-info.java")) if folder else []:
+    for folder in listed("module"):
+        for info in sorted((root / folder).rglob("module-info.java")):
             name = re.search(r"^(?:open )?module ([\w.]+)", info.read_text("utf-8"), re.MULTILINE)
             if name is None:
                 raise Problem([f"{info.relative_to(root)}:1: declares no module"])
@@ -33,9 +38,12 @@ def build(javadoc, root, modules, site):
     if not modules:
         return
     names = ",".join(module.name for module in modules)
-    command = [javadoc, "-quiet", "-Xdoclint:all", "-Werror", "-notimestamp", "--release", "17",
+    command = [javadoc, "-quiet", "-Werror", "-notimestamp", "--release", "17",
                "-encoding", "UTF-8", "-docencoding", "UTF-8", "--module", names,
                "-d", str(site / "api"), *options_of(javadoc)]
+    jars = [jar for jar in listed("jar") if pathlib.Path(jar).is_file()]
+    if jars:
+        command += ["--module-path", ":".join(jars)]
     for module in modules:
         command += ["--module-source-path", f"{module.name}={root / module.sources}"]
     done = subprocess.run(command, capture_output=True, encoding="utf-8", check=False)
@@ -43,6 +51,7 @@ def build(javadoc, root, modules, site):
         said = (done.stdout + done.stderr).replace(f"{root}/", "")
         raise Problem([said.strip()])
     drop_lacking_letters(site / "api")
+    name_constants(site / "api/constant-values.html")
     for module in modules:
         place = site / "api" / module.name
         diagrams.draw_doc_files(
@@ -50,9 +59,13 @@ def build(javadoc, root, modules, site):
 
 
 def options_of(javadoc):
-    """Newer ones take letters from elsewhere, or bring them along."""
-    done = subprocess.run([javadoc, "--help"], capture_output=True, encoding="utf-8", check=False)
-    return ["--no-fonts"] if "--no-fonts" in done.stdout else []
+    said = subprocess.run([javadoc, "--version"], capture_output=True, encoding="utf-8",
+                          check=True).stdout
+    version = int(re.search(r"\d+", said)[0])
+    # Before 21, records' compact constructors need the comments that they cannot have.
+    options = ["-Xdoclint:all" if version >= 21 else "-Xdoclint:all,-missing"]
+    # From 23 on, the pages bring letters along unless this says otherwise.
+    return options + ["--no-fonts"] if version >= 23 else options
 
 
 def drop_lacking_letters(folder):
@@ -64,6 +77,16 @@ def drop_lacking_letters(folder):
                       text, flags=re.MULTILINE)
         if kept != text:
             sheet.write_text(kept, "utf-8")
+
+
+def name_constants(page):
+    """The list at its top links to anchors that Java 17's Javadoc names otherwise."""
+    if page.is_file():
+        text = page.read_text("utf-8")
+        page.write_text(re.sub(
+            r'<h2 title="([^"]+)">',
+            lambda found: found[0] if f'id="{found[1]}"' in text
+            else f'<h2 title="{found[1]}" id="{found[1]}">', text), "utf-8")
 
 
 def page_of(path, modules, site):

@@ -94,8 +94,6 @@ def complain(site, reference, anchors):
         place = type(place)(os.path.normpath(place.parent / path))
         if path.startswith("/") or ".." in place.parts:
             return "leads out of the documentation"
-        if (site / place).is_dir():
-            return "is a folder without a page"
         if not (site / place).is_file():
             return "there is no such file"
     fragment = urllib.parse.unquote(parts.fragment)
