@@ -93,7 +93,6 @@ function(orv_install_player target)
   install(FILES ${desktop}.desktop DESTINATION ${CMAKE_INSTALL_DATADIR}/applications COMPONENT player)
   install(FILES ${desktop}.svg DESTINATION ${CMAKE_INSTALL_DATADIR}/icons/hicolor/scalable/apps
     COMPONENT player)
-  install(FILES ${desktop}.metainfo.xml DESTINATION ${CMAKE_INSTALL_DATADIR}/metainfo COMPONENT player)
   if(ORV_MANUALS)
     orv_install_manuals(${target})
   endif()
