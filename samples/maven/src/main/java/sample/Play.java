@@ -2,6 +2,7 @@
 package sample;
 
 import com.quintora.mmp.MediaException;
+import com.quintora.mmp.MediaPlayer;
 import com.quintora.mmp.OrvMediaPlayer;
 import com.quintora.mmp.PlayerListener;
 import java.util.concurrent.CompletableFuture;
@@ -12,20 +13,20 @@ public final class Play {
 
     public static void main(String[] arguments) throws Exception {
         CompletableFuture<String> end = new CompletableFuture<>();
-        try (OrvMediaPlayer player = new OrvMediaPlayer()) {
+        try (MediaPlayer player = new OrvMediaPlayer()) {
             player.addListener(new PlayerListener() {
                 @Override
-                public void onCompletion(OrvMediaPlayer source) {
+                public void onCompletion(MediaPlayer source) {
                     end.complete("played to the end");
                 }
 
                 @Override
-                public void onError(OrvMediaPlayer source, MediaException error) {
+                public void onError(MediaPlayer source, MediaException error) {
                     end.completeExceptionally(error);
                 }
             });
             player.setDataSource(arguments[0]);
-            player.prepare();
+            player.prepareAndWait();
             System.out.println("duration: " + player.getDuration() + " ms");
             player.tracks().video().forEach(System.out::println);
             player.tracks().audio().forEach(System.out::println);
