@@ -73,7 +73,8 @@ class Project(unittest.TestCase):
 class PagesTest(Project):
     def test_pages_link_to_each_other_and_stand_in_the_index(self):
         self.assert_builds()
-        self.assertIn('<a href="docs/guide.html#a-second--part">guide</a>', self.page("README.html"))
+        self.assertIn('<a href="docs/guide.html#a-second--part">guide</a>',
+                      self.page("README.html"))
         self.assertIn('<h2 id="a-second--part">', self.page("docs/guide.html"))
         self.assertIn('<a href="../README.html#one">up</a>', self.page("docs/guide.html"))
         index = self.page("index.html")
@@ -104,7 +105,8 @@ class PagesTest(Project):
         self.assertEqual(self.page("samples/one/Sample.txt"), "A sample.\n")
 
     def test_addresses_elsewhere_are_listed(self):
-        self.write("docs/more.md", "# More\n\n[a](https://example.org/x#y) <https://example.org/>\n")
+        self.write("docs/more.md",
+                   "# More\n\n[a](https://example.org/x#y) <https://example.org/>\n")
         self.assert_builds()
         self.assertEqual((self.out / "external-links.txt").read_text("utf-8").splitlines(),
                          ["https://example.org/", "https://example.org/x#y"])

@@ -79,8 +79,9 @@ def draw(tokens, source):
 
 
 def text_of(inline):
-    return "".join(" " if child.type == "softbreak" else child.content
-                   for child in inline.children if child.type in ("text", "code_inline", "softbreak"))
+    kept = (child for child in inline.children
+            if child.type in ("text", "code_inline", "softbreak"))
+    return "".join(" " if child.type == "softbreak" else child.content for child in kept)
 
 
 def title_of(tokens, source):
