@@ -80,8 +80,8 @@ class UnitsTest {
         Wait.until("the first runs", () -> natives.count("step") == 1);
         CompletableFuture<Void> waiting = units.trickPlay.step(2);
         units.lifetime.resetAndWait();
-        prepare();
         go.countDown();
+        prepare();
         running.handle((done, thrown) -> null).join();
         Throwable thrown = assertThrows(CompletionException.class, waiting::join).getCause();
         assertEquals("step() was ended by a reset", thrown.getMessage());
