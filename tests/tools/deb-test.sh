@@ -24,6 +24,10 @@ for package in $(build_depends); do
     case $package in debhelper-compat) package=debhelper ;; esac
     grep -qx -- "$package" <<<"$listed" || fail "$package of debian/control is not in the lists of packages"
 done
+# The other way round: a library that ./orv play installs to build with.
+while read -r package; do
+    build_depends | grep -qx -- "$package" || fail "$package of packages-play.txt is not in debian/control"
+done < <(awk '$1 ~ /(-dev|-headers|^lib.*-java)$/ {print $1}' "$root/tools/packages-play.txt")
 [ "$(build_depends | wc -l)" -gt 15 ] || fail "few build dependencies: $(build_depends | paste -sd' ')"
 
 cmake --install "$ORV_BUILD" --prefix "$folder/usr" >"$folder/log" 2>&1 || fail "install: $(tail -n 5 "$folder/log")"
