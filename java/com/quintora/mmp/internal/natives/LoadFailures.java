@@ -63,8 +63,13 @@ final class LoadFailures {
         return because(advice.isEmpty() ? text : text + " " + advice, cause);
     }
 
+    /** The machine and the linker may both have put it in front. */
     private static String withoutFile(String message, String file) {
-        return message.startsWith(file + ": ") ? message.substring(file.length() + 2) : message;
+        String rest = message;
+        while (rest.startsWith(file + ": ")) {
+            rest = rest.substring(file.length() + 2);
+        }
+        return rest;
     }
 
     private static String advice(String message) {
