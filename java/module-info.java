@@ -8,7 +8,8 @@
  */
 module com.quintora.mmp {
     requires transitive com.quintora.mmp.platform;
-    requires static transitive org.jetbrains.annotations;
+    // Not transitive: a module that requires this one could not be compiled without it.
+    requires static org.jetbrains.annotations;
 
     exports com.quintora;
     exports com.quintora.mmp;

@@ -55,3 +55,15 @@ play left shared &
 play right shared
 wait $! || exit 1
 [ -z "$(find "$folder/shared" -name '*.part')" ] || fail "something half is left in the cache"
+
+# A module that requires the player's needs nothing but the same JARs.
+mkdir "$folder/module"
+echo 'module play { requires com.quintora.mmp; }' >"$folder/module/module-info.java"
+"$JAVA_HOME/bin/javac" -p "$folder/sample/target/lib" -d "$folder/play" "$folder/module/module-info.java" \
+    "$folder/sample/src/main/java/sample/Play.java" || fail "the sample does not compile as a module"
+XDG_CACHE_HOME=$folder/modular "$JAVA_HOME/bin/java" -Djava.library.path="$folder" \
+    --enable-native-access=com.quintora.mmp -p "$folder/sample/target/lib:$folder/play" \
+    -m play/sample.Play "$ORV_MEDIA/short.mp4" >"$folder/modular.out" 2>&1 || true
+grep -q '^played to the end$' "$folder/modular.out" ||
+    fail "the sample printed as a module: $(cat "$folder/modular.out")"
+[ -d "$folder/modular/mediaplayer-orv" ] || fail "nothing was unpacked for the module"
