@@ -51,6 +51,17 @@ play() {
 play alone cache
 find "$folder/cache/mediaplayer-orv" -name libmediaplayer_orv.so | grep -q . ||
     fail "nothing was unpacked"
+cat >"$folder/First.java" <<'END'
+public class First {
+    public static void main(String[] arguments) throws Exception {
+        Class.forName("android.view.Surface");
+        System.out.println("loaded");
+    }
+}
+END
+XDG_CACHE_HOME=$folder/first-cache "$JAVA_HOME/bin/java" -Djava.library.path="$folder" \
+    -cp "$folder/sample/target/lib/*" "$folder/First.java" >"$folder/First.out" 2>&1 ||
+    fail "the desktop's classes do not find their library: $(cat "$folder/First.out")"
 play left shared &
 play right shared
 wait $! || exit 1

@@ -82,6 +82,19 @@ final class NativeBundle {
         return List.copyOf(entries);
     }
 
+    /**
+     * The file with that library, such as "libx.so": of that name, or of it and the number of its
+     * interface. Throws an IOException with a sentence when there is none.
+     */
+    String fileOf(String library) throws IOException {
+        for (Entry entry : entries) {
+            if (entry.name().equals(library) || entry.name().startsWith(library + ".")) {
+                return entry.name();
+            }
+        }
+        throw new IOException(place + " lists no " + library);
+    }
+
     /** The bytes of that library; throws an IOException when they are not those of the list. */
     byte[] read(Entry entry) throws IOException {
         byte[] bytes = contents.read(entry.name());

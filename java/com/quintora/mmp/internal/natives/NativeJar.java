@@ -7,39 +7,43 @@ import java.util.List;
 
 /** The libraries of the native JAR that goes with this virtual machine, unpacked. */
 final class NativeJar {
-    /** Where this process has its libraries, once they are unpacked: all come from one folder. */
-    private static Path unpacked;
+    /** What this process has unpacked, and where; null before. All libraries are from one bundle. */
+    private static NativeBundle bundle;
 
-    private static String system;
+    private static Path folder;
 
     private NativeJar() {}
 
     /**
-     * The file of that name in the folder that they are unpacked into. Throws an
-     * UnsatisfiedLinkError with sentences when there is no fitting native JAR, or no place for it.
+     * The unpacked file with that library, such as "libx.so". Throws an UnsatisfiedLinkError with
+     * sentences when there is no fitting native JAR, or no place for it.
      */
-    static synchronized Path library(String fileName) {
-        if (unpacked == null) {
-            NativeBundle bundle =
+    static synchronized Path library(String name) {
+        if (bundle == null) {
+            NativeBundle chosen =
                     choose(BundleFinder.ofThisVm(), Machine.ofThisVm(), JavaVersion.read());
-            unpacked = CacheFolder.ofThisVm().unpack(bundle);
-            system = bundle.system();
+            folder = CacheFolder.ofThisVm().unpack(chosen);
+            bundle = chosen;
         }
-        return unpacked.resolve(fileName);
+        try {
+            return folder.resolve(bundle.fileOf(name));
+        } catch (IOException e) {
+            throw LoadFailures.because("The native JAR is not whole: " + e.getMessage(), e);
+        }
     }
 
     /** What the unpacked libraries were built on, as in "Debian 12"; null before there are any. */
     static synchronized String system() {
-        return system;
+        return bundle == null ? null : bundle.system();
     }
 
     /** The bundle for that machine and of that version; of any version where that is null. */
     static NativeBundle choose(BundleFinder finder, Machine machine, String version) {
         try {
             List<NativeBundle> bundles = finder.find(machine);
-            for (NativeBundle bundle : bundles) {
-                if (version == null || bundle.version().equals(version)) {
-                    return bundle;
+            for (NativeBundle found : bundles) {
+                if (version == null || found.version().equals(version)) {
+                    return found;
                 }
             }
             throw bundles.isEmpty()

@@ -38,6 +38,17 @@ class NativeBundleTest {
     }
 
     @Test
+    void aLibraryMayHaveTheNumberOfItsInterfaceInItsName() throws Exception {
+        byte[] bytes = Bundles.bytes("x");
+        NativeBundle bundle = Bundles.bundle("1",
+                Map.of("libplain.so", bytes, "libnumbered.so.1", bytes));
+        assertEquals("libplain.so", bundle.fileOf("libplain.so"));
+        assertEquals("libnumbered.so.1", bundle.fileOf("libnumbered.so"));
+        assertEquals("here lists no libnumber.so",
+                assertThrows(IOException.class, () -> bundle.fileOf("libnumber.so")).getMessage());
+    }
+
+    @Test
     void aDamagedJarIsRecognized() throws Exception {
         Map<String, byte[]> files = Bundles.twoFiles();
         String list = Bundles.list("1", files);
