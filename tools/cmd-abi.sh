@@ -1,6 +1,6 @@
 # SPDX-License-Identifier: Apache-2.0
 # shellcheck shell=bash
-# help: abi [--accept]               compares the exported interface with abi/, on both architectures; --accept records it
+# help: abi [--accept]               compares the exported interface with abi/, on both architectures, and the public Java API; --accept records it
 use packages build
 
 mode=check
@@ -11,7 +11,7 @@ case ${1:-} in
 esac
 
 need_packages "compare interfaces" play test armhf
-build_targets on mediaplayer_orv orvtarn contract_tests
+build_targets on mediaplayer_orv orvtarn contract_tests java_modules
 "$ORV_ROOT/tools/armhf-build" mediaplayer_orv orvtarn
 
 # list_engine_needs BUILD: what the product built there needs of an engine.
@@ -23,6 +23,8 @@ failed=
 for target in "$ORV_BUILD" "$ORV_BUILD/armhf"; do
     "$ORV_ROOT/tools/abi" "$mode" "$target/lib/libmediaplayer_orv.so" || failed=yes
 done
+"$ORV_ROOT/tools/inspect/java_api.py" "$mode" "$ORV_BUILD/java/modules.txt" \
+    "$ORV_ROOT/abi/java-api.txt" --java "$JAVA_HOME/bin/java" || failed=yes
 if [ "$mode" = accept ]; then
     list_engine_needs "$ORV_BUILD" >"$ORV_ROOT/abi/engine.x86_64.txt"
     list_engine_needs "$ORV_BUILD/armhf" >"$ORV_ROOT/abi/engine.armhf.txt"
