@@ -62,7 +62,7 @@ public final class Main {
                 .registerConverter(int.class, Main::wholeNumber)
                 .registerConverter(Integer.class, Main::wholeNumber)
                 .registerConverter(double.class, Main::number)
-                .setParameterExceptionHandler(Main::tellUsage)
+                .setParameterExceptionHandler(Main::sayUsage)
                 .setExecutionExceptionHandler(Main::tellFailure);
     }
 
@@ -92,10 +92,12 @@ public final class Main {
         }
     }
 
-    private static int tellUsage(ParameterException problem, String[] arguments) {
+    private static int sayUsage(ParameterException problem, String[] arguments) {
         CommandLine command = problem.getCommandLine();
         say(command, sentence(problem));
-        say(command, "see ./orv " + command.getCommandName() + " --help");
+        // The installed player is called otherwise than that of a checkout.
+        String orv = System.getProperty("orv.command", "./orv");
+        say(command, "see " + orv + " " + command.getCommandName() + " --help");
         return CommandLine.ExitCode.USAGE;
     }
 
