@@ -7,7 +7,7 @@ import java.util.List;
 
 /** The libraries of the native JAR that goes with this virtual machine, unpacked. */
 final class NativeJar {
-    /** What this process has unpacked, and where; null before. All libraries are from one bundle. */
+    /** What this process unpacked, and where; null before. All libraries are from one bundle. */
     private static NativeBundle bundle;
 
     private static Path folder;
