@@ -25,7 +25,7 @@ def dynamic(library):
         if tag.entry.d_tag == "DT_NEEDED":
             needed.append(tag.needed)
         elif tag.entry.d_tag == "DT_RUNPATH":
-            folders += tag.runpath.split(":")
+            folders += filter(None, tag.runpath.split(":"))
     return needed, folders
 
 
