@@ -6,7 +6,8 @@
  */
 module com.quintora.mmp.testing {
     requires transitive com.quintora.mmp;
-    requires static transitive org.jetbrains.annotations;
+    // Not transitive: a module that requires this one could not be compiled without it.
+    requires static org.jetbrains.annotations;
 
     exports com.quintora.mmp.testing;
 }

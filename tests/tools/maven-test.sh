@@ -77,4 +77,9 @@ XDG_CACHE_HOME=$folder/modular "$JAVA_HOME/bin/java" -Djava.library.path="$folde
     -m play/sample.Play "$ORV_MEDIA/short.mp4" >"$folder/modular.out" 2>&1 || true
 grep -q '^played to the end$' "$folder/modular.out" ||
     fail "the sample printed as a module: $(cat "$folder/modular.out")"
+mkdir "$folder/testing"
+echo 'module check { requires com.quintora.mmp.testing; }' >"$folder/testing/module-info.java"
+testing=$(echo "$folder"/first/com/quintora/mmp/mediaplayer-orv-testing/*/*[0-9].jar)
+"$JAVA_HOME/bin/javac" -p "$folder/sample/target/lib:$testing" -d "$folder/check" \
+    "$folder/testing/module-info.java" || fail "a test does not compile as a module"
 [ -d "$folder/modular/mediaplayer-orv" ] || fail "nothing was unpacked for the module"

@@ -9,7 +9,7 @@ import sys
 import xml.etree.ElementTree
 
 POM = "{http://maven.apache.org/POM/4.0.0}"
-NAMES = ["mediaplayer-orv", "mediaplayer-orv-platform"]
+NAMES = ["mediaplayer-orv", "mediaplayer-orv-platform", "mediaplayer-orv-testing"]
 # Gradle chooses among variants by these.
 ATTRIBUTES = {"org.gradle.category", "org.gradle.dependency.bundling", "org.gradle.usage"}
 SUMS = ["md5", "sha1", "sha256"]
