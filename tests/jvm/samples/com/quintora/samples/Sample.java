@@ -29,10 +29,12 @@ public final class Sample implements AutoCloseable {
     private final Path errors = Files.createTempFile("sample", ".err");
 
     private Sample(List<String> command) throws IOException {
-        process = new ProcessBuilder(command)
+        ProcessBuilder builder = new ProcessBuilder(command)
                 .redirectOutput(output.toFile())
-                .redirectError(errors.toFile())
-                .start();
+                .redirectError(errors.toFile());
+        // Beside the JDK's own folders, in which JavaFX has its libraries.
+        builder.environment().put("LD_LIBRARY_PATH", System.getProperty("java.library.path"));
+        process = builder.start();
     }
 
     public static List<Path> sources() throws IOException {
@@ -65,7 +67,7 @@ public final class Sample implements AutoCloseable {
         List<String> command =
                 new ArrayList<>(List.of(System.getProperty("orv.test.java").split("\\|")));
         command.addAll(List.of("--enable-native-access=ALL-UNNAMED", "-XX:+UseSerialGC",
-                "-Djava.library.path=" + System.getProperty("java.library.path"), "-cp", jars));
+                "-XX:TieredStopAtLevel=1", "-cp", jars));
         if (name.equals("PlayInJavaFx")) {
             command.addAll(List.of("--module-path", JAVAFX, "--add-modules", "javafx.graphics"));
         }
