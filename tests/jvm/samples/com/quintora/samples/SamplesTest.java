@@ -89,11 +89,10 @@ class SamplesTest {
         assertTrue(result.output().get(0).contains("error MALFORMED: "), result.output().get(0));
     }
 
-    // Both have their index at the end: they are sought to and fro.
     @ParameterizedTest
     @ValueSource(ints = {ZipEntry.STORED, ZipEntry.DEFLATED})
     void anEntryOfAZipFilePlaysToTheEnd(int method) throws Exception {
-        byte[] film = Files.readAllBytes(Path.of(Media.path("silent.mp4")));
+        byte[] film = film();
         Path archive = folder.resolve("films.zip");
         try (ZipOutputStream zip = new ZipOutputStream(Files.newOutputStream(archive))) {
             ZipEntry entry = new ZipEntry("some/film.mp4");
@@ -121,7 +120,7 @@ class SamplesTest {
         Cipher cipher = Cipher.getInstance("AES/CTR/NoPadding");
         cipher.init(Cipher.ENCRYPT_MODE, new SecretKeySpec(HexFormat.of().parseHex(key), "AES"),
                 new IvParameterSpec(iv));
-        byte[] film = Files.readAllBytes(Path.of(Media.path("silent.mp4")));
+        byte[] film = film();
         Path secret = folder.resolve("film.aes");
         try (OutputStream out = Files.newOutputStream(secret)) {
             out.write(iv);
@@ -140,6 +139,18 @@ class SamplesTest {
             assertTrue(result.errors().toString().contains("the key must have 16, 24 or 32 bytes"),
                     result.errors().toString());
         }
+    }
+
+    /** A second of noise, some MB, with its index at the end: it cannot be read in one go. */
+    private byte[] film() throws Exception {
+        Path file = folder.resolve("noise.mp4");
+        Media.run("ffmpeg", "-v", "error", "-nostdin", "-f", "lavfi", "-i",
+                "color=gray:size=640x360:rate=30:duration=1,noise=alls=100:allf=t", "-c:v",
+                "libx264", "-preset", "ultrafast", "-qp", "10", "-pix_fmt", "yuv420p",
+                file.toString());
+        byte[] film = Files.readAllBytes(file);
+        assertTrue(film.length > 4_000_000, "it has " + film.length + " bytes");
+        return film;
     }
 
     private static Sample.Result run(String name, String... args) throws Exception {

@@ -18,6 +18,7 @@ import java.util.Arrays;
 import java.util.concurrent.FutureTask;
 import java.util.concurrent.TimeUnit;
 import java.util.function.IntPredicate;
+import java.util.stream.IntStream;
 import org.junit.jupiter.api.Test;
 import org.junit.jupiter.api.io.TempDir;
 
@@ -51,9 +52,12 @@ class WindowSamplesTest {
     @Test
     void aWallShowsAllFilms() throws Exception {
         FutureTask<Void> program = run("Wall", film(BLUE), film(GREEN), film(ORANGE));
-        for (int colour : new int[] {BLUE, GREEN, ORANGE}) {
-            awaitPixels("a film of " + Integer.toHexString(colour), near(colour), CELL * 8 / 10);
-        }
+        Robot robot = new Robot();
+        Wait.until("the screen shows all films at once", () -> {
+            int[] screen = capture(robot);
+            return IntStream.of(BLUE, GREEN, ORANGE)
+                    .allMatch(colour -> count(screen, near(colour)) >= CELL * 8 / 10);
+        });
         closeWindow(program);
     }
 
@@ -97,19 +101,22 @@ class WindowSamplesTest {
 
     private static void awaitPixels(String what, IntPredicate wanted, int least) throws Exception {
         Robot robot = new Robot();
-        Wait.until("the screen shows " + what, () -> count(robot, wanted) >= least);
+        Wait.until("the screen shows " + what, () -> count(capture(robot), wanted) >= least);
     }
 
     private static void awaitNone(IntPredicate wanted) throws Exception {
         Robot robot = new Robot();
-        Wait.until("the window is gone", () -> count(robot, wanted) == 0);
+        Wait.until("the window is gone", () -> count(capture(robot), wanted) == 0);
     }
 
-    private static long count(Robot robot, IntPredicate wanted) {
+    private static int[] capture(Robot robot) {
         BufferedImage screen = robot.createScreenCapture(
                 new Rectangle(Toolkit.getDefaultToolkit().getScreenSize()));
-        int[] pixels = screen.getRGB(
+        return screen.getRGB(
                 0, 0, screen.getWidth(), screen.getHeight(), null, 0, screen.getWidth());
+    }
+
+    private static long count(int[] pixels, IntPredicate wanted) {
         return Arrays.stream(pixels).filter(wanted).count();
     }
 
