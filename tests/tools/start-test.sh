@@ -59,7 +59,7 @@ ORV_LOG=verbose "${java[@]}" "${jar[@]}" info --help >"$folder/log" 2>&1 || fail
 # What they lack is said as if they were loaded by whom they are for.
 ! "${java[@]/#-Djava.library.path=*/-Djava.library.path=$folder}" "${jar[@]}" \
     info "$ORV_MEDIA/short.mp4" >"$folder/log" 2>&1 || fail "no library: exit status 0"
-grep -q "UnsatisfiedLinkError: the player's native library .* did not load" "$folder/log" ||
+grep -q "UnsatisfiedLinkError: There is no native library of the player for .*No folder of java.library.path has" "$folder/log" ||
     fail "no library: $(head -n 3 "$folder/log")"
 
 # Where no archive can be made, only the first start of a build tries. It needs no Java
