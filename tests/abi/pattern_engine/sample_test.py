@@ -47,7 +47,7 @@ class SampleTest(unittest.TestCase):
             (folder / "prefix/lib").mkdir()
             shutil.copy(PLATFORM, folder / "prefix/lib/liborv_platform.so")
             shutil.copytree(SAMPLE, folder / "sample")
-            for command in (["-S", folder / "sample", "-B", folder / "out",
+            for command in (["-G", "Ninja", "-S", folder / "sample", "-B", folder / "out",
                              f"-DCMAKE_PREFIX_PATH={folder}/prefix"],
                             ["--build", folder / "out"]):
                 done = subprocess.run(["cmake", *command], capture_output=True, text=True)

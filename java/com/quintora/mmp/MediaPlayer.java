@@ -374,7 +374,8 @@ public interface MediaPlayer extends AutoCloseable {
     int getVideoHeight();
 
     /**
-     * Chooses whether the media begins again at its end. Every state; outlasts a reset.
+     * Chooses whether the media begins again at its end. Every state but ERROR, in which the engine
+     * refuses; outlasts a reset.
      *
      * @param looping true to begin again
      * @throws IllegalStateException after release, or when the engine refuses

@@ -5,7 +5,7 @@ package com.quintora.mmp;
  * Where a player stands.
  *
  * <p>The usual way is {@link #IDLE}, {@link #INITIALIZED}, {@link #PREPARING}, {@link #PREPARED},
- * {@link #STARTED}, {@link #COMPLETED}. {@link OrvMediaPlayer#reset()} leads back to {@link #IDLE}
+ * {@link #STARTED}, {@link #COMPLETED}. {@link MediaPlayer#reset()} leads back to {@link #IDLE}
  * from everywhere but {@link #RELEASED}, which is final.
  */
 public enum PlayerState {
