@@ -51,6 +51,15 @@ public interface Pictures {
     Optional<byte[]> embedded();
 
     /**
+     * The frame at a time, on platforms whose native half can grab frames. Does not block.
+     *
+     * @param millis milliseconds from the start
+     * @return completed with the frame, with an empty one on platforms that cannot, see {@link
+     *     #thumbnail} there; exceptionally with an {@link IllegalStateException} after release
+     */
+    CompletableFuture<Optional<Bitmap>> frameAt(int millis);
+
+    /**
      * The frame at a time, on platforms whose native half can grab frames. Blocks while it is
      * decoded.
      *

@@ -64,6 +64,17 @@ public interface Subtitles {
     SubtitleTrack addAndWait(String pathOrUrl) throws IOException;
 
     /**
+     * Adds subtitles that are a pair of files, and shows them; otherwise as {@link #add(String)}.
+     *
+     * @param pictures the path of the file with the pictures (.sub)
+     * @param index the path of the file with their times (.idx)
+     * @return as {@link #add(String)}
+     * @throws IllegalArgumentException when one of them is null
+     * @throws IllegalStateException when the player has no prepared media
+     */
+    CompletableFuture<SubtitleTrack> addPair(String pictures, String index);
+
+    /**
      * Adds subtitles that are a pair of files, and shows them; otherwise as {@link
      * #addAndWait(String)}.
      *
@@ -75,6 +86,17 @@ public interface Subtitles {
      * @throws IllegalStateException when the player has no prepared media
      */
     SubtitleTrack addPairAndWait(String pictures, String index) throws IOException;
+
+    /**
+     * Adds the timed text of a file or URL as a track, without showing it; otherwise as {@link
+     * #add(String)}.
+     *
+     * @param pathOrUrl a file's path, or a URL
+     * @return as {@link #add(String)}
+     * @throws IllegalArgumentException when it is null
+     * @throws IllegalStateException when the player has no prepared media
+     */
+    CompletableFuture<SubtitleTrack> addTimedText(String pathOrUrl);
 
     /**
      * Adds the timed text of a file or URL as a track, without showing it; otherwise as {@link

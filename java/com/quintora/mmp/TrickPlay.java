@@ -103,6 +103,18 @@ public interface TrickPlay {
     long getBytePosition() throws IOException;
 
     /**
+     * Goes to a place in the media's data. Does not block; such seeks are carried out in the order
+     * of their calls.
+     *
+     * @param position bytes from the start, below 2 GiB: the native half carries no more
+     * @return completed when its picture is shown; exceptionally with an {@link
+     *     IllegalStateException} when the engine cannot, or after a reset or release
+     * @throws IllegalArgumentException for a position out of range
+     * @throws IllegalStateException before the media is prepared
+     */
+    CompletableFuture<Void> seekToByte(long position);
+
+    /**
      * Goes to a place in the media's data, and blocks until its picture is shown or the engine
      * gives up waiting for it.
      *

@@ -38,11 +38,20 @@ final class FakePictures implements Pictures {
         });
     }
 
-    /** Empty, as where the native half cannot grab frames. */
+    @Override
+    public CompletableFuture<Optional<Bitmap>> frameAt(int millis) {
+        return CompletableFuture.completedFuture(noFrame("frameAt()"));
+    }
+
     @Override
     public Optional<Bitmap> frameAtAndWait(int millis) {
+        return noFrame("frameAtAndWait()");
+    }
+
+    /** As where the native half cannot grab frames. */
+    private Optional<Bitmap> noFrame(String call) {
         return session.guard.ask(() -> {
-            session.state.requireAlive("frameAtAndWait()");
+            session.state.requireAlive(call);
             return Optional.empty();
         });
     }

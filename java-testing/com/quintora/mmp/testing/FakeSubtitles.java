@@ -35,14 +35,19 @@ final class FakeSubtitles implements Subtitles {
     @Override
     public CompletableFuture<SubtitleTrack> add(String pathOrUrl) {
         required(pathOrUrl);
-        return session.guard.ask(() -> {
-            session.state.requireMedia("add()");
-            try {
-                return CompletableFuture.completedFuture(add("add()", pathOrUrl, true));
-            } catch (MediaException e) {
-                return CompletableFuture.failedFuture(e);
-            }
-        });
+        return future("add()", pathOrUrl, true);
+    }
+
+    @Override
+    public CompletableFuture<SubtitleTrack> addPair(String pictures, String index) {
+        required(pictures, index);
+        return future("addPair()", index, true);
+    }
+
+    @Override
+    public CompletableFuture<SubtitleTrack> addTimedText(String pathOrUrl) {
+        required(pathOrUrl);
+        return future("addTimedText()", pathOrUrl, false);
     }
 
     @Override
@@ -53,8 +58,7 @@ final class FakeSubtitles implements Subtitles {
 
     @Override
     public SubtitleTrack addPairAndWait(String pictures, String index) throws MediaException {
-        requireValue(pictures, "the path of the pictures");
-        requireValue(index, "the path of the index");
+        required(pictures, index);
         return add("addPairAndWait()", index, true);
     }
 
@@ -73,6 +77,17 @@ final class FakeSubtitles implements Subtitles {
         });
     }
 
+    private CompletableFuture<SubtitleTrack> future(String call, String name, boolean shown) {
+        return session.guard.ask(() -> {
+            session.state.requireMedia(call);
+            try {
+                return CompletableFuture.completedFuture(add(call, name, shown));
+            } catch (MediaException e) {
+                return CompletableFuture.failedFuture(e);
+            }
+        });
+    }
+
     private SubtitleTrack add(String call, String name, boolean shown) throws MediaException {
         return session.guard.ask(() -> {
             session.state.requireMedia(call);
@@ -84,6 +99,11 @@ final class FakeSubtitles implements Subtitles {
             Path file = Path.of(name).getFileName();
             return tables.addSubtitles(file == null ? name : file.toString(), shown);
         });
+    }
+
+    private static void required(@Nullable String pictures, @Nullable String index) {
+        requireValue(pictures, "the path of the pictures");
+        requireValue(index, "the path of the index");
     }
 
     private static void required(@Nullable String pathOrUrl) {

@@ -103,19 +103,35 @@ final class FakeTrickPlay implements TrickPlay {
     }
 
     @Override
+    public CompletableFuture<Void> seekToByte(long position) {
+        return session.guard.ask(() -> {
+            IllegalStateException failure = moveToByte("seekToByte", position);
+            return failure == null
+                    ? CompletableFuture.completedFuture(null)
+                    : CompletableFuture.failedFuture(failure);
+        });
+    }
+
+    @Override
     public void seekToByteAndWait(long position) {
         session.guard.run(() -> {
-            String call = "seekToByteAndWait(" + position + ")";
-            session.state.requireMedia("seekToByteAndWait()");
-            if (position < 0 || position > Integer.MAX_VALUE) {
-                throw new IllegalArgumentException(
-                        "the byte position is out of range: " + position);
+            IllegalStateException failure = moveToByte("seekToByteAndWait", position);
+            if (failure != null) {
+                throw failure;
             }
-            if (bytesPerMilli() == 0) {
-                throw new IllegalStateException("the engine refused " + call);
-            }
-            session.seekTo(position / bytesPerMilli());
         });
+    }
+
+    private @Nullable IllegalStateException moveToByte(String call, long position) {
+        session.state.requireMedia(call + "()");
+        if (position < 0 || position > Integer.MAX_VALUE) {
+            throw new IllegalArgumentException("the byte position is out of range: " + position);
+        }
+        if (bytesPerMilli() == 0) {
+            return new IllegalStateException("the engine refused " + call + "(" + position + ")");
+        }
+        session.seekTo(position / bytesPerMilli());
+        return null;
     }
 
     /** 0 when the size or the duration is unknown. */

@@ -44,6 +44,11 @@ public final class EnginePictures implements Pictures {
     }
 
     @Override
+    public CompletableFuture<Optional<Bitmap>> frameAt(int millis) {
+        return background.submitAlways("frameAt()", () -> frameAtAndWait(millis));
+    }
+
+    @Override
     public Optional<Bitmap> frameAtAndWait(int millis) {
         return commands.ask("frameAtAndWait()",
                 () -> Optional.ofNullable(natives.getFrameAt(millis)));

@@ -46,11 +46,22 @@ public final class EngineSubtitles implements Subtitles {
     }
 
     @Override
+    public CompletableFuture<SubtitleTrack> addPair(String pictures, String index) {
+        required(pictures, index);
+        return background.submit("addPair()", () -> addPairAndWait(pictures, index));
+    }
+
+    @Override
     public SubtitleTrack addPairAndWait(String pictures, String index) throws MediaException {
-        Arguments.require(pictures, "the path of the pictures");
-        Arguments.require(index, "the path of the index");
+        required(pictures, index);
         return add("addPairAndWait()", index,
                 () -> natives.setSubtitleDataSourceEx(pictures, index));
+    }
+
+    @Override
+    public CompletableFuture<SubtitleTrack> addTimedText(String pathOrUrl) {
+        required(pathOrUrl);
+        return background.submit("addTimedText()", () -> addTimedTextAndWait(pathOrUrl));
     }
 
     @Override
@@ -79,6 +90,11 @@ public final class EngineSubtitles implements Subtitles {
             }
             return after.get(after.size() - 1);
         }
+    }
+
+    private static void required(String pictures, String index) {
+        Arguments.require(pictures, "the path of the pictures");
+        Arguments.require(index, "the path of the index");
     }
 
     private static void required(String pathOrUrl) {

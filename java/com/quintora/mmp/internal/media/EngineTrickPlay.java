@@ -99,17 +99,35 @@ public final class EngineTrickPlay implements TrickPlay {
     }
 
     @Override
+    public CompletableFuture<Void> seekToByte(long position) {
+        commands.requireMedia("seekToByte()");
+        requireInRange(position);
+        return background.submit("seekToByte()", () -> {
+            seekTo("seekToByte(" + position + ")", position);
+            return null;
+        });
+    }
+
+    @Override
     public void seekToByteAndWait(long position) {
         commands.requireMedia("seekToByteAndWait()");
-        if (position < 0 || position > Integer.MAX_VALUE) {
-            throw new IllegalArgumentException("the byte position is out of range: " + position);
-        }
-        seeking.seek("seekToByteAndWait(" + position + ")", () -> natives.seekToPosition(position));
+        requireInRange(position);
+        seekTo("seekToByteAndWait(" + position + ")", position);
+    }
+
+    private void seekTo(String call, long position) {
+        seeking.seek(call, () -> natives.seekToPosition(position));
     }
 
     private boolean repeat(String call, int type) {
         commands.requireMedia(call);
         return commands.ask(call, () -> natives.setABRepeat(type) > 0);
+    }
+
+    private static void requireInRange(long position) {
+        if (position < 0 || position > Integer.MAX_VALUE) {
+            throw new IllegalArgumentException("the byte position is out of range: " + position);
+        }
     }
 
     private static boolean inRange(double speed) {

@@ -154,9 +154,21 @@ class FuturesTest extends PlayerFixture {
     }
 
     @Test
+    void theOtherFormsThatReturnAtOnceDoTheSame() throws Exception {
+        prepare("video.mp4");
+        assertEquals(Optional.empty(), await(player.pictures().frameAt(1000)));
+        await(player.trickPlay().seekToByte(0));
+        assertEquals(0, player.getCurrentPosition(), 500);
+        SubtitleTrack added = await(player.subtitles().addTimedText(Media.path("lines.srt")));
+        assertEquals(List.of(added), player.tracks().subtitles());
+        assertEquals(Optional.empty(), player.tracks().currentSubtitle());
+    }
+
+    @Test
     void whatIsWrongAtOnceIsThrownAtOnce() {
         assertThrows(IllegalStateException.class, () -> player.trickPlay().step(1));
         assertThrows(IllegalStateException.class, () -> player.subtitles().add("x.srt"));
+        assertThrows(IllegalStateException.class, () -> player.trickPlay().seekToByte(1));
         assertThrows(IllegalArgumentException.class,
                 () -> player.pictures().thumbnail(0, 9, ColorMode.XRGB8888));
         assertFalse(player.isPlaying());

@@ -9,6 +9,7 @@ import com.quintora.SubtitleAttr;
 import java.nio.file.Files;
 import java.nio.file.Path;
 import java.util.Optional;
+import java.util.List;
 import java.util.concurrent.ExecutionException;
 import java.util.function.IntPredicate;
 import java.util.function.Predicate;
@@ -235,9 +236,12 @@ class SubtitlesTest extends PlayerFixture {
         Path noise = Files.write(folder.resolve("noise.srt"), new byte[] {1, 2, 3, 4});
         assertMessage(noise + ": has no subtitles that can be read",
                 () -> player.subtitles().addAndWait(noise.toString()));
-        ExecutionException later = assertThrows(ExecutionException.class,
-                () -> player.subtitles().add("/no/such.srt").get());
-        assertEquals(none, later.getCause().getMessage());
+        for (var adding : List.of(player.subtitles().add("/no/such.srt"),
+                player.subtitles().addTimedText("/no/such.srt"),
+                player.subtitles().addPair("/no/such.sub", "/no/such.srt"))) {
+            ExecutionException later = assertThrows(ExecutionException.class, adding::get);
+            assertEquals(none, later.getCause().getMessage());
+        }
         assertEquals(0, player.native_addTimedTextSource("/no/such.srt"));
         assertEquals(2, player.tracks().subtitles().size());
         showSubtitle(0);
