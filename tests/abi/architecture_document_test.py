@@ -60,7 +60,7 @@ class ArchitectureDocumentTest(unittest.TestCase):
 
     def test_there_is_a_diagram_of_each_way(self):
         kinds = [re.match(r"digraph (\w+) \{", diagram)[1] for diagram in diagrams(self.text)]
-        self.assertEqual(kinds, ["layers", "call", "event", "read", "frame"])
+        self.assertEqual(kinds, ["layers", "java", "call", "event", "read", "frame"])
 
     def test_an_arrow_leads_from_box_to_box(self):
         for diagram in diagrams(self.text):
