@@ -174,16 +174,15 @@ TEST_F(StreamSourceTest, ASourceThatMayStallIsWaitedFor) {
 
 class BlockedReadTest : public StreamSourceTest {
 protected:
-    // Runs the operation while a read blocks in the middle of the media.
+    // Runs the operation while a read blocks in the middle of the media: that ends the
+    // read, and does not wait until the engine gives a read up, after half a minute.
     void expectPrompt(const std::function<void()>& operation) {
         const auto begin = std::chrono::steady_clock::now();
         operation();
-        const std::chrono::duration<double, std::milli> whole =
-            std::chrono::steady_clock::now() - begin;
-        const std::chrono::duration<double, std::milli> read = stream->unblockedAt() - begin;
-        EXPECT_GT(read.count(), 0);
-        EXPECT_LT(read.count(), 100);
-        EXPECT_LT(whole.count(), 1000);
+        const auto end = std::chrono::steady_clock::now();
+        EXPECT_GT(stream->unblockedAt(), begin);
+        EXPECT_LE(stream->unblockedAt(), end);
+        EXPECT_LT(end - begin, std::chrono::seconds(15));
         EXPECT_GE(stream->mCancels, 1);
     }
 
