@@ -85,9 +85,12 @@ class EventQueueTest {
         EventQueue queue = new EventQueue(other, any -> true);
         CountDownLatch entered = new CountDownLatch(1);
         AtomicBoolean left = new AtomicBoolean();
+        Thread clearing = Thread.currentThread();
         queue.add(0, () -> {
             entered.countDown();
-            sleep(20);
+            while (clearing.getState() != Thread.State.TIMED_WAITING) {
+                Thread.onSpinWait();
+            }
             left.set(true);
         });
         queue.flush();
@@ -201,14 +204,6 @@ class EventQueueTest {
         queue.flush();
         Wait.until("the new one was handed over again", () -> handedOver.get() > 2);
         assertEquals(List.of(), ran);
-    }
-
-    private static void sleep(long millis) {
-        try {
-            Thread.sleep(millis);
-        } catch (InterruptedException e) {
-            throw new AssertionError(e);
-        }
     }
 
     private static void awaitUninterrupted(CountDownLatch latch) {
