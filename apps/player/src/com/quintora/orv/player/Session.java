@@ -85,8 +85,17 @@ public final class Session implements AutoCloseable {
         }
     }
 
-    /** Opens the media and brings it to where it shall begin. */
+    /** Opens the media and brings it to where it shall begin; a session that fails has ended. */
     public void open() throws Failure {
+        try {
+            openMedia();
+        } catch (Failure e) {
+            ended.countDown();
+            throw e;
+        }
+    }
+
+    private void openMedia() throws Failure {
         try {
             setSource();
             if (!isOnView) {
