@@ -19,4 +19,10 @@ int tryFromAnotherThread(os::Mutex& mutex) {
     return result;
 }
 
+bool isAwaited(os::Mutex& mutex) {
+    // As glibc's mutexes have it: 0 for free, 1 for taken, 2 for taken and awaited.
+    const int* lock = &(mutex.*memberOf(NativeMutex{})).__data.__lock;
+    return __atomic_load_n(lock, __ATOMIC_RELAXED) > 1;
+}
+
 }  // namespace orvtest

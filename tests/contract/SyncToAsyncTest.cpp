@@ -5,7 +5,9 @@
 #include <sys/prctl.h>
 
 #include <algorithm>
+#include <atomic>
 #include <set>
+#include <thread>
 
 #include "DispatcherFixture.h"
 #include "MutexProbe.h"
@@ -222,13 +224,14 @@ TEST_F(SyncToAsyncTest, AbortAllLeavesOtherServicesAndLaterActionsAlone) {
     addHandler(other, "two");
     {
         const Hold held = hold();
-        dispatcher->addAction(action(service, 1));
-        dispatcher->addAction(action(other, 2));
+        dispatcher->addAction(action(other, 1));
+        dispatcher->addAction(action(service, 2));
+        dispatcher->addAction(action(other, 3));
         dispatcher->abortAllActions(service, false);
-        dispatcher->addAction(action(service, 3));
+        dispatcher->addAction(action(service, 4));
     }
-    waitForPauses(2);
-    EXPECT_THAT(posted(), ElementsAre("\"two\" 2", "\"one\" 3"));
+    waitForPauses(3);
+    EXPECT_THAT(posted(), ElementsAre("\"two\" 1", "\"two\" 3", "\"one\" 4"));
     dispatcher->delMsgHandler(other);
 }
 
@@ -253,6 +256,33 @@ TEST_F(SyncToAsyncTest, AbortOfADeliveredActionChangesNothing) {
     dispatcher->abortAction(delivered);
     EXPECT_THAT(posted(), ElementsAre("\"one\" 1"));
     EXPECT_THAT(dispatcherLines(), IsEmpty());
+}
+
+TEST_F(SyncToAsyncTest, EachChangeWaitsForTheMutex) {
+    const android::sp<ORV::MsgDispatcher> poster =
+        new ORV::MsgDispatcher(vm.env(), vm.local(player), string("two"));
+    ORV::SyncToAsyncAction unlisted;
+    const std::pair<const char*, std::function<void()>> changes[] = {
+        {"addAction", [&] { dispatcher->addAction(action(service, 1)); }},
+        {"abortAction", [&] { dispatcher->abortAction(&unlisted); }},
+        {"abortAllActions", [&] { dispatcher->abortAllActions(service, true); }},
+        {"addMsgHandler", [&] { dispatcher->addMsgHandler(service, poster); }},
+        {"delMsgHandler", [&] { dispatcher->delMsgHandler(service); }}};
+    for (const auto& [name, change] : changes) {
+        std::atomic<bool> done{false};
+        std::thread changing;
+        {
+            const Hold held = hold();
+            changing = std::thread([&, &run = change] {
+                run();
+                done = true;
+            });
+            while (!done && !isAwaited(dispatcherMutex())) std::this_thread::yield();
+            EXPECT_FALSE(done) << name << " does not wait";
+        }
+        changing.join();
+    }
+    waitForPauses(1);
 }
 
 TEST_F(SyncToAsyncTest, MutexIsHeldWhileJavaRunsAndInThePause) {
