@@ -16,6 +16,7 @@ import java.util.stream.Stream;
 public final class Sample implements AutoCloseable {
     private static final Path FOLDER = Path.of(System.getProperty("orv.test.samples"));
     private static final String JAVAFX = System.getProperty("orv.test.javafx", "");
+    private static final String LIBRARIES = System.getProperty("java.library.path");
 
     /**
      * How it ended.
@@ -32,8 +33,8 @@ public final class Sample implements AutoCloseable {
         ProcessBuilder builder = new ProcessBuilder(command)
                 .redirectOutput(output.toFile())
                 .redirectError(errors.toFile());
-        // Beside the JDK's own folders, in which JavaFX has its libraries.
-        builder.environment().put("LD_LIBRARY_PATH", System.getProperty("java.library.path"));
+        // For JavaFX, whose own libraries java.library.path would hide.
+        builder.environment().put("LD_LIBRARY_PATH", LIBRARIES);
         process = builder.start();
     }
 
@@ -68,9 +69,9 @@ public final class Sample implements AutoCloseable {
                 new ArrayList<>(List.of(System.getProperty("orv.test.java").split("\\|")));
         command.addAll(List.of("--enable-native-access=ALL-UNNAMED", "-XX:+UseSerialGC",
                 "-XX:TieredStopAtLevel=1", "-cp", jars));
-        if (name.equals("PlayInJavaFx")) {
-            command.addAll(List.of("--module-path", JAVAFX, "--add-modules", "javafx.graphics"));
-        }
+        command.addAll(name.equals("PlayInJavaFx")
+                ? List.of("--module-path", JAVAFX, "--add-modules", "javafx.graphics")
+                : List.of("-Djava.library.path=" + LIBRARIES));
         command.add(main);
         command.addAll(List.of(args));
         return new Sample(command);
