@@ -136,7 +136,7 @@ final class JavaApi {
                         && !element.getEnclosingElement().getModifiers().contains(Modifier.FINAL));
     }
 
-    /** Annotations and modifiers, each with a space behind it. */
+    /** Annotations and modifiers, each with a space after it. */
     private static String marks(Element element) {
         Stream<String> modifiers = element.getModifiers().stream()
                 .filter(modifier -> modifier != Modifier.NATIVE

@@ -36,8 +36,8 @@ import org.jetbrains.annotations.Nullable;
  * <p><b>Threads.</b> Any thread may call any method at any time, also from inside a {@link
  * PlayerListener}. Calls that change whether the player runs wait for one another.
  *
- * <p><b>Blocking.</b> What takes its time has two forms. The plain one returns at once with a {@link
- * CompletableFuture}, which is completed on a thread of the library: go on from there with {@code
+ * <p><b>Blocking.</b> What takes its time has two forms. The plain one returns at once with a
+ * {@link CompletableFuture}, which is completed on a thread of the library: go on from there with {@code
  * thenAcceptAsync(..., executor)}. The one whose name ends in {@code AndWait} blocks until it is
  * done, says for how long at most, and throws what the future would have been completed with.
  * Arguments and states are checked before a method returns, in both forms; a future that reports
@@ -262,7 +262,8 @@ public interface MediaPlayer extends AutoCloseable {
     /**
      * Frees everything that the player holds; as {@link #release()}, but blocks until it is done:
      * at most 100 ms for a listener that is running on another thread, and as long as a method of
-     * a {@link MediaStreamSource} runs.
+     * a {@link MediaStreamSource} runs. Does nothing once a release has begun, also on another
+     * thread; its future says when that is done.
      *
      * @throws IllegalStateException when the engine fails; the player is released all the same
      */

@@ -9,8 +9,8 @@ import java.util.concurrent.atomic.AtomicReference;
 import org.jetbrains.annotations.Nullable;
 
 /**
- * Whoever waits for the end of an asynchronous prepare. Futures are completed on a thread without
- * locks, as foreign code follows them. Thread-safe.
+ * The future of an asynchronous prepare that has not ended. It is completed on a thread that holds
+ * no lock, as code of the program follows it. Thread-safe.
  */
 final class PendingPrepare {
     private record Waiting(int epoch, String source, CompletableFuture<Void> future) {}
