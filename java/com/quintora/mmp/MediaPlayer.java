@@ -37,8 +37,8 @@ import org.jetbrains.annotations.Nullable;
  * PlayerListener}. Calls that change whether the player runs wait for one another.
  *
  * <p><b>Blocking.</b> What takes its time has two forms. The plain one returns at once with a
- * {@link CompletableFuture}, which is completed on a thread of the library: go on from there with {@code
- * thenAcceptAsync(..., executor)}. The one whose name ends in {@code AndWait} blocks until it is
+ * {@link CompletableFuture}, which is completed on a thread of the library: go on from there with
+ * {@code thenAcceptAsync(..., executor)}. The one whose name ends in {@code AndWait} blocks until it is
  * done, says for how long at most, and throws what the future would have been completed with.
  * Arguments and states are checked before a method returns, in both forms; a future that reports
  * such a failure does not exist. To cancel a future does not end the work; reset and release do.

@@ -68,7 +68,8 @@ public interface Tracks {
 
     /**
      * Plays a track in place of the one of its kind that is played. Allowed while the player has
-     * media. Does not block once the track's table was read; selections are carried out in the order of their calls.
+     * media. Does not block once the track's table was read; selections are carried out in the order
+     * of their calls.
      *
      * @param track of one of the tables; its kind and index count
      * @return completed when it is played; exceptionally with an {@link IllegalStateException} when

@@ -65,7 +65,8 @@ public final class EnginePictures implements Pictures {
     private Optional<Thumbnail> draw(ThumbnailInfo request, ColorMode colorMode) {
         return commands.ask("thumbnail()",
                         () -> Optional.ofNullable(natives.getThumbnailInfo(request)))
-                .map(bytes -> new Thumbnail(request.mThumbnailWidth, request.mThumbnailHeight, colorMode, bytes));
+                .map(bytes -> new Thumbnail(
+                        request.mThumbnailWidth, request.mThumbnailHeight, colorMode, bytes));
     }
 
     private static void requireRange(String name, int value, int most) {

@@ -64,7 +64,8 @@ public final class StreamAdapter {
         cancelled = false;
         reading = true;
         try {
-            int count = closed.get() || length <= 0 ? END : source.read(fields.streamBuffer(length), length);
+            int count = closed.get() || length <= 0
+                    ? END : source.read(fields.streamBuffer(length), length);
             if (count < -1 || count > length) {
                 throw new IOException("the source read " + count + " bytes of " + length);
             }
