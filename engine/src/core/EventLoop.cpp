@@ -95,7 +95,8 @@ void EventLoop::run() {
 }
 
 void EventLoop::onSeek() {
-    mState.update([](PlayerState::Values& v) { v.seeks++; });
+    mState.update([](PlayerState::Values& v) { v.onSeek(); });
+    if (mRedraw == Redraw::Accepted) mRedraw = Redraw::Begun;
     mFrames.leave();
 }
 
@@ -107,6 +108,7 @@ void EventLoop::lookForEnd() {
 void EventLoop::handle(const mpv_event& event) {
     switch (event.event_id) {
         case MPV_EVENT_START_FILE:
+            mRedraw = Redraw::None;
             mMedia.onStart();
             mState.update([](PlayerState::Values& v) { v.fileStarted = true; });
             break;
@@ -121,6 +123,9 @@ void EventLoop::handle(const mpv_event& event) {
             break;
         case MPV_EVENT_SEEK:
             onSeek();
+            break;
+        case MPV_EVENT_COMMAND_REPLY:
+            onRedrawAnswered(event.error);
             break;
         case MPV_EVENT_PLAYBACK_RESTART:
             onRestart();
@@ -221,11 +226,24 @@ void EventLoop::endUnattendedSeek() {
 }
 
 // The first picture is not shown before its filters are right. mpv is asked for
-// it once more; where it cannot seek, the filters begin with the second one.
+// it once more; where it cannot seek, the filters begin with the second one. mpv may
+// seek by itself as well, since its filters changed: its answer to the request, among
+// the events, tells which of the seeks is the last.
 bool EventLoop::drawsAnew() {
+    if (mRedraw == Redraw::Asked || mRedraw == Redraw::Accepted) return true;
+    mRedraw = Redraw::None;
     if (mState.phase() != Phase::Preparing || !mPictureHandler()) return false;
+    if (!mMpv.getFlag("seekable").value_or(false)) return false;
     const double position = mMpv.getDouble("time-pos").value_or(0);
-    return mMpv.getFlag("seekable").value_or(false) && mMpv.seek(position, "absolute+exact") >= 0;
+    if (mMpv.requestSeek(position, "absolute+exact") < 0) return false;
+    mRedraw = Redraw::Asked;
+    return true;
+}
+
+void EventLoop::onRedrawAnswered(int error) {
+    if (mRedraw != Redraw::Asked) return;
+    mRedraw = error < 0 ? Redraw::None : Redraw::Accepted;
+    if (error < 0) onRestart();
 }
 
 void EventLoop::reportSilence() {

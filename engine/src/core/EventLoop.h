@@ -52,6 +52,9 @@ public:
     void lookForEnd();
 
 private:
+    // How far mpv has come with drawing the first picture anew.
+    enum class Redraw { None, Asked, Accepted, Begun };
+
     void run();
     void handle(const mpv_event& event);
     void onHook(const mpv_event_hook& hook);
@@ -59,6 +62,7 @@ private:
     void onLogMessage(const mpv_event_log_message& message);
     void onRestart();
     bool drawsAnew();
+    void onRedrawAnswered(int error);
     void endUnattendedSeek();
     void reportSilence();
     void onProperty(const mpv_event_property& property);
@@ -78,6 +82,7 @@ private:
     std::function<void()> mOpenedHandler;
     std::function<bool()> mPictureHandler;
     bool mSilenceReported = false;  // on the event thread
+    Redraw mRedraw = Redraw::None;  // on the event thread
     std::atomic<bool> mQuit{false};
     std::thread mThread;
 };

@@ -126,6 +126,25 @@ bool initialize(mpv_handle* mpv) {
     return error == 0 || refused("create", mpv_error_string(error));
 }
 
+// A command's node refers to its list, and that to the arguments.
+struct SeekCommand {
+    SeekCommand(double seconds, const char* flags) {
+        arguments[0].format = arguments[2].format = MPV_FORMAT_STRING;
+        arguments[0].u.string = const_cast<char*>("seek");
+        arguments[1].format = MPV_FORMAT_DOUBLE;
+        arguments[1].u.double_ = seconds;
+        arguments[2].u.string = const_cast<char*>(flags);
+        node.format = MPV_FORMAT_NODE_ARRAY;
+        node.u.list = &list;
+    }
+    SeekCommand(const SeekCommand&) = delete;
+    SeekCommand& operator=(const SeekCommand&) = delete;
+
+    mpv_node arguments[3];
+    mpv_node_list list = {3, arguments, nullptr};
+    mpv_node node;
+};
+
 }  // namespace
 
 bool MpvHandle::create() {
@@ -233,17 +252,13 @@ int MpvHandle::command(std::initializer_list<const char*> arguments) {
 }
 
 int MpvHandle::seek(double seconds, const char* flags) {
-    mpv_node arguments[3];
-    arguments[0].format = arguments[2].format = MPV_FORMAT_STRING;
-    arguments[0].u.string = const_cast<char*>("seek");
-    arguments[1].format = MPV_FORMAT_DOUBLE;
-    arguments[1].u.double_ = seconds;
-    arguments[2].u.string = const_cast<char*>(flags);
-    mpv_node_list list = {3, arguments, nullptr};
-    mpv_node command;
-    command.format = MPV_FORMAT_NODE_ARRAY;
-    command.u.list = &list;
-    return mpv_command_node(mHandle, &command, nullptr);
+    SeekCommand command(seconds, flags);
+    return mpv_command_node(mHandle, &command.node, nullptr);
+}
+
+int MpvHandle::requestSeek(double seconds, const char* flags) {
+    SeekCommand command(seconds, flags);
+    return mpv_command_node_async(mHandle, 0, &command.node);
 }
 
 }  // namespace orvtarn

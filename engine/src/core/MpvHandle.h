@@ -62,6 +62,9 @@ public:
     int command(std::initializer_list<const char*> arguments);
     // A seek to or by a time; flags as mpv writes them, "absolute+exact".
     int seek(double seconds, const char* flags);
+    // The same without waiting. mpv's answer comes among its events, before that of the
+    // seek itself.
+    int requestSeek(double seconds, const char* flags);
 
 private:
     int setProperty(const char* property, mpv_format format, void* value);

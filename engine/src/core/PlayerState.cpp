@@ -35,6 +35,11 @@ void PlayerState::Values::beginSeek() {
     restartsOf = restarts;
 }
 
+void PlayerState::Values::onSeek() {
+    if (seeks == seeksOf) restartsOf = restarts;
+    seeks++;
+}
+
 bool PlayerState::Values::isArriving() const {
     return seeking && (seeks == seeksOf || restarts == restartsOf);
 }

@@ -76,6 +76,9 @@ public:
         Position currentPosition() const;
         // A seek is about to be given to mpv.
         void beginSeek();
+        // mpv has left the place where it was. A restart that is reported before is of
+        // an earlier seek.
+        void onSeek();
         // It is under way and mpv has not gone on from where it leads.
         bool isArriving() const;
         void forgetMedia();
