@@ -11,6 +11,7 @@ class FailureInjectionTest : public JavaInputStreamFixture {
 protected:
     // How many calls could fail.
     int failEach(const std::function<void()>& body) {
+        const Untraced repeated(*this);
         for (int n = 1;; ++n) {
             SCOPED_TRACE("failed call " + std::to_string(n));
             const int before = vm.failures();
@@ -98,6 +99,7 @@ TEST_F(FailureInjectionTest, StreamReads) {
 }
 
 TEST_F(FailureInjectionTest, ThousandsOfPlayersLeaveNothingBehind) {
+    const Untraced repeated(*this);
     for (int i = 0; i < 2000; ++i) {
         setUp(player);
         call<void>("native_release", "()V");

@@ -16,7 +16,7 @@ constexpr char kTag[] = "Customer_media_Utils";
 class KeyValueArraysTest : public JniFixture {
 protected:
     Outcome convert(jobjectArray keys, jobjectArray values) {
-        return observe([&] {
+        return observe("ConvertKeyValueArraysToKeyedVector", [&] {
             const bool good =
                 android::ConvertKeyValueArraysToKeyedVector(vm.env(), keys, values, &pairs);
             return NativeResult{Value::ofBoolean(good), 0};
@@ -91,6 +91,7 @@ TEST_F(KeyValueArraysTest, NullElementHasNoCharacters) {
 }
 
 TEST_F(KeyValueArraysTest, ElementReferencesAreDeletedInTheLoop) {
+    const Untraced repeated(*this);
     const std::vector<std::string> many(600, "text");
     jobjectArray keys = strings(many);
     jobjectArray values = strings(many);

@@ -20,8 +20,9 @@ protected:
     // What loading did; of the log, the library's own lines. How the platform
     // finds out which method is missing is its own affair.
     Outcome load() {
-        Outcome outcome = observe(
-            [&] { return NativeResult{Value::ofInt(JNI_OnLoad(vm.javaVm(), nullptr)), 0}; });
+        Outcome outcome = observe("JNI_OnLoad", [&] {
+            return NativeResult{Value::ofInt(JNI_OnLoad(vm.javaVm(), nullptr)), 0};
+        });
         const auto foreign = [](const LogLine& line) { return line.tag != "OrvMediaClient-JNI"; };
         outcome.log.erase(std::remove_if(outcome.log.begin(), outcome.log.end(), foreign),
                           outcome.log.end());

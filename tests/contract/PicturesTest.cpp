@@ -48,7 +48,7 @@ protected:
                 request->set(kFields[i], Value::ofInt(values[i]));
             }
         }
-        return observe([&] {
+        return observe("native_getThumbnailInfo", [&] {
             auto result = fakejni::callNative<jbyteArray>(
                 vm, playerClass, vm.local(player), "native_getThumbnailInfo",
                 "(Lcom/quintora/mmp/util/ThumbnailInfo;)[B", vm.local(request));
@@ -266,7 +266,7 @@ TEST_F(ThumbnailTest, OutOfMemory) {
 class EmbeddedPictureTest : public JniFixture {
 protected:
     Outcome get() {
-        return observe([&] {
+        return observe("native_getEmbeddedPicture", [&] {
             auto result = fakejni::callNative<jbyteArray>(
                 vm, playerClass, vm.local(player), "native_getEmbeddedPicture", "(I)[B", jint{3});
             if (result.value.object != nullptr) bytes = result.value.object->bytes;

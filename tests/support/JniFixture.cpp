@@ -3,6 +3,8 @@
 
 #include <algorithm>
 
+#include "Trace.h"
+#include "TraceBook.h"
 #include "dispatch/SyncToAsync.h"
 #include "jni/ClientFields.h"
 #include "jni/JavaVm.h"
@@ -46,6 +48,7 @@ VmFixture::VmFixture() : playerClass(definePlayerClasses(vm)) {
 VmFixture::~VmFixture() { g__JavaVM = nullptr; }
 
 void VmFixture::TearDown() {
+    const Untraced ending(*this);
     for (const ObjectPtr& object : mPlayers) {
         if (object->get("mNativeContext").integer != 0)
             callOn<void>(object, "native_release", "()V");
@@ -66,13 +69,14 @@ void VmFixture::loadLibrary() {
 
 void VmFixture::initClass() { callStatic<void>("native_init", "()V"); }
 
-Outcome VmFixture::observe(const std::function<NativeResult()>& body) {
+Outcome VmFixture::observe(const std::string& title, const std::function<NativeResult()>& body) {
     log.clear();
     vm.forgetCalls();
     takeEngineCalls();
     const size_t globalsBefore = vm.globalReferences();
     const std::vector<std::string> unreleasedBefore = vm.unreleased();
 
+    const Trace trace;
     const NativeResult result = body();
 
     Outcome outcome;
@@ -85,11 +89,12 @@ Outcome VmFixture::observe(const std::function<NativeResult()>& body) {
     outcome.java = vm.javaCallTexts();
     outcome.unreleased = added(unreleasedBefore, vm.unreleased());
     outcome.globals = static_cast<int>(vm.globalReferences() - globalsBefore);
+    if (mUntraced == 0) addToTracePage(title, trace.steps());
     return outcome;
 }
 
 Outcome VmFixture::observeAction(const std::function<void()>& body) {
-    return observe([&] {
+    return observe("action", [&] {
         body();
         return NativeResult{};
     });
@@ -113,12 +118,14 @@ std::vector<std::string> VmFixture::vmCalls() {
 }
 
 void JniFixture::SetUp() {
+    const Untraced beginning(*this);
     ORV::SyncToAsync::getInstance();  // the first use logs more than the later ones
     loadLibrary();
     initClass();
 }
 
 ScriptedEngine& JniFixture::setUp(const ObjectPtr& object) {
+    const Untraced beginning(*this);
     jobject weak = vm.local(vm.newObject("java/lang/ref/WeakReference"));
     callOn<void>(object, "native_setup", "(Ljava/lang/Object;)V", weak);
     engine = ScriptedEngine::last();

@@ -31,8 +31,9 @@ public:
     void loadLibrary();
     void initClass();
 
-    // Runs a body on the test's thread and reports all that it did.
-    Outcome observe(const std::function<fakejni::NativeResult()>& body);
+    // Runs a body on the test's thread and reports all that it did. The order of
+    // it, under that title, is part of the test's page of traces.
+    Outcome observe(const std::string& title, const std::function<fakejni::NativeResult()>& body);
     Outcome observeAction(const std::function<void()>& body);
 
     // A Java player object that was not set up.
@@ -41,14 +42,14 @@ public:
     template <typename R, typename... A>
     Outcome callOn(const fakejni::ObjectPtr& object, const std::string& name,
                    const std::string& signature, A... args) {
-        return observe([&] {
+        return observe(name + " " + signature, [&] {
             jobject thiz = vm.local(object);
             return fakejni::callNative<R>(vm, *object->type, thiz, name, signature, args...);
         });
     }
     template <typename R, typename... A>
     Outcome callStatic(const std::string& name, const std::string& signature, A... args) {
-        return observe([&] {
+        return observe(name + " " + signature, [&] {
             jobject type = vm.local(playerClass.mirror);
             return fakejni::callNative<R>(vm, playerClass, type, name, signature, args...);
         });
@@ -66,6 +67,19 @@ public:
     fakejni::Vm vm;
     fakejni::Class& playerClass;
 
+    // While one lives, calls are not part of the test's page of traces: those that
+    // only lead to what is tested, and those that are repeated for many failures.
+    class Untraced {
+    public:
+        explicit Untraced(VmFixture& test) : mTest(test) { mTest.mUntraced++; }
+        ~Untraced() { mTest.mUntraced--; }
+        Untraced(const Untraced&) = delete;
+        Untraced& operator=(const Untraced&) = delete;
+
+    private:
+        VmFixture& mTest;
+    };
+
     // What is left over at the end by contract.
     size_t leftGlobals = 0;
     std::vector<std::string> leftUnreleased;
@@ -73,6 +87,7 @@ public:
 
 private:
     std::vector<fakejni::ObjectPtr> mPlayers;
+    int mUntraced = 0;
 };
 
 // The same with the library loaded and a Java player object that is not set

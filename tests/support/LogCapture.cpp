@@ -9,6 +9,7 @@
 #include <ostream>
 
 #include "LogSink.h"
+#include "Trace.h"
 
 namespace orvtest {
 namespace {
@@ -58,10 +59,13 @@ bool textMatches(const char* pattern, const char* text) {
     return *text == '\0';
 }
 
-void print(std::ostream& out, int priority, const std::string& tag, const std::string& text) {
+char letterOf(int priority) {
     static const char letters[] = "??VDIWEF";
-    const bool known = priority >= 2 && priority <= 7;
-    out << (known ? letters[priority] : '?') << ' ';
+    return priority >= 2 && priority <= 7 ? letters[priority] : '?';
+}
+
+void print(std::ostream& out, int priority, const std::string& tag, const std::string& text) {
+    out << letterOf(priority) << ' ';
     if (!tag.empty()) out << tag << ' ';
     out << testing::PrintToString(text);
 }
@@ -199,6 +203,7 @@ void LogCapture::whenLogged(const ExpectedLine& line, std::function<void()> acti
 
 std::function<void()> LogCapture::add(LogLine line) {
     std::lock_guard<std::mutex> lock(mMutex);
+    Trace::add("log", std::string(1, letterOf(line.priority)) + " " + line.tag + " " + line.text);
     mLines.push_back(std::move(line));
     mArrived.notify_all();
     if (mAction && mActionLine.matches(mLines.back())) return std::exchange(mAction, nullptr);

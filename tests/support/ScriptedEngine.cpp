@@ -8,6 +8,7 @@
 #include <utility>
 
 #include "PrivateMember.h"
+#include "Trace.h"
 
 namespace orvtest {
 
@@ -88,6 +89,7 @@ int ScriptedEngine::call(const std::string& operation, const std::string& argume
     {
         std::lock_guard<std::mutex> lock(mMutex);
         mCalls.push_back(operation + "(" + arguments + ")");
+        Trace::add("engine", mCalls.back());
         std::deque<int>& answers = mAnswers[operation];
         if (!answers.empty()) result = answers.front();
         if (answers.size() > 1) answers.pop_front();

@@ -49,6 +49,13 @@ expect "another target" 2 "not 'mips'" "$root/orv" test --target mips
 expect "a target without a name" 2 "lacks its value" "$root/orv" test --target
 expect "another option of bench" 2 "bench does not know '--fast'" "$root/orv" bench --fast
 expect "another option of counts" 2 "counts does not know '--all'" "$root/orv" counts --all
+expect "another option of trace-contract" 2 "trace-contract does not know '--all'" \
+    "$root/orv" trace-contract --all
+expect "the trace of a native method" 0 "native_prepareAsync ()V    " \
+    "$root/tools/inspect/traces.py" "$root/tests/contract/traces" "native_prepareAsync"
+expect "the trace of no native method" 1 "no native method with 'nonsense'" \
+    "$root/tools/inspect/traces.py" "$root/tests/contract/traces" nonsense
+expect "traces from no folder" 1 "no traces in" "$root/tools/inspect/traces.py" "$folder/none"
 expect "rows of bench without a pattern" 2 "lacks its value" "$root/orv" bench --rows
 expect "another doctor" 2 "doctor does not know '--spell'" "$root/orv" doctor --spell x
 ORV_NO_INSTALL=1 expect "a tree that is not there" 2 "none: there is no such folder" \

@@ -12,18 +12,19 @@ namespace {
 const char* const kString = "java/lang/String";
 
 jstring newString(JNIEnv* env, const jchar* units, jsize length) {
-    Entry entry(env, "NewString");
+    const bool isText = units != nullptr && length > 0;
+    const std::u16string text(units, units + (isText ? length : 0));
+    Entry entry(env, "NewString", toModifiedUtf8(text));
     if (length < 0 || (units == nullptr && length > 0)) {
         entry.violation("bad text or length " + std::to_string(length));
         return nullptr;
     }
     if (entry.fails()) return entry.outOfMemory();
-    std::u16string text(units, units + length);
     return entry.local<jstring>(entry.vm.newString(text));
 }
 
 jstring newStringUtf(JNIEnv* env, const char* bytes) {
-    Entry entry(env, "NewStringUTF");
+    Entry entry(env, "NewStringUTF", bytes == nullptr ? "null" : bytes);
     // Machines answer null with null; libraries rely on it.
     if (bytes == nullptr) return nullptr;
     std::u16string text;

@@ -4,6 +4,7 @@
 #include <algorithm>
 
 #include "FakeJni/EnvSupport.h"
+#include "Trace.h"
 
 namespace fakejni {
 
@@ -37,6 +38,7 @@ bool Vm::mustFail(const std::string& function) {
 
 void Vm::record(const std::string& function, const std::string& detail) {
     mCalls.push_back({function, detail, std::this_thread::get_id()});
+    orvtest::Trace::add("jni", detail.empty() ? function : function + " " + detail);
     const auto action = mActions.find(function);
     if (action != mActions.end()) action->second();
 }
@@ -46,7 +48,10 @@ void Vm::whenCalled(const std::string& function, std::function<void()> action) {
     mActions[function] = std::move(action);
 }
 
-void Vm::recordJava(JavaCall call) { mJavaCalls.push_back(std::move(call)); }
+void Vm::recordJava(JavaCall call) {
+    orvtest::Trace::add("java", toString(call));
+    mJavaCalls.push_back(std::move(call));
+}
 
 std::vector<JniCall> Vm::calls() {
     Lock lock(mMutex);

@@ -1,0 +1,42 @@
+// SPDX-License-Identifier: Apache-2.0
+// The platform's functions that the product calls, for the trace: the linker sends
+// the program's calls here. Each is one step; how it works is left out.
+#include <android_runtime/AndroidRuntime.h>
+#include <nativehelper/JNIHelp.h>
+
+#include <string>
+
+#include "Trace.h"
+
+using orvtest::Trace;
+
+extern "C" {
+
+int __real_jniThrowException(C_JNIEnv* env, const char* type, const char* message);
+int __real_jniGetFDFromFileDescriptor(C_JNIEnv* env, jobject descriptor);
+
+int __real__ZN7android14AndroidRuntime21registerNativeMethodsEP7_JNIEnvPKcPK15JNINativeMethodi(
+    JNIEnv* env, const char* type, const JNINativeMethod* rows, int count);
+
+int __wrap_jniThrowException(C_JNIEnv* env, const char* type, const char* message) {
+    Trace::add("throw", std::string(type) + (message ? " " + std::string(message) : ""));
+    const Trace::Pause pause;
+    return __real_jniThrowException(env, type, message);
+}
+
+int __wrap_jniGetFDFromFileDescriptor(C_JNIEnv* env, jobject descriptor) {
+    Trace::add("platform", "jniGetFDFromFileDescriptor");
+    const Trace::Pause pause;
+    return __real_jniGetFDFromFileDescriptor(env, descriptor);
+}
+
+// AndroidRuntime::registerNativeMethods
+int __wrap__ZN7android14AndroidRuntime21registerNativeMethodsEP7_JNIEnvPKcPK15JNINativeMethodi(
+    JNIEnv* env, const char* type, const JNINativeMethod* rows, int count) {
+    Trace::add("platform", "registerNativeMethods " + std::string(type));
+    const Trace::Pause pause;
+    return __real__ZN7android14AndroidRuntime21registerNativeMethodsEP7_JNIEnvPKcPK15JNINativeMethodi(
+        env, type, rows, count);
+}
+
+}  // extern "C"

@@ -1,0 +1,51 @@
+// SPDX-License-Identifier: Apache-2.0
+#include "Trace.h"
+
+#include <stdio.h>
+
+#include <regex>
+
+namespace orvtest {
+namespace {
+
+thread_local Trace* sInnermost = nullptr;
+
+// One step is one line.
+std::string escaped(const std::string& text) {
+    std::string line;
+    for (const char c : text) {
+        const auto byte = static_cast<unsigned char>(c);
+        char code[5];
+        snprintf(code, sizeof code, "\\x%02x", byte);
+        const bool isPlain = byte >= ' ' && byte < 0x7f;
+        line += isPlain ? std::string(1, c) : c == '\n' ? "\\n" : code;
+    }
+    return line;
+}
+
+std::string withoutNumbersOfThisRun(const std::string& text) {
+    static const std::regex kPointer("0x[0-9a-f]{5,}");
+    static const std::regex kLine("Line:[0-9]+");
+    // Where Java awaits a text and its length, the DivX records bring an address.
+    static const std::regex kAddress("null, -?[0-9]+");
+    std::string steady = std::regex_replace(text, kPointer, "%p");
+    steady = std::regex_replace(steady, kLine, "Line:%d");
+    return std::regex_replace(steady, kAddress, "null, %d");
+}
+
+}  // namespace
+
+Trace::Trace() : mOuter(sInnermost) { sInnermost = this; }
+
+Trace::~Trace() { sInnermost = mOuter; }
+
+void Trace::add(const std::string& kind, const std::string& text) {
+    if (sInnermost == nullptr) return;
+    sInnermost->mSteps.push_back(kind + " " + withoutNumbersOfThisRun(escaped(text)));
+}
+
+Trace::Pause::Pause() : mPaused(sInnermost) { sInnermost = nullptr; }
+
+Trace::Pause::~Pause() { sInnermost = mPaused; }
+
+}  // namespace orvtest
