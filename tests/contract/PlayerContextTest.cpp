@@ -324,5 +324,15 @@ TEST_F(PlayerContextTest, PlayersAreIndependent) {
     EXPECT_NE(getMediaService(vm.env(), vm.local(other)), nullptr);
 }
 
+TEST_F(PlayerContextTest, ThousandsOfPlayersLeaveNothingBehind) {
+    const Untraced repeated(*this);
+    for (int i = 0; i < 2000; ++i) {
+        setUp(player);
+        call<void>("native_release", "()V");
+        ScriptedEngine::forgetAll();
+    }
+    EXPECT_EQ(vm.globalReferences(), 0u);
+}
+
 }  // namespace
 }  // namespace orvtest

@@ -2,6 +2,7 @@
 // The platform's functions that the product calls, for the trace: the linker sends
 // the program's calls here. Each is one step; how it works is left out.
 #include <android_runtime/AndroidRuntime.h>
+#include <gui/Surface.h>
 #include <nativehelper/JNIHelp.h>
 
 #include <string>
@@ -40,3 +41,17 @@ int __wrap__ZN7android14AndroidRuntime21registerNativeMethodsEP7_JNIEnvPKcPK15JN
 }
 
 }  // extern "C"
+
+using android::sp;
+using android::Surface;
+
+sp<Surface> realGetSurface(JNIEnv* env, jobject surface) asm(
+    "__real__ZN7android31android_view_Surface_getSurfaceEP7_JNIEnvP8_jobject");
+sp<Surface> getSurface(JNIEnv* env, jobject surface) asm(
+    "__wrap__ZN7android31android_view_Surface_getSurfaceEP7_JNIEnvP8_jobject");
+
+sp<Surface> getSurface(JNIEnv* env, jobject surface) {
+    Trace::add("platform", "android_view_Surface_getSurface");
+    const Trace::Pause pause;
+    return realGetSurface(env, surface);
+}

@@ -9,6 +9,7 @@ namespace orvtest {
 namespace {
 
 thread_local Trace* sInnermost = nullptr;
+thread_local int sPauses = 0;
 
 // One step is one line.
 std::string escaped(const std::string& text) {
@@ -44,8 +45,16 @@ void Trace::add(const std::string& kind, const std::string& text) {
     sInnermost->mSteps.push_back(kind + " " + withoutNumbersOfThisRun(escaped(text)));
 }
 
-Trace::Pause::Pause() : mPaused(sInnermost) { sInnermost = nullptr; }
+Trace::Pause::Pause() : mPaused(sInnermost) {
+    sInnermost = nullptr;
+    sPauses++;
+}
 
-Trace::Pause::~Pause() { sInnermost = mPaused; }
+Trace::Pause::~Pause() {
+    sInnermost = mPaused;
+    sPauses--;
+}
+
+bool Trace::Pause::isOn() { return sPauses > 0; }
 
 }  // namespace orvtest

@@ -33,6 +33,9 @@ public:
         Pause(const Pause&) = delete;
         Pause& operator=(const Pause&) = delete;
 
+        // Whether one lives on the calling thread.
+        static bool isOn();
+
     private:
         Trace* const mPaused;
     };

@@ -5,6 +5,7 @@
 #include <stdlib.h>
 #include <string.h>
 
+#include <filesystem>
 #include <fstream>
 #include <map>
 #include <mutex>
@@ -103,10 +104,10 @@ void addToTracePage(const std::string& call, const std::vector<std::string>& ste
 // A page of a test that is gone would stay for ever.
 TEST(TraceBookTest, EachPageIsOfATest) {
     const std::set<std::string> names = testNames();
-    std::set<std::string> files;
-    for (const std::string& name : names) files.insert(fileOf(name.substr(0, name.find('.'))));
-    for (const std::string& file : files) {
-        for (const auto& [name, page] : readPages(file)) EXPECT_EQ(1u, names.count(name)) << name;
+    for (const auto& file : std::filesystem::directory_iterator(ORV_TRACES)) {
+        for (const auto& [name, page] : readPages(file.path())) {
+            EXPECT_EQ(1u, names.count(name)) << name << " of " << file.path();
+        }
     }
 }
 

@@ -95,8 +95,11 @@ public:
     void failNth(int n);
     // Failures that have not come yet do not come any more.
     void forgetFailures();
-    // How many calls were failed so far.
+    // How many calls were failed so far, and which function was the last.
     int failures() const { return mFailures; }
+    const std::string& lastFailed() const { return mLastFailed; }
+    // failNth passes that function over.
+    void spare(const std::string& function) { mSpared.insert(function); }
 
     // Runs in each call of that function, on its thread, before the function
     // does its work. The machine is locked meanwhile.
@@ -130,6 +133,8 @@ public:
     // Buffers of strings and arrays not given back, by the function that gave them.
     std::vector<std::string> unreleased();
     std::vector<std::string> violations();
+    // Returns those so far and forgets them.
+    std::vector<std::string> takeViolations();
     // Violations whose text contains this are dropped, those to come too.
     void tolerate(const std::string& text);
 
@@ -177,6 +182,8 @@ private:
     std::map<int, std::unique_ptr<ThreadState>> mThreads;
     std::vector<Plan> mPlans;
     int mFailures = 0;
+    std::string mLastFailed;
+    std::set<std::string> mSpared;
     std::map<std::string, std::function<void()>> mActions;
     std::vector<JniCall> mCalls;
     std::vector<JavaCall> mJavaCalls;
