@@ -36,6 +36,8 @@ def traces(folder):
     found = collections.defaultdict(lambda: collections.defaultdict(list))
     for file in sorted(folder.glob("*.txt")):
         for test, title, steps in paragraphs(file):
+            if not title.startswith(("native_", "JNI_OnLoad")):
+                continue  # of a part of the library, or of a failure
             tests = found[title][steps]
             if test not in tests:
                 tests.append(test)
