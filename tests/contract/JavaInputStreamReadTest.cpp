@@ -1,5 +1,7 @@
 // SPDX-License-Identifier: Apache-2.0
 // Reading: what the engine gets for every count that Java may return.
+#include <limits.h>
+
 #include <numeric>
 
 #include "JavaInputStreamFixture.h"
@@ -136,6 +138,38 @@ TEST_F(JavaInputStreamReadTest, ElementsThatCannotBeHadCopyNothing) {
     EXPECT_EQ(status, 0);
     EXPECT_EQ(readLen, 50);
     EXPECT_EQ(copied(), 0u);
+}
+
+// The engine's length is passed on and limits what is copied, whatever it is.
+class OddLengthTest : public JavaInputStreamReadTest, public testing::WithParamInterface<int> {};
+
+TEST_P(OddLengthTest, IsPassedOnAndCopiesNothing) {
+    const int len = GetParam();
+    EXPECT_THAT(read(50, len),
+                ReturnsNothing()
+                    .logs({bridgeError("JavaInputStream::read(): copy i4ReadResult>len Issue "
+                                       "handle \n")})
+                    .java({"readStream(" + std::to_string(len) + ")"}));
+    EXPECT_EQ(status, 0);
+    EXPECT_EQ(readLen, 50);
+    EXPECT_EQ(copied(), 0u);
+    EXPECT_THAT(vm.callsOf("ReleaseByteArrayElements"), ElementsAre("0"));
+}
+
+INSTANTIATE_TEST_SUITE_P(Bytes, OddLengthTest, testing::Values(0, -1, INT_MIN),
+                         [](const auto& info) {
+                             return info.param == 0    ? "None"
+                                    : info.param == -1 ? "Negative"
+                                                       : "MostNegative";
+                         });
+
+TEST_F(JavaInputStreamReadTest, EmptyArrayCopiesNothingAndIsReleased) {
+    player->set("mStreamReadBuffer", Value::of(vm.newBytes({})));
+    EXPECT_THAT(read(50, 100), ReturnsNothing().java({"readStream(100)"}));
+    EXPECT_EQ(status, 0);
+    EXPECT_EQ(readLen, 50);
+    EXPECT_EQ(copied(), 0u);
+    EXPECT_THAT(vm.callsOf("ReleaseByteArrayElements"), ElementsAre("0"));
 }
 
 TEST_F(JavaInputStreamReadTest, InvalidStreamIsAtItsEnd) {

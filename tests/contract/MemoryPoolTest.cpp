@@ -1,12 +1,15 @@
 // SPDX-License-Identifier: Apache-2.0
 #include <errno.h>
+#include <gmock/gmock.h>
 #include <gtest/gtest.h>
 #include <os/MemoryPool.h>
 #include <stdint.h>
 #include <string.h>
 #include <unistd.h>
 
+#include <algorithm>
 #include <atomic>
+#include <chrono>
 #include <future>
 #include <thread>
 #include <vector>
@@ -178,19 +181,38 @@ TEST_F(MemoryPoolTest, FailedMappingIsReportedAndLeavesTheListAsItWas) {
     mem_free(kept);
 }
 
+// Every thread finds its blocks as it left them, and the list is whole at the end.
 TEST_F(MemoryPoolTest, ManyThreadsAllocateAndFree) {
-    std::vector<std::thread> threads(4);
-    for (std::thread& thread : threads) {
-        thread = std::thread([] {
+    constexpr int kThreads = 4;
+    std::atomic<int> damaged{0};
+    std::vector<void*> kept(kThreads);
+    std::vector<std::thread> threads;
+    for (int id = 0; id < kThreads; id++) {
+        threads.emplace_back([&, id] {
+            const auto isWhole = [id](void* memory, int size) {
+                const auto* bytes = static_cast<const char*>(memory);
+                return blockOf(memory)->size == size &&
+                       std::all_of(bytes, bytes + size, [id](char c) { return c == id; });
+            };
             for (int i = 0; i < 200; i++) {
                 void* first = mem_alloc(i);
-                void* second = mem_alloc(i);
+                void* second = mem_alloc(i + 1);
+                memset(first, id, i);
+                memset(second, id, i + 1);
+                damaged += !isWhole(first, i);
                 mem_free(first);
+                damaged += !isWhole(second, i + 1);
                 mem_free(second);
             }
+            kept[id] = mem_alloc(id);
         });
     }
     for (std::thread& thread : threads) thread.join();
+    EXPECT_EQ(damaged, 0);
+    std::vector<MemoryBlock*> expected;
+    for (void* memory : kept) expected.push_back(blockOf(memory));
+    EXPECT_THAT(liveBlocks(), testing::UnorderedElementsAreArray(expected));
+    for (void* memory : kept) mem_free(memory);
 }
 
 TEST(MemoryPoolSemaphoreTest, FreeingNullDoesNotTouchTheSemaphore) {
@@ -202,11 +224,17 @@ TEST(MemoryPoolSemaphoreTest, FreeingNullDoesNotTouchTheSemaphore) {
 TEST(MemoryPoolSemaphoreTest, AllocationWaitsForTheSemaphore) {
     sem_init(&sem, 0, 0);
     std::atomic<bool> opened{false};
+    std::promise<void> waiting;
+    auto wait = semWaitCall.replace([&](sem_t* s) {
+        if (!opened) waiting.set_value();
+        return semWaitCall.real(s);
+    });
     auto record = mmapCall.replace([&](void* a, size_t l, int p, int f, int fd, off_t o) {
         EXPECT_TRUE(opened);
         return mmapCall.real(a, l, p, f, fd, o);
     });
     auto memory = std::async(std::launch::async, [] { return mem_alloc(1); });
+    EXPECT_EQ(waiting.get_future().wait_for(std::chrono::seconds(10)), std::future_status::ready);
     opened = true;
     sem_post(&sem);
     mem_free(memory.get());

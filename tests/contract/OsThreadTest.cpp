@@ -11,12 +11,14 @@
 #include <thread>
 #include <vector>
 
+#include "Deletion.h"
 #include "PosixCalls.h"
 #include "PrivateMember.h"
 
 namespace orvtest {
 
 ORV_OPEN_MEMBER(EndSignal, os::Thread, mImplmentation);
+ORV_OPEN_MEMBER(Attributes, os::Thread, mAttributes);
 
 namespace {
 
@@ -244,6 +246,27 @@ TEST(OsThreadTest, FailedCreationIsPrinted) {
         worker.Start();
     }
     EXPECT_EQ(GetCapturedStdout(), "Error pthread_create " + std::to_string(EAGAIN) + " \n");
+}
+
+TEST(OsThreadTest, PrintsNothingWhenAllGoesWell) {
+    CaptureStdout();
+    {
+        Worker worker("worker", [] {});
+        worker.Start();
+        EXPECT_EQ(worker.Wait(), 0);
+    }
+    EXPECT_EQ(GetCapturedStdout(), "");
+}
+
+TEST(OsThreadTest, DeletesWhatItMade) {
+    auto* worker = new Worker("worker", [] {});
+    worker->Start();
+    EXPECT_EQ(worker->Wait(), 0);
+    const Deletion endSignal(worker->*memberOf(EndSignal{}));
+    const Deletion attributes(worker->*memberOf(Attributes{}));
+    delete worker;
+    EXPECT_TRUE(endSignal.happened());
+    EXPECT_TRUE(attributes.happened());
 }
 
 class ThreadSleepTest : public testing::TestWithParam<int> {};

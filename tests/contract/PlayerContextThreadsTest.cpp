@@ -6,9 +6,11 @@
 #include <chrono>
 #include <functional>
 #include <future>
+#include <memory>
 
 #include "DispatcherFixture.h"
 #include "FakeJni/EnvSupport.h"
+#include "MutexProbe.h"
 
 namespace orvtest {
 namespace {
@@ -64,14 +66,15 @@ protected:
     // Runs one, and the other on another thread when one has read the field:
     // the other must wait for it.
     void expectToExclude(const std::function<void()>& one, const std::function<void()>& other) {
-        std::future<void> done;
+        std::unique_ptr<OtherThread> second;
         const AfterFieldRead startOther(vm.env(), [&] {
-            done = std::async(std::launch::async, [&] { vm.onJavaThread(other); });
-            EXPECT_EQ(done.wait_for(std::chrono::milliseconds(100)), std::future_status::timeout);
+            second = std::make_unique<OtherThread>(
+                other, [&](const std::function<void()>& run) { vm.onJavaThread(run); });
+            EXPECT_TRUE(second->isStopped());
         });
         one();
-        ASSERT_TRUE(done.valid());
-        done.get();
+        ASSERT_NE(second, nullptr);
+        second->join();
     }
 
     // Threads that each look the service up so often and hand it to use.

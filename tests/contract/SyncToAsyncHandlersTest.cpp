@@ -6,6 +6,7 @@
 #include <stdlib.h>
 #include <unistd.h>
 
+#include "Deletion.h"
 #include "DispatcherFixture.h"
 #include "MutexProbe.h"
 #include "PrivateMember.h"
@@ -13,6 +14,7 @@
 namespace orvtest {
 
 ORV_OPEN_MEMBER(GlobalMutex, ORV::SyncToAsync, s_mutexGlobal);
+ORV_OPEN_MEMBER(Handlers, ORV::SyncToAsync, m_handlers);
 
 namespace {
 
@@ -30,6 +32,29 @@ TEST_F(SyncToAsyncHandlersTest, AddLogsEnterAndLeave) {
     EXPECT_THAT(dispatcherLines(),
                 LinesAre({dispatcherInfo("SyncToAsync::addMsgHandler(): Enter"),
                           dispatcherInfo("SyncToAsync::addMsgHandler(): Leave")}));
+    dispatcher->delMsgHandler(service);
+}
+
+TEST_F(SyncToAsyncHandlersTest, DeletesTheHandler) {
+    addHandler(service, "one");
+    const Deletion handler((dispatcher->*memberOf(Handlers{})).back());
+    EXPECT_FALSE(handler.happened());
+    dispatcher->delMsgHandler(service);
+    EXPECT_TRUE(handler.happened());
+}
+
+TEST_F(SyncToAsyncHandlersTest, DeletesEachActionAndItsPayloadWhenItIsDone) {
+    addHandler(service, "one");
+    ORV::SyncToAsyncAction* valid = action(service, 1);
+    ORV::SyncToAsyncAction* invalid = action(service, 2);
+    invalid->valid = false;
+    ORV::SyncToAsyncAction* strangers = action(new OrvMediaService, 3);
+    const Deletion deletions[] = {Deletion(valid),     Deletion(valid->payload),
+                                  Deletion(invalid),   Deletion(invalid->payload),
+                                  Deletion(strangers), Deletion(strangers->payload)};
+    for (ORV::SyncToAsyncAction* one : {valid, invalid, strangers}) dispatcher->addAction(one);
+    waitFor(dispatcherError("SyncToAsync::Run(): prMsgDispatcher==NULL"));
+    for (const Deletion& deletion : deletions) EXPECT_TRUE(deletion.happened());
     dispatcher->delMsgHandler(service);
 }
 
