@@ -2,6 +2,8 @@
 // Subtitles as they are seen: the pictures change where and as the player is
 // told. The media are a grey picture (0x40), on which nothing else moves.
 #include "PlayerTest.h"
+#include "core/MpvHandle.h"
+#include "playback/SubtitleLoader.h"
 
 using namespace android;
 using namespace orvtest;
@@ -336,6 +338,20 @@ TEST_F(SubtitleTest, MovesTheText) {
     }));
 }
 
+// What the media may open is another matter.
+TEST_F(SubtitleTest, AFileLeavesTheReachOfTheMediaAsItWas) {
+    constexpr char kOptions[] = "demuxer-lavf-o";
+    orvtarn::MpvHandle mpv;
+    ASSERT_TRUE(mpv.create());
+    ASSERT_EQ(0, mpv.set(kOptions, "protocol_whitelist=[file,http],seekable=0"));
+    const std::optional<std::string> before = mpv.getString(kOptions);
+    orvtarn::SubtitleLoader loader(mpv);
+    loader.open({mediaPath("lines.srt"), "", false});
+    EXPECT_EQ(before, mpv.getString(kOptions));
+    EXPECT_NE("", before);
+    mpv.destroy();
+}
+
 TEST_F(SubtitleTest, DelaysTheText) {
     openAtLine("plain.mkv");
     ASSERT_EQ(NO_ERROR, player->seekTo(0, 0));
@@ -355,7 +371,11 @@ TEST_F(SubtitleTest, StagedAttributesWaitForTheFlush) {
     Subtitle_Color colour{255, 255, 0, 0};
     ASSERT_TRUE(player->setSubtitleAttr(E_SUBTITLE_ATTR_TYPE_FONT_INFO, &font));
     ASSERT_TRUE(player->setSubtitleAttr(E_SUBTITLE_ATTR_TYPE_TEXT_COLOR, &colour));
-    EXPECT_TRUE(remains([&] { return sink->newest().differences(before) == 0; }));
+    // Drawn anew, it looks as it did.
+    const uint64_t frames = sink->frameCount();
+    ASSERT_EQ(NO_ERROR, player->seekTo(4000, 0));
+    ASSERT_TRUE(sink->waitFor(frames));
+    EXPECT_EQ(0, sink->newest().differences(before));
     ASSERT_TRUE(player->flushSubtitleAttr());
     EXPECT_TRUE(sees([&](const Picture& p) { return p.differences(before) > 500; }));
     EXPECT_FALSE(player->setSubtitleAttr(99, &font));

@@ -191,6 +191,10 @@ int MpvHandle::set(const char* property, const char* value) {
     return setProperty(property, MPV_FORMAT_STRING, &value);
 }
 
+int MpvHandle::set(const char* property, MpvNode& value) {
+    return setProperty(property, MPV_FORMAT_NODE, value.get());
+}
+
 int MpvHandle::set(const char* property, const std::vector<std::string>& values) {
     std::vector<mpv_node> nodes(values.size());
     for (size_t i = 0; i < values.size(); i++) {

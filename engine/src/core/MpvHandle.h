@@ -45,6 +45,8 @@ public:
     int set(const char* property, double value);
     int set(const char* property, const char* value);
     int set(const char* property, const std::string& value) { return set(property, value.c_str()); }
+    // As getNode gave it.
+    int set(const char* property, MpvNode& value);
     // A list of texts, which may contain any character.
     int set(const char* property, const std::vector<std::string>& values);
 

@@ -39,10 +39,12 @@ void openOrLog(SubtitleLoader& loader, const SubtitleFile& file) {
 
 int SubtitleLoader::open(const SubtitleFile& file) {
     std::lock_guard<std::mutex> lock(mOpenMutex);
-    const std::optional<std::string> usual = mMpv.getString("demuxer-lavf-o");
+    // As a tree: mpv does not take its own text for a list with commas in it.
+    MpvNode usual;
+    const bool hasUsual = mMpv.getNode("demuxer-lavf-o", usual);
     mMpv.set("demuxer-lavf-o", demuxerOptions(file));
     const int error = isLocal(file) ? openNow(file) : openInTime(file);
-    mMpv.set("demuxer-lavf-o", usual.value_or(""));
+    if (hasUsual) mMpv.set("demuxer-lavf-o", usual);
     return error;
 }
 
