@@ -108,6 +108,7 @@ status_t MediaFile::open(std::unique_ptr<ByteSource> source, const MediaOpenOpti
 status_t MediaFile::attachSource(std::unique_ptr<ByteSource> source) {
     mSource = std::move(source);
     uint8_t* buffer = static_cast<uint8_t*>(av_malloc(kBufferSize));
+    if (buffer == nullptr) return NO_MEMORY;
     mSourceContext = avio_alloc_context(buffer, kBufferSize, 0, mSource.get(), readSource, nullptr,
                                         mSource->isSeekable() ? seekSource : nullptr);
     if (mSourceContext != nullptr) return OK;
