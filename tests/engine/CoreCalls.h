@@ -29,5 +29,24 @@ int questionsWhileRendering();
 // What any core was given last: percent, and whether it is silent.
 double newestVolume();
 bool newestMute();
+bool newestPause();
+
+// While it lives, every core refuses to have that property set, or to carry out commands
+// of that name, with MPV_ERROR_PROPERTY_ERROR or MPV_ERROR_COMMAND. One of each at a time;
+// the name must outlive it.
+class RefusedProperty {
+public:
+    explicit RefusedProperty(const char* name);
+    ~RefusedProperty();
+    RefusedProperty(const RefusedProperty&) = delete;
+    RefusedProperty& operator=(const RefusedProperty&) = delete;
+};
+class RefusedCommand {
+public:
+    explicit RefusedCommand(const char* name);
+    ~RefusedCommand();
+    RefusedCommand(const RefusedCommand&) = delete;
+    RefusedCommand& operator=(const RefusedCommand&) = delete;
+};
 
 }  // namespace orvtest

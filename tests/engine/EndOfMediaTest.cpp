@@ -80,8 +80,9 @@ TEST_F(EndOfMediaTest, ASeekThatOnlyTouchesTheEndDoesNotComplete) {
     ASSERT_EQ(NO_ERROR, player->start());
     for (int i = 0; i < 5; i++) {
         ASSERT_EQ(NO_ERROR, player->seekTo(17000 + i, Mode::SEEK_CLOSEST_SYNC));
-        EXPECT_NEAR(15000, position(), 500);
-        EXPECT_TRUE(remains([&] { return player->isPlaying(); }));
+        // It plays on from there: what the seek met of the end is reported before.
+        EXPECT_TRUE(eventually([&] { return position() > 15200 && position() < 17000; }));
+        EXPECT_TRUE(player->isPlaying());
     }
     EXPECT_EQ(0, events->count(MEDIA_PLAYBACK_COMPLETE));
 }

@@ -8,8 +8,10 @@
 #include <vector>
 
 #include "Gate.h"
+#include "OtherThread.h"
 
 using orvtarn::Gate;
+using orvtest::OtherThread;
 
 namespace {
 
@@ -24,22 +26,28 @@ TEST(GateTest, ClosesOnceAndLetsNobodyIn) {
 
 TEST(GateTest, IsEmptyWhenTheLastHasLeft) {
     Gate gate;
-    std::atomic<bool> isEmpty{false};
-    std::thread waiting;
+    std::unique_ptr<OtherThread> waiting;
     {
         const Gate::Pass first(gate);
         {
             const Gate::Pass second(gate);
             gate.close();
-            waiting = std::thread([&] {
-                gate.awaitEmpty();
-                isEmpty = true;
-            });
+            waiting = std::make_unique<OtherThread>([&] { gate.awaitEmpty(); });
+            EXPECT_TRUE(waiting->isAsleep()) << "two are inside";
         }
-        EXPECT_FALSE(isEmpty) << "one is inside";
+        EXPECT_TRUE(waiting->isAsleep()) << "one is inside";
     }
+    waiting->join();
+}
+
+TEST(GateTest, IsDoneWhenItIsSaidToBe) {
+    Gate gate;
+    gate.close();
+    OtherThread waiting([&] { gate.awaitDone(); });
+    EXPECT_TRUE(waiting.isAsleep());
+    gate.setDone();
     waiting.join();
-    EXPECT_TRUE(isEmpty);
+    gate.awaitDone();
 }
 
 // What is inside may be taken apart, and the gate with it, as soon as it is empty.

@@ -2,8 +2,10 @@
 #include <fcntl.h>
 #include <gtest/gtest.h>
 #include <orvtarn/PlayerTypes.h>
+#include <string.h>
 #include <unistd.h>
 
+#include <algorithm>
 #include <random>
 
 #include "TestMedia.h"
@@ -160,40 +162,76 @@ TEST(MediaFile, KnowsItsStreams) {
     EXPECT_EQ(file->stream(2), nullptr);
 }
 
-// Everything that the engine reads from a file, whatever the bytes. Nothing is
-// expected but the return.
-void readAll(std::vector<uint8_t> bytes) {
+// One of those that the headers name.
+bool isKnown(android::status_t status) {
+    const android::status_t known[] = {android::OK, android::NO_MEMORY, ORV_ERROR_IO,
+                                       ORV_ERROR_MALFORMED, ORV_ERROR_UNSUPPORTED};
+    return std::find(std::begin(known), std::end(known), status) != std::end(known);
+}
+
+// Draws a small picture, and sees that nothing is written behind its rows.
+android::status_t drawSmall(Thumbnailer& thumbnailer) {
+    constexpr int kRows = 9;
+    constexpr uint8_t kUntouched = 0xA5;
+    std::vector<uint8_t> pixels(64 * (kRows + 1), kUntouched);
+    const android::status_t status =
+        thumbnailer.draw(1000, {pixels.data(), 64 * kRows, ORV_COLOR_MODE_RGB565, 16, kRows});
+    EXPECT_TRUE(std::all_of(pixels.begin() + 64 * kRows, pixels.end(),
+                            [](uint8_t byte) { return byte == kUntouched; }));
+    return status;
+}
+
+// Everything that the engine reads from a file, whatever the bytes: what comes out is an
+// answer that there is. Returns whether a picture was drawn.
+bool readAll(std::vector<uint8_t> bytes) {
+    const size_t size = bytes.size();
     std::unique_ptr<MediaFile> file;
     MediaOpenOptions options;
     options.timeLimit = std::chrono::seconds(2);
-    if (MediaFile::open(std::make_unique<MemorySource>(std::move(bytes)), options, file) != 0) {
-        return;
-    }
-    free(extractAlbumArt(*file));
+    android::status_t status =
+        MediaFile::open(std::make_unique<MemorySource>(std::move(bytes)), options, file);
+    EXPECT_TRUE(isKnown(status)) << status;
+    EXPECT_EQ(status == 0, file != nullptr);
+    if (file == nullptr) return false;
+    MediaAlbumArt* art = extractAlbumArt(*file);
+    EXPECT_LE(art == nullptr ? 0 : art->size(), size);
+    free(art);
     metaDataInfo(*file);
     SubtitleTrackInfo chapter;
-    for (int i = 0; chapterRecord(*file, i, chapter); i++) continue;
+    int chapters = 0;
+    while (chapterRecord(*file, chapters, chapter)) chapters++;
+    EXPECT_EQ(chapterCount(*file), chapters);
     std::unique_ptr<Thumbnailer> thumbnailer;
-    if (Thumbnailer::create(std::move(file), -1, thumbnailer) != 0) return;
-    uint8_t pixels[64 * 9];
-    thumbnailer->draw(1000, {pixels, sizeof(pixels), ORV_COLOR_MODE_RGB565, 16, 9});
+    status = Thumbnailer::create(std::move(file), -1, thumbnailer);
+    EXPECT_TRUE(isKnown(status)) << status;
+    EXPECT_EQ(status == 0, thumbnailer != nullptr);
+    if (thumbnailer == nullptr) return false;
+    status = drawSmall(*thumbnailer);
+    EXPECT_TRUE(isKnown(status)) << status;
+    return status == 0;
 }
 
 TEST(MediaFile, SurvivesDamagedMedia) {
     std::mt19937 random(1);  // the same damage each time
+    int drawn = 0;
+    int rounds = 0;
     for (const char* name : {"silent.mkv", "covered.mp3", "covered.m4a", "tagged.ogg",
                              "covered.flac", "alpha.mov", "still.png"}) {
+        SCOPED_TRACE(name);
         const std::vector<uint8_t> whole = bytesOf(mediaPath(name));
-        for (int round = 0; round < 6; round++) {
+        for (int round = 0; round < 6; round++, rounds++) {
             std::vector<uint8_t> damaged = whole;
             // Near the start, where the structure is.
             const size_t range =
                 round % 2 == 0 ? std::min<size_t>(2000, whole.size()) : whole.size();
             for (int i = 0; i < 20; i++) damaged[random() % range] = static_cast<uint8_t>(random());
             if (round > 3) damaged.resize(random() % whole.size());
-            readAll(std::move(damaged));
+            drawn += readAll(std::move(damaged));
         }
+        EXPECT_EQ(strcmp(name, "tagged.ogg") != 0, readAll(whole)) << "undamaged";
     }
+    EXPECT_GT(drawn, 0) << "the damage leaves some";
+    EXPECT_LT(drawn, rounds) << "and not all";
 }
 
 }  // namespace

@@ -71,6 +71,7 @@ struct BadAnswer {
     HttpFaults faults;
     int status;
 };
+void PrintTo(const BadAnswer& answer, std::ostream* out) { *out << answer.name; }
 
 class BadAnswerTest : public NetworkTest, public testing::WithParamInterface<BadAnswer> {};
 
@@ -165,6 +166,7 @@ struct OddServer {
     const char* name;
     HttpFaults faults;
 };
+void PrintTo(const OddServer& server, std::ostream* out) { *out << server.name; }
 
 class OddServerTest : public NetworkTest, public testing::WithParamInterface<OddServer> {};
 
@@ -384,6 +386,7 @@ struct Lure {
     std::string file;
     std::string text;
 };
+void PrintTo(const Lure& lure, std::ostream* out) { *out << lure.name; }
 
 // What a text from a server leads to. Nothing of this machine is opened by it.
 class LureTest : public NetworkTest, public testing::WithParamInterface<Lure> {};

@@ -38,6 +38,8 @@ struct Kind {
     const char* filters = "";  // that ffmpeg does not apply by itself
 };
 
+void PrintTo(const Kind& kind, std::ostream* out) { *out << kind.file; }
+
 // B, G, R and X of each pixel that ffmpeg makes of the frame.
 std::vector<uint8_t> reference(const Kind& kind) {
     const std::string size = std::to_string(kind.width) + ":" + std::to_string(kind.height);

@@ -16,12 +16,22 @@ bool eventually(const std::function<bool()>& condition, int seconds) {
 }
 
 bool remains(const std::function<bool()>& condition) {
-    const auto end = std::chrono::steady_clock::now() + std::chrono::milliseconds(500);
-    while (std::chrono::steady_clock::now() < end) {
-        if (!condition()) return false;
-        std::this_thread::sleep_for(std::chrono::milliseconds(5));
-    }
-    return true;
+    constexpr uint64_t kFrames = 12;
+    const android::sp<FrameSink> frames = new FrameSink;
+    const android::sp<android::TarnPlayer> other = new android::TarnPlayer(-1);
+    other->setVideoSurfaceTexture(frames);
+    EXPECT_EQ(android::NO_ERROR, other->setDataSource(mediaPath("video.mp4").c_str(), nullptr));
+    EXPECT_EQ(android::NO_ERROR, other->prepare());
+    EXPECT_EQ(android::NO_ERROR, other->setLooping(1));
+    EXPECT_EQ(android::NO_ERROR, other->start());
+    bool holds = true;
+    const auto isOver = [&] {
+        holds = condition();
+        return !holds || frames->frameCount() >= kFrames;
+    };
+    EXPECT_TRUE(eventually(isOver, 60)) << "the other player does not play";
+    other->release();
+    return holds;
 }
 
 PlayerTest::PlayerTest() {

@@ -16,7 +16,9 @@ namespace orvtest {
 // Waits for a condition, asking again and again; false after the seconds.
 bool eventually(const std::function<bool()>& condition, int seconds = 15);
 
-// Whether a condition goes on to hold for half a second.
+// Whether a condition goes on to hold while another player opens its media and shows a
+// dozen frames: what the first would do of itself by then comes no later on a slow
+// machine.
 bool remains(const std::function<bool()>& condition);
 
 // A player with a surface and a listener, released at the end.

@@ -5,6 +5,7 @@
 #include <future>
 
 #include "FakeStream.h"
+#include "OtherThread.h"
 #include "PlayerTest.h"
 
 using namespace android;
@@ -39,10 +40,12 @@ protected:
     }
 
     void expectWaits(const std::function<status_t()>& operation, status_t answer) {
-        std::future<status_t> later = std::async(std::launch::async, operation);
-        EXPECT_EQ(std::future_status::timeout, later.wait_for(std::chrono::milliseconds(300)));
+        status_t answered = 99;
+        OtherThread later([&] { answered = operation(); });
+        EXPECT_TRUE(later.isAsleep());
         stream.mGo.set_value();
-        EXPECT_EQ(answer, later.get());
+        later.join();
+        EXPECT_EQ(answer, answered);
         EXPECT_EQ(NO_ERROR, released.get());
     }
 

@@ -6,6 +6,7 @@
 #include <sstream>
 #include <thread>
 
+#include "CoreCalls.h"
 #include "FakeStream.h"
 #include "PlayerTest.h"
 
@@ -104,7 +105,8 @@ TEST_F(SeekTest, FromTheEndGoesBackWithoutPlaying) {
     playToEnd();
     EXPECT_EQ(1000, positionAfter(1000, 0));
     EXPECT_FALSE(player->isPlaying());
-    EXPECT_TRUE(remains([&] { return position() == 1000; }));
+    EXPECT_TRUE(newestPause());
+    EXPECT_EQ(1000, position());
     ASSERT_EQ(NO_ERROR, player->start());
     EXPECT_GE(position(), 1000) << "not from the beginning";
     EXPECT_TRUE(events->waitFor(MEDIA_PLAYBACK_COMPLETE, 2));

@@ -1,6 +1,7 @@
 // SPDX-License-Identifier: Apache-2.0
 // Data sources: paths, URLs with headers, descriptors, and what they refuse.
 #include <fcntl.h>
+#include <orvtarn/PictureRecords.h>
 #include <orvtarn/PlayerTypes.h>
 #include <sys/stat.h>
 #include <unistd.h>
@@ -83,6 +84,7 @@ struct BrokenFile {
     const char* name;
     int status;
 };
+void PrintTo(const BrokenFile& file, std::ostream* out) { *out << file.name; }
 
 class BrokenFileTest : public SourceTest, public testing::WithParamInterface<BrokenFile> {};
 
@@ -112,6 +114,7 @@ struct HollowFile {
     const char* codec;
     E_Orv_Format format;
 };
+void PrintTo(const HollowFile& file, std::ostream* out) { *out << file.ending; }
 
 class HollowFileTest : public SourceTest, public testing::WithParamInterface<HollowFile> {};
 
@@ -209,6 +212,15 @@ TEST_F(SourceTest, HeadersGoWithEachRequestAndNoFurther) {
     headers.add(String8("X-Evil"), String8("x\r\nX-Smuggled: yes"));
     ASSERT_EQ(NO_ERROR, player->setDataSource(server.url("first").c_str(), &headers));
     ASSERT_EQ(NO_ERROR, player->prepare());
+    // The file is opened once more, for what playback does not know.
+    const size_t opened = server.requests().size();
+    MetaDataInfo info;
+    EXPECT_TRUE(player->getMetaDataInfo(info));
+    std::vector<uint8_t> pixels(64 * 9);
+    _Media_Thumbnail_Info_T thumbnail = {pixels.data(), static_cast<uint32_t>(pixels.size()),
+                                         ORV_COLOR_MODE_RGB565, 16, 9};
+    EXPECT_TRUE(player->getThumbnailInfo(&thumbnail));
+    EXPECT_GT(server.requests().size(), opened);
     player->reset();
     ASSERT_EQ(NO_ERROR, prepareUrl(server.url("second")));
     for (const std::string& request : server.requests()) {
@@ -217,6 +229,21 @@ TEST_F(SourceTest, HeadersGoWithEachRequestAndNoFurther) {
         EXPECT_EQ(first, request.find("User-Agent: Set Top/1.0\r\n") != std::string::npos)
             << request;
         EXPECT_EQ(std::string::npos, request.find("X-Smuggled")) << request;
+    }
+}
+
+// The server is asked why, too.
+TEST_F(SourceTest, HeadersGoWithTheRequestsAboutAFailure) {
+    HttpServer server(mediaPath("noise.bin"));
+    KeyedVector<String8, String8> headers;
+    headers.add(String8("X-Token"), String8("a"));
+    headers.add(String8("User-Agent"), String8("Set Top/1.0"));
+    ASSERT_EQ(NO_ERROR, player->setDataSource(server.url("first").c_str(), &headers));
+    EXPECT_NE(NO_ERROR, player->prepare());
+    EXPECT_GT(server.requests().size(), 1u);
+    for (const std::string& request : server.requests()) {
+        EXPECT_NE(std::string::npos, request.find("X-Token: a\r\n")) << request;
+        EXPECT_NE(std::string::npos, request.find("User-Agent: Set Top/1.0\r\n")) << request;
     }
 }
 

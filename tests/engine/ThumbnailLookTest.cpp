@@ -20,6 +20,7 @@ struct Look {
     int width;
     int height;
 };
+void PrintTo(const Look& look, std::ostream* out) { *out << look.name; }
 
 // Half a second into a second of 160x90 (160x96 interlaced).
 const Look kLooks[] = {

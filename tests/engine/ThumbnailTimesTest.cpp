@@ -21,6 +21,7 @@ struct Media {
     const char* name;
     std::vector<double> seconds;
 };
+void PrintTo(const Media& media, std::ostream* out) { *out << media.name; }
 
 // Formats without an index, whose times do not begin at 0. Behind the second key
 // frame there is little left: guesses tend to land there.

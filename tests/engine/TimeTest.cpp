@@ -3,6 +3,7 @@
 #include <media/MediaTrack.h>
 #include <orvtarn/PlayerTypes.h>
 
+#include <algorithm>
 #include <cmath>
 
 #include "CountedFrames.h"
@@ -21,6 +22,8 @@ struct Counted {
     double framesPerSecond;  // by which the numbers count
     int last;                // frame
 };
+
+void PrintTo(const Counted& media, std::ostream* out) { *out << media.file; }
 
 const Counted kSixty = {"counted-60.mkv", 60, 239};
 const Counted kSound = {"counted-sound.mkv", 60, 239};
@@ -228,6 +231,45 @@ TEST_F(TimeTest, PlaybackBeginsAgainAtItsFirstFrame) {
     expectShown(kFilm);
     EXPECT_LT(position(), 2000);
 }
+
+// After a seek its frame is shown, however busy the machine is.
+TEST_F(TimeTest, AfterTheEndItBeginsWithFrameZero) {
+    open(kFilm.file);
+    ASSERT_EQ(NO_ERROR, player->setSpeed(4000));
+    playToEnd();
+    ASSERT_EQ(NO_ERROR, player->setSpeed(1000));
+    ASSERT_TRUE(eventually([&] { return frames->last().number == kFilm.last; }));
+    frames->take();
+    ASSERT_EQ(NO_ERROR, player->start());
+    ASSERT_TRUE(eventually([&] { return frames->last().number != kFilm.last; }));
+    const std::vector<CountedFrame> seen = frames->take();
+    const auto first = std::find_if(seen.begin(), seen.end(), [](const CountedFrame& frame) {
+        return frame.number != kFilm.last;  // which may be drawn once more
+    });
+    ASSERT_NE(seen.end(), first);
+    EXPECT_EQ(0, first->number);
+}
+
+// At the start of the media the direction turns.
+class TurningTest : public TimeTest, public testing::WithParamInterface<int> {};
+
+TEST_P(TurningTest, BackwardToTheStartItGoesOnFromFrameZero) {
+    open(kFilm.file);
+    ASSERT_EQ(NO_ERROR, seekTo(2000));
+    ASSERT_EQ(NO_ERROR, player->setSpeed(GetParam()));
+    ASSERT_EQ(NO_ERROR, player->start());
+    ASSERT_TRUE(eventually([&] { return speed() == 1000; }));
+    ASSERT_TRUE(eventually([&] { return position() > 1500; }));
+    ASSERT_EQ(NO_ERROR, player->pause());
+    int lowest = kFilm.last;
+    const std::vector<CountedFrame> seen = frames->take();
+    for (const CountedFrame& frame : seen) lowest = std::min(lowest, frame.number);
+    EXPECT_EQ(0, lowest);
+    EXPECT_GT(seen.back().number, lowest);
+}
+
+INSTANTIATE_TEST_SUITE_P(Speeds, TurningTest, testing::Values(-1000, -16000),
+                         [](const auto& info) { return "Minus" + std::to_string(-info.param); });
 
 class PositionTest : public TimeTest, public testing::WithParamInterface<Counted> {};
 
