@@ -173,6 +173,9 @@ struct DropCase {
     int code;
     bool dropped;
 };
+void PrintTo(const DropCase& one, std::ostream* out) {
+    *out << one.code << (one.dropped ? " is dropped" : " is kept");
+}
 
 class ShouldDropTest : public ServiceFixture, public testing::WithParamInterface<DropCase> {};
 

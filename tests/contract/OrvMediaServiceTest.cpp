@@ -105,6 +105,9 @@ struct SsifCase {
     const char* url;
     bool ssif;
 };
+void PrintTo(const SsifCase& one, std::ostream* out) {
+    *out << (one.url == nullptr ? "null" : one.url);
+}
 
 class SsifUrlTest : public ServiceFixture, public testing::WithParamInterface<SsifCase> {};
 

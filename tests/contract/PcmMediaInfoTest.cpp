@@ -157,6 +157,7 @@ struct SizeCase {
     jlong java;
     int64_t engine;
 };
+void PrintTo(const SizeCase& one, std::ostream* out) { *out << one.java; }
 
 class PcmSizeTest : public PcmMediaInfoTest, public testing::WithParamInterface<SizeCase> {};
 

@@ -166,6 +166,7 @@ struct MaskCase {
     int mask;
     std::vector<std::string> engine;
 };
+void PrintTo(const MaskCase& one, std::ostream* out) { *out << one.mask; }
 
 class SubtitleMaskTest : public SubtitleAttrTest, public testing::WithParamInterface<MaskCase> {};
 

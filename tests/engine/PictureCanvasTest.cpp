@@ -132,6 +132,54 @@ TEST(PictureCanvas, KeepsThePicturesAlpha) {
     EXPECT_EQ(pixelOf(ORV_COLOR_MODE_ARGB4444, clear), 0x0FFFu);
 }
 
+TEST(PictureCanvas, RoundsAlphaToTheBitsThatThereAre) {
+    const auto white = [](uint8_t alpha) { return Rgba{255, 255, 255, alpha}; };
+    EXPECT_EQ(pixelOf(ORV_COLOR_MODE_ARGB1555, white(0x7F)), 0x7FFFu);
+    EXPECT_EQ(pixelOf(ORV_COLOR_MODE_ARGB1555, white(0x80)), 0xFFFFu);
+    EXPECT_EQ(pixelOf(ORV_COLOR_MODE_ARGB4444, white(8)), 0x0FFFu);
+    EXPECT_EQ(pixelOf(ORV_COLOR_MODE_ARGB4444, white(9)), 0x1FFFu);
+    EXPECT_EQ(pixelOf(ORV_COLOR_MODE_ARGB4444, white(244)), 0xEFFFu);
+    EXPECT_EQ(pixelOf(ORV_COLOR_MODE_ARGB4444, white(249)), 0xFFFFu);
+}
+
+// The red, green and blue of what such a frame of one colour is drawn as.
+Rgba rgbOf(AVPixelFormat format, AVColorSpace matrix, AVColorRange range, int y, int u, int v) {
+    const Frame frame(av_frame_alloc());
+    frame->format = format;
+    frame->width = frame->height = 16;
+    frame->colorspace = matrix;
+    frame->color_range = range;
+    EXPECT_EQ(av_frame_get_buffer(frame.get(), 0), 0);
+    memset(frame->data[0], y, static_cast<size_t>(frame->linesize[0]) * 16);
+    memset(frame->data[1], u, static_cast<size_t>(frame->linesize[1]) * 8);
+    memset(frame->data[2], v, static_cast<size_t>(frame->linesize[2]) * 8);
+    Drawn drawn(ORV_COLOR_MODE_ARGB8888, 4, 4);
+    EXPECT_EQ(drawPicture(*frame, drawn.request), 0);
+    const uint32_t pixel = drawn.pixel(2, 2);
+    return {static_cast<uint8_t>(pixel >> 16), static_cast<uint8_t>(pixel >> 8),
+            static_cast<uint8_t>(pixel), static_cast<uint8_t>(pixel >> 24)};
+}
+
+// The red of BT.601 has some green by the matrix of BT.709.
+TEST(PictureCanvas, GoesByTheFramesMatrix) {
+    const auto green = [](AVColorSpace matrix) {
+        return rgbOf(AV_PIX_FMT_YUV420P, matrix, AVCOL_RANGE_MPEG, 81, 90, 240).g;
+    };
+    EXPECT_NEAR(green(AVCOL_SPC_SMPTE170M), 0, 3);
+    EXPECT_NEAR(green(AVCOL_SPC_UNSPECIFIED), 0, 3) << "as its size is usual with";
+    EXPECT_NEAR(green(AVCOL_SPC_BT709), 24, 4);
+}
+
+TEST(PictureCanvas, GoesByTheFramesRange) {
+    const auto gray = [](AVPixelFormat format, AVColorRange range) {
+        return rgbOf(format, AVCOL_SPC_SMPTE170M, range, 16, 128, 128).g;
+    };
+    EXPECT_NEAR(gray(AV_PIX_FMT_YUV420P, AVCOL_RANGE_MPEG), 0, 1);
+    EXPECT_NEAR(gray(AV_PIX_FMT_YUV420P, AVCOL_RANGE_UNSPECIFIED), 0, 1);
+    EXPECT_NEAR(gray(AV_PIX_FMT_YUV420P, AVCOL_RANGE_JPEG), 16, 1);
+    EXPECT_NEAR(gray(AV_PIX_FMT_YUVJ420P, AVCOL_RANGE_UNSPECIFIED), 16, 1);
+}
+
 // Luma and chroma of BT.601 in limited range: red is Y 81, U 90, V 240.
 TEST(PictureCanvas, DrawsYuvInItsByteOrder) {
     const auto near = [](int value, int expected) { return abs(value - expected) <= 2; };
@@ -194,6 +242,8 @@ bool isRefused(int32_t mode, int32_t width, int32_t height, uint32_t size, bool 
 
 TEST(PictureCanvas, RefusesWhatCannotBeDrawn) {
     EXPECT_FALSE(isRefused(ORV_COLOR_MODE_ARGB8888, 10, 2, 128));
+    EXPECT_FALSE(isRefused(ORV_COLOR_MODE_RGB565, 16384, 1, 32768));
+    EXPECT_FALSE(isRefused(ORV_COLOR_MODE_RGB565, 1, 16384, 64 * 16384));
     EXPECT_TRUE(isRefused(ORV_COLOR_MODE_ARGB8888, 10, 2, 127));
     EXPECT_TRUE(isRefused(ORV_COLOR_MODE_ARGB8888, 10, 2, 128, false));
     for (int mode : {-1, 0, 1, 2, 6, 7, 8, 13, 14, 19, INT32_MAX}) {

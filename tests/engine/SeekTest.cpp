@@ -3,11 +3,11 @@
 #include <media/MediaTrack.h>
 
 #include <future>
-#include <sstream>
 #include <thread>
 
 #include "CoreCalls.h"
 #include "FakeStream.h"
+#include "MediaPackets.h"
 #include "PlayerTest.h"
 
 using namespace android;
@@ -151,36 +151,10 @@ TEST_F(SeekTest, RefusesModesThatAreNone) {
     EXPECT_EQ(0, position());
 }
 
-// Bytes: the packets' places are asked of ffprobe.
-struct Packet {
-    double time;
-    long long position;
-};
-
-std::string probe(const std::string& name, const std::string& what) {
-    const std::vector<uint8_t> output =
-        outputOf("ffprobe -v error -select_streams v -show_entries " + what + " -of csv=p=0 '" +
-                 mediaPath(name) + "'");
-    return std::string(output.begin(), output.end());
-}
-
-std::vector<Packet> packetsOf(const std::string& name) {
-    const double start = atof(probe(name, "format=start_time").c_str());
-    std::istringstream lines(probe(name, "packet=pts_time,pos"));
-    std::vector<Packet> packets;
-    for (std::string line; std::getline(lines, line);) {
-        Packet packet = {};
-        if (sscanf(line.c_str(), "%lf,%lld", &packet.time, &packet.position) != 2) continue;
-        packet.time -= start;
-        packets.push_back(packet);
-    }
-    return packets;
-}
-
 class ByteSeekTest : public SeekTest, public testing::WithParamInterface<const char*> {};
 
 TEST_P(ByteSeekTest, GoesToTheFrameAtTheByteAndSaysSo) {
-    const std::vector<Packet> packets = packetsOf(GetParam());
+    const std::vector<MediaPacket> packets = packetsOf(GetParam());
     ASSERT_GT(packets.size(), 49u);
     open(GetParam());
     for (size_t i : {5u, 31u, 40u, 49u, 12u}) {

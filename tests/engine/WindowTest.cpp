@@ -11,6 +11,7 @@
 
 #include "CountedFrames.h"
 #include "LogCapture.h"
+#include "OtherThread.h"
 #include "PlayerTest.h"
 #include "TestWindow.h"
 #include "core/EglLibrary.h"
@@ -347,7 +348,7 @@ using BrokenEglTest = ChangedEglTest;
 
 std::atomic<int> gSwaps;
 std::atomic<int> gSwapInterval;
-NativeWindow* gClosing;
+std::atomic<bool> gMaySwap;
 std::atomic<bool> gIsSwapping;
 
 EGLBoolean countedSwap(EGLDisplay display, EGLSurface surface) {
@@ -362,9 +363,8 @@ EGLBoolean notedInterval(EGLDisplay display, EGLint interval) {
 
 EGLBoolean swapWhileItCloses(EGLDisplay display, EGLSurface surface) {
     gIsSwapping = true;
-    eventually([] { return gClosing->isClosing(); });
+    eventually([] { return gMaySwap.load(); });
     const EGLBoolean swapped = gWhole.swapBuffers(display, surface);
-    remains([] { return true; });
     gIsSwapping = false;
     return swapped;
 }
@@ -422,13 +422,21 @@ TEST_F(WatchedEglTest, NothingIsDrawnOnACoveredWindow) {
 // What draws may touch the window until close returns, and not afterwards.
 TEST_F(WatchedEglTest, AWindowThatClosesIsWaitedFor) {
     openOnWindow("video.mp4");
-    gClosing = native.get();
+    gMaySwap = false;
     ASSERT_TRUE(window->waitFor(isLit));
     orvtarn::eglLibrary()->swapBuffers = swapWhileItCloses;
     ASSERT_EQ(android::NO_ERROR, player->start());
     ASSERT_TRUE(eventually([] { return gIsSwapping.load(); }));
-    native->close();
-    EXPECT_FALSE(gIsSwapping);
+    bool wasSwapping = true;
+    OtherThread closing([&] {
+        native->close();
+        wasSwapping = gIsSwapping;
+    });
+    EXPECT_TRUE(closing.isAsleep());
+    EXPECT_TRUE(native->isClosing());
+    gMaySwap = true;
+    closing.join();
+    EXPECT_FALSE(wasSwapping);
 }
 
 Display* gEngines;
