@@ -48,10 +48,10 @@ int LibavFailure::count() const {
 }  // namespace orvtest
 
 // The linker knows names alone: pointers to libav's records are those to anything here.
-#define ORV_WRAP(Result, name, parameters, arguments, failure)               \
-    extern "C" Result __real_##name parameters;                              \
-    extern "C" Result __wrap_##name parameters {                             \
-        return orvtest::mustFail(#name) ? failure : __real_##name arguments; \
+#define ORV_WRAP(Result, name, parameters, arguments, failure)                   \
+    extern "C" Result __real_##name parameters;                                  \
+    extern "C" Result __wrap_##name parameters {                                 \
+        return orvtest::mustFail(#name) ? (failure) : (__real_##name arguments); \
     }
 
 using orvtest::kBroken;

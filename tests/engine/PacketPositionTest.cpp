@@ -59,8 +59,8 @@ TEST_P(PacketPlaceTest, BehindTheLastIsTheLastOnes) {
 
 INSTANTIATE_TEST_SUITE_P(Files, PacketPlaceTest,
                          testing::Values(Leading{"short.mp4", "v:0"}, Leading{"short.ts", "v:0"},
-                                         Leading{"feature.mkv", "v:0"}, Leading{"tone.mp3", "a:0"},
-                                         Leading{"covered.mp3", "a:0"},
+                                         Leading{"feature.mkv", "v:0"}, Leading{"video.mkv", "v:0"},
+                                         Leading{"tone.mp3", "a:0"}, Leading{"covered.mp3", "a:0"},
                                          Leading{"covered.m4a", "a:0"}),
                          [](const auto& info) { return orvtest::testName(info.param.file); });
 

@@ -20,7 +20,7 @@ bool remains(const std::function<bool()>& condition) {
     const android::sp<FrameSink> frames = new FrameSink;
     const android::sp<android::TarnPlayer> other = new android::TarnPlayer(-1);
     other->setVideoSurfaceTexture(frames);
-    EXPECT_EQ(android::NO_ERROR, other->setDataSource(mediaPath("video.mp4").c_str(), nullptr));
+    EXPECT_EQ(android::NO_ERROR, other->setDataSource(mediaPath("silent.mp4").c_str(), nullptr));
     EXPECT_EQ(android::NO_ERROR, other->prepare());
     EXPECT_EQ(android::NO_ERROR, other->setLooping(1));
     EXPECT_EQ(android::NO_ERROR, other->start());
