@@ -100,6 +100,40 @@ TEST_F(MsgDispatcherTest, GivesTheWeakReferenceBackBeforeTheClass) {
     EXPECT_THAT(vm.callsOf("AttachCurrentThread"), IsEmpty());
 }
 
+// As the dispatcher's worker, when a player is released inside its own event.
+TEST_F(MsgDispatcherTest, LastReferenceOnANativeThreadAttachesItMeanwhile) {
+    make();
+    bool attached = true;
+    Outcome outcome;
+    vm.onNativeThread([&] {
+        outcome = destroy();
+        attached = vm.isAttached();
+    });
+    EXPECT_THAT(outcome, ReturnsNothing()
+                             .logs({enter("MsgDispatcher::~MsgDispatcher"),
+                                    leave("MsgDispatcher::~MsgDispatcher")})
+                             .makesGlobals(-2));
+    EXPECT_FALSE(attached);
+    EXPECT_THAT(vm.callsOf("AttachCurrentThread"), SizeIs(1));
+}
+
+TEST_F(MsgDispatcherTest, FailedAttachLeavesTheReferencesAndSkipsTheDetach) {
+    make();
+    vm.fail("AttachCurrentThread");
+    vm.onNativeThread([&] { EXPECT_EQ(destroy().globals, 0); });
+    EXPECT_THAT(vm.callsOf("DetachCurrentThread"), IsEmpty());
+    leftGlobals = 2;
+}
+
+TEST_F(MsgDispatcherTest, WithoutVmTheReferencesAreLeft) {
+    make();
+    g__JavaVM = nullptr;
+    vm.onNativeThread([&] { EXPECT_EQ(destroy().globals, 0); });
+    g__JavaVM = vm.javaVm();
+    EXPECT_THAT(vm.callsOf("AttachCurrentThread"), IsEmpty());
+    leftGlobals = 2;
+}
+
 TEST_F(MsgDispatcherTest, MissingClassThrowsAndCarriesOn) {
     vm.tolerate("NewGlobalRef: called with a pending java/lang/Exception");
     vm.fail("GetObjectClass");

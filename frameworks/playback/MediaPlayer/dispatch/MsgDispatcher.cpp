@@ -36,13 +36,13 @@ MsgDispatcher::~MsgDispatcher() {
     // player that is released inside its own event loses it on the dispatcher's
     // thread, which is detached by then.
     JNIEnv* env = AndroidRuntime::getJNIEnv();
-    const bool attach = env == nullptr && g__JavaVM != nullptr;
-    if (attach) g__JavaVM->AttachCurrentThread(&env, nullptr);
+    const bool attached = env == nullptr && g__JavaVM != nullptr &&
+                          g__JavaVM->AttachCurrentThread(&env, nullptr) >= 0;
     if (env != nullptr) {
         env->DeleteGlobalRef(mObject);
         env->DeleteGlobalRef(mClass);
     }
-    if (attach) g__JavaVM->DetachCurrentThread();
+    if (attached) g__JavaVM->DetachCurrentThread();
     ALOGI("MsgDispatcher::~MsgDispatcher(): Leave\n");
 }
 
