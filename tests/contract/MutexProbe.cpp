@@ -2,7 +2,10 @@
 #include "MutexProbe.h"
 
 #include <errno.h>
+#include <gtest/gtest.h>
+#include <os/ScopedMutex.h>
 
+#include <atomic>
 #include <chrono>
 #include <thread>
 
@@ -72,6 +75,23 @@ bool isAwaited(os::Mutex& mutex) {
     // As glibc's mutexes have it: 0 for free, 1 for taken, 2 for taken and awaited.
     const int* lock = &(mutex.*memberOf(NativeMutex{})).__data.__lock;
     return __atomic_load_n(lock, __ATOMIC_RELAXED) > 1;
+}
+
+void expectToWaitFor(os::Mutex& mutex, const std::function<void()>& operation,
+                     const std::function<void()>& meanwhile) {
+    std::atomic<bool> done{false};
+    std::thread operating;
+    {
+        const os::ScopedMutex held(mutex);
+        operating = std::thread([&] {
+            operation();
+            done = true;
+        });
+        while (!done && !isAwaited(mutex)) std::this_thread::yield();
+        EXPECT_FALSE(done) << "it does not wait";
+        meanwhile();
+    }
+    operating.join();
 }
 
 }  // namespace orvtest

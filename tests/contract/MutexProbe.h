@@ -40,4 +40,10 @@ private:
 std::vector<const pthread_mutex_t*> mutexesMadeFirst();
 const pthread_mutex_t* nativeMutex(const os::Mutex& mutex);
 
+// Runs the operation on another thread while the mutex is held here: it must wait for
+// it. The other action runs meanwhile.
+void expectToWaitFor(
+    os::Mutex& mutex, const std::function<void()>& operation,
+    const std::function<void()>& meanwhile = [] {});
+
 }  // namespace orvtest

@@ -5,9 +5,15 @@
 #include <thread>
 #include <vector>
 
+#include "MutexProbe.h"
 #include "PosixCalls.h"
+#include "PrivateMember.h"
 
 namespace orvtest {
+
+ORV_OPEN_MEMBER(QueueItems, os::MessageQueue<int>, mQueue);
+ORV_OPEN_MEMBER(QueueMutex, os::MessageQueue<int>, mMutex);
+
 namespace {
 
 TEST(OsMessageQueueTest, KeepsTheOrderAndPostsOnlyWhenItStopsBeingEmpty) {
@@ -62,6 +68,30 @@ TEST(OsMessageQueueTest, ManySendersLoseNothingAndKeepTheirOwnOrder) {
     }
     for (std::thread& sender : senders) sender.join();
     EXPECT_EQ(next, std::vector<int>(kSenders, kItems));
+}
+
+TEST(OsMessageQueueTest, SendWaitsForTheMutex) {
+    os::MessageQueue<int> queue;
+    expectToWaitFor(
+        queue.*memberOf(QueueMutex{}), [&] { queue.send(2); },
+        [&] { (queue.*memberOf(QueueItems{})).push(1); });
+    EXPECT_EQ(queue.recv(), 1);
+    EXPECT_EQ(queue.recv(), 2);
+}
+
+// The item is the one that is first once the receiver has the mutex.
+TEST(OsMessageQueueTest, RecvWaitsForTheMutexBeforeItLooksAtTheFirstItem) {
+    os::MessageQueue<int> queue;
+    queue.send(1);
+    int received = 0;
+    expectToWaitFor(
+        queue.*memberOf(QueueMutex{}), [&] { received = queue.recv(); },
+        [&] {
+            auto& items = queue.*memberOf(QueueItems{});
+            items.push(2);
+            items.pop();
+        });
+    EXPECT_EQ(received, 2);
 }
 
 TEST(OsMessageQueueTest, DropsWhatIsStillQueuedWithoutFreeingIt) {

@@ -5,14 +5,17 @@
 #include <sys/prctl.h>
 
 #include <algorithm>
-#include <atomic>
 #include <set>
 #include <thread>
 
 #include "DispatcherFixture.h"
 #include "MutexProbe.h"
+#include "PrivateMember.h"
 
 namespace orvtest {
+
+ORV_OPEN_MEMBER(InstanceMutex, ORV::SyncToAsync, s_mutexGlobal);
+
 namespace {
 
 using android::OrvMediaService;
@@ -269,20 +272,14 @@ TEST_F(SyncToAsyncTest, EachChangeWaitsForTheMutex) {
         {"addMsgHandler", [&] { dispatcher->addMsgHandler(service, poster); }},
         {"delMsgHandler", [&] { dispatcher->delMsgHandler(service); }}};
     for (const auto& [name, change] : changes) {
-        std::atomic<bool> done{false};
-        std::thread changing;
-        {
-            const Hold held = hold();
-            changing = std::thread([&, &run = change] {
-                run();
-                done = true;
-            });
-            while (!done && !isAwaited(dispatcherMutex())) std::this_thread::yield();
-            EXPECT_FALSE(done) << name << " does not wait";
-        }
-        changing.join();
+        SCOPED_TRACE(name);
+        expectToWaitFor(dispatcherMutex(), change);
     }
     waitForPauses(1);
+}
+
+TEST_F(SyncToAsyncTest, InstanceIsGivenUnderTheGlobalMutex) {
+    expectToWaitFor(*memberOf(InstanceMutex{}), [] { ORV::SyncToAsync::getInstance(); });
 }
 
 TEST_F(SyncToAsyncTest, MutexIsHeldWhileJavaRunsAndInThePause) {
