@@ -10,7 +10,7 @@ namespace android {
 
 // Zeroed, page-aligned memory for one frame, counted: it outlives its queue for
 // as long as a reader looks at it.
-class PixelMemory : public LightRefBase<PixelMemory> {
+class PixelMemory : public RefBase {
 public:
     // At least that many bytes; null when the system has none left.
     static sp<PixelMemory> allocate(size_t bytes);
@@ -21,9 +21,8 @@ public:
     bool suits(size_t bytes) const { return bytes <= mCapacity && mCapacity / 4 < bytes; }
 
 private:
-    friend class LightRefBase<PixelMemory>;
     PixelMemory(uint8_t* data, size_t capacity) : mData(data), mCapacity(capacity) {}
-    ~PixelMemory();
+    ~PixelMemory() override;
 
     uint8_t* const mData;
     const size_t mCapacity;

@@ -20,6 +20,7 @@ namespace {
 std::mutex sEnginesMutex;
 std::vector<std::shared_ptr<ScriptedEngine>> sEngines;
 std::atomic<int> sLive{0};
+std::function<void(ScriptedEngine&)> sWhenMade;
 
 }  // namespace
 
@@ -38,10 +39,15 @@ void ScriptedEngine::forgetAll() {
     sEngines.clear();
 }
 
+void ScriptedEngine::whenMade(std::function<void(ScriptedEngine&)> script) {
+    sWhenMade = std::move(script);
+}
+
 int ScriptedEngine::live() { return sLive; }
 
 std::shared_ptr<ScriptedEngine> ScriptedEngine::make(android::TarnPlayer* player, int decoder) {
     std::shared_ptr<ScriptedEngine> engine(new ScriptedEngine(player, decoder));
+    if (sWhenMade) sWhenMade(*engine);
     std::lock_guard<std::mutex> lock(sEnginesMutex);
     sEngines.push_back(engine);
     sLive++;

@@ -27,6 +27,9 @@ public:
     static std::shared_ptr<ScriptedEngine> last();
     static std::vector<std::shared_ptr<ScriptedEngine>> all();
     static void forgetAll();
+    // Runs for each engine from now on as it is made, on the thread that makes it;
+    // nullptr for nothing. Set while no engine is being made.
+    static void whenMade(std::function<void(ScriptedEngine&)> script);
     // Players that were made and not destroyed, forgotten or not.
     static int live();
 
@@ -57,6 +60,8 @@ public:
     std::map<int, SubtitleTrackInfo> subtitleTracks;
     std::map<int, AudioTrackInfo> audioTracks;
     std::optional<MetaDataInfo> metaDataInfo;
+    // Gets each stream that is to be played.
+    std::function<void(IOrvStreamSource*)> takeStream;
     // Draws into the request's buffer.
     std::function<void(_Media_Thumbnail_Info_T*)> drawThumbnail;
     // extractAlbumArt makes a block of these bytes; null without a value.
@@ -81,6 +86,12 @@ private:
 
     // Writes the call down and gives the scripted result, or the other.
     int call(const std::string& operation, const std::string& arguments, int unscripted);
+    // Adds a record that came in.
+    template <class Record>
+    void keep(std::vector<Record>& records, const Record& record) {
+        std::lock_guard<std::mutex> lock(mMutex);
+        records.push_back(record);
+    }
     void writeOut(const std::string& operation, int* out) const;
     void writeReply(const std::string& operation, android::Parcel* out) const;
 

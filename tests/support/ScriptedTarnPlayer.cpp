@@ -137,6 +137,7 @@ status_t TarnPlayer::setDataSource(const char* url, const KeyedVector<String8, S
     return mEngine->status("setDataSource", url, headers);
 }
 status_t TarnPlayer::setDataSource(IOrvStreamSource* source) {
+    if (mEngine->script->takeStream) mEngine->script->takeStream(source);
     return mEngine->status("setDataSource", static_cast<const void*>(source));
 }
 status_t TarnPlayer::setDataSource(int fd, int64_t offset, int64_t length) {
@@ -198,7 +199,7 @@ int TarnPlayer::getBufferPercent() { return mEngine->status("getBufferPercent");
 bool TarnPlayer::getThumbnailInfo(_Media_Thumbnail_Info_T* thumbnail) {
     ScriptedEngine& script = *mEngine->script;
     if (thumbnail == nullptr) return mEngine->flag("getThumbnailInfo", "null");
-    script.receivedThumbnails.push_back(*thumbnail);
+    script.keep(script.receivedThumbnails, *thumbnail);
     if (script.drawThumbnail) script.drawThumbnail(thumbnail);
     return mEngine->flag("getThumbnailInfo", thumbnail->u4BufferSize, thumbnail->i4CanvasColormode,
                          thumbnail->i4Width, thumbnail->i4Height);
@@ -215,7 +216,7 @@ MediaAlbumArt* TarnPlayer::extractAlbumArt() {
 }
 
 bool TarnPlayer::getMetaDataInfo(MetaDataInfo& info) {
-    mEngine->script->receivedMetaDataInfos.push_back(info);
+    mEngine->script->keep(mEngine->script->receivedMetaDataInfos, info);
     const bool found = handOut(mEngine->script->metaDataInfo, info);
     return mEngine->recordFlag(found, "getMetaDataInfo");
 }
@@ -235,7 +236,7 @@ bool TarnPlayer::getAudioTrackCount(int& count) {
     return mEngine->valueFlag("getAudioTrackCount", count);
 }
 bool TarnPlayer::getAudioTrackInfo(bool flag, int index, AudioTrackInfo& info) {
-    mEngine->script->receivedAudioTracks.push_back(info);
+    mEngine->script->keep(mEngine->script->receivedAudioTracks, info);
     const bool found = handOut(mEngine->script->audioTracks, index, info);
     return mEngine->recordFlag(found, "getAudioTrackInfo", flag, index);
 }
@@ -248,7 +249,7 @@ bool TarnPlayer::getSubtitleTrackCount(int& count) {
     return mEngine->valueFlag("getSubtitleTrackCount", count);
 }
 bool TarnPlayer::getSubtitleTrackInfo(int index, SubtitleTrackInfo& info) {
-    mEngine->script->receivedSubtitleTracks.push_back(info);
+    mEngine->script->keep(mEngine->script->receivedSubtitleTracks, info);
     const bool found = handOut(mEngine->script->subtitleTracks, index, info);
     return mEngine->recordFlag(found, "getSubtitleTrackInfo", index);
 }
@@ -277,7 +278,7 @@ status_t TarnPlayer::setPlayerRole(E_Orv_Player_Role_Type role) {
     return mEngine->status("setPlayerRole", int{role});
 }
 status_t TarnPlayer::setPCMMediaInfo(IORV_PB_CTRL_SET_MEDIA_INFO_T* info) {
-    if (info != nullptr) mEngine->script->receivedPcmInfos.push_back(*info);
+    if (info != nullptr) mEngine->script->keep(mEngine->script->receivedPcmInfos, *info);
     return mEngine->status("setPCMMediaInfo");
 }
 void TarnPlayer::setPcmFlag() { mEngine->status("setPcmFlag"); }

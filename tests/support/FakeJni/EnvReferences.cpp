@@ -10,7 +10,7 @@ namespace {
 // What a handle refers to, for the record.
 std::string targetOf(JNIEnv* env, jobject handle) {
     Vm& vm = *static_cast<FakeEnv*>(env)->vm;
-    std::lock_guard<std::recursive_mutex> lock(vm.mutex());
+    std::lock_guard<MachineMutex> lock(vm.mutex());
     std::string fault;
     return toString(Value::of(vm.references().resolve(handle, threadNumber(), &fault)));
 }

@@ -71,7 +71,7 @@ public:
     ThreadState& thread;
 
 private:
-    std::unique_lock<std::recursive_mutex> mLock;
+    std::unique_lock<MachineMutex> mLock;
 };
 
 void installClasses(JNINativeInterface& table);

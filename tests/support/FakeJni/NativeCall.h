@@ -64,6 +64,11 @@ Value toValue(Vm& vm, R result) {
     }
 }
 
+inline size_t markOf(Vm& vm) {
+    std::lock_guard<MachineMutex> lock(vm.mutex());
+    return vm.references().mark();
+}
+
 // thiz is the object, or for static methods the class. R and the arguments
 // must be the JNI types of the signature.
 template <typename R, typename... A>
@@ -73,14 +78,14 @@ NativeResult callNative(Vm& vm, Class& type, jobject thiz, const std::string& na
     auto function = reinterpret_cast<R (*)(JNIEnv*, jobject, A...)>(
         nativeFunction(vm, type, name, signature, shape));
     const int thread = threadNumber();
-    const size_t mark = vm.references().mark();
+    const size_t mark = markOf(vm);
     NativeResult result{};
     if constexpr (std::is_void_v<R>) {
         function(vm.env(), thiz, args...);
     } else {
         result.value = toValue(vm, function(vm.env(), thiz, args...));
     }
-    std::lock_guard<std::recursive_mutex> lock(vm.mutex());
+    std::lock_guard<MachineMutex> lock(vm.mutex());
     result.locals = vm.references().liveLocalsSince(mark, thread);
     vm.references().dropLocalsSince(mark, thread);
     return result;

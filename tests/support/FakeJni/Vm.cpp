@@ -13,7 +13,7 @@ namespace fakejni {
 
 namespace {
 
-using Lock = std::lock_guard<std::recursive_mutex>;
+using Lock = std::lock_guard<MachineMutex>;
 
 }  // namespace
 

@@ -5,13 +5,13 @@
 
 #include <functional>
 #include <map>
-#include <mutex>
 #include <optional>
 #include <set>
 #include <string>
 #include <thread>
 #include <vector>
 
+#include "FakeJni/MachineMutex.h"
 #include "FakeJni/Model.h"
 #include "FakeJni/References.h"
 
@@ -140,7 +140,7 @@ public:
 
     // --- for the environment's functions and for NativeCall
     ThreadState& thisThread();
-    std::recursive_mutex& mutex() { return mMutex; }
+    MachineMutex& mutex() { return mMutex; }
     References& references() { return mReferences; }
     bool mustFail(const std::string& function);
     void record(const std::string& function, const std::string& detail);
@@ -174,7 +174,7 @@ private:
     void defineBaseClasses();
     Class& add(const std::string& path, Class* super);
 
-    std::recursive_mutex mMutex;
+    MachineMutex mMutex;
     std::unique_ptr<Machine> mMachine;
     std::map<std::string, std::unique_ptr<Class>> mClasses;
     std::vector<std::string> mHidden;

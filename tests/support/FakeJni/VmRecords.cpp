@@ -11,7 +11,7 @@ namespace fakejni {
 
 namespace {
 
-using Lock = std::lock_guard<std::recursive_mutex>;
+using Lock = std::lock_guard<MachineMutex>;
 
 }  // namespace
 
@@ -45,7 +45,9 @@ void Vm::record(const std::string& function, const std::string& detail) {
     mCalls.push_back({function, detail, std::this_thread::get_id()});
     orvtest::Trace::add("jni", detail.empty() ? function : function + " " + detail);
     const auto action = mActions.find(function);
-    if (action != mActions.end()) action->second();
+    if (action == mActions.end()) return;
+    const MachineMutex::Look look(mMutex);
+    action->second();
 }
 
 void Vm::whenCalled(const std::string& function, std::function<void()> action) {

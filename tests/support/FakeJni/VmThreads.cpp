@@ -9,7 +9,7 @@ namespace fakejni {
 
 namespace {
 
-using Lock = std::lock_guard<std::recursive_mutex>;
+using Lock = std::lock_guard<MachineMutex>;
 
 Vm& vmOf(JavaVM* vm) { return *static_cast<FakeJavaVm*>(vm)->vm; }
 
