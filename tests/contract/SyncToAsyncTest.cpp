@@ -10,12 +10,8 @@
 
 #include "DispatcherFixture.h"
 #include "MutexProbe.h"
-#include "PrivateMember.h"
 
 namespace orvtest {
-
-ORV_OPEN_MEMBER(InstanceMutex, ORV::SyncToAsync, s_mutexGlobal);
-
 namespace {
 
 using android::OrvMediaService;
@@ -276,10 +272,6 @@ TEST_F(SyncToAsyncTest, EachChangeWaitsForTheMutex) {
         expectToWaitFor(dispatcherMutex(), change);
     }
     waitForPauses(1);
-}
-
-TEST_F(SyncToAsyncTest, InstanceIsGivenUnderTheGlobalMutex) {
-    expectToWaitFor(*memberOf(InstanceMutex{}), [] { ORV::SyncToAsync::getInstance(); });
 }
 
 TEST_F(SyncToAsyncTest, MutexIsHeldWhileJavaRunsAndInThePause) {
