@@ -4,15 +4,11 @@ package com.quintora.mmp;
 import static org.junit.jupiter.api.Assertions.assertEquals;
 import static org.junit.jupiter.api.Assertions.assertTrue;
 
-import java.io.IOException;
-import java.nio.file.Files;
-import java.nio.file.Path;
 import java.util.ArrayList;
 import java.util.List;
 import java.util.concurrent.CountDownLatch;
 import java.util.concurrent.Executor;
 import java.util.concurrent.TimeUnit;
-import java.util.stream.Stream;
 import org.junit.jupiter.api.AfterEach;
 import org.junit.jupiter.api.Test;
 
@@ -31,7 +27,8 @@ class ManyPlayersTest {
 
     @Test
     void playersWithoutMediaHaveNoThreads() throws Exception {
-        Wait.until("the threads of earlier players ended", () -> engineThreads() == 0);
+        Wait.until("the threads of earlier players ended",
+                () -> ProcessCounts.engineThreads() == 0);
         List<Thread> before = javaThreads("OrvMediaPlayer");
         for (int i = 0; i < 200; i++) {
             OrvMediaPlayer player = make(null);
@@ -39,7 +36,7 @@ class ManyPlayersTest {
             player.setLooping(true);
             player.resetAndWait();
         }
-        assertEquals(0, engineThreads());
+        assertEquals(0, ProcessCounts.engineThreads());
         List<Thread> now = javaThreads("OrvMediaPlayer");
         now.removeAll(before);
         assertEquals(List.of(), now);
@@ -50,9 +47,9 @@ class ManyPlayersTest {
         for (int i = 0; i < 3; i++) {
             play(make(null));
         }
-        assertTrue(engineThreads() > 0);
+        assertTrue(ProcessCounts.engineThreads() > 0);
         releaseAll();
-        Wait.until("the engine's threads ended", () -> engineThreads() == 0);
+        Wait.until("the engine's threads ended", () -> ProcessCounts.engineThreads() == 0);
         Wait.until("the shared threads ended", () -> javaThreads(SHARED).isEmpty());
     }
 
@@ -82,7 +79,8 @@ class ManyPlayersTest {
             assertEquals(1, recorder.count("size 320x180"));
             assertEquals(1, recorder.count("info 3 0"));
             assertEquals(1, recorder.count("completion"));
-            assertTrue(recorder.reported.indexOf("info 3 0") < recorder.reported.indexOf("completion"));
+            assertTrue(recorder.reported.indexOf("info 3 0")
+                    < recorder.reported.indexOf("completion"));
             assertEquals(1, recorder.threads.stream().distinct().count());
         }
     }
@@ -152,21 +150,5 @@ class ManyPlayersTest {
         List<Thread> threads = new ArrayList<>(Thread.getAllStackTraces().keySet());
         threads.removeIf(thread -> !thread.getName().startsWith(prefix));
         return threads;
-    }
-
-    /** How many threads the process has that only the engine and its core have. */
-    private static long engineThreads() throws IOException {
-        try (Stream<Path> tasks = Files.list(Path.of("/proc/self/task"))) {
-            return tasks.filter(ManyPlayersTest::isOfTheEngine).count();
-        }
-    }
-
-    private static boolean isOfTheEngine(Path task) {
-        try {
-            String name = Files.readString(task.resolve("comm")).strip();
-            return name.startsWith("orv-") || name.startsWith("mpv") || name.equals("core");
-        } catch (IOException e) {
-            return false; // It ended just now.
-        }
     }
 }
