@@ -49,6 +49,8 @@ class SurfaceTest {
             user.start();
             surface.release();
             user.join();
+            assertFalse(surface.isValid());
+            assertFalse(PlatformNatives.hasSurface(surface));
         }
     }
 
