@@ -242,6 +242,23 @@ TEST_F(SpeedTest, RepeatsASection) {
     EXPECT_TRUE(eventually([&] { return position() > 11500; }));
 }
 
+// One frame would be a still picture to mpv, without a position from then on.
+TEST_F(SpeedTest, PlaysOnAfterASectionOfOneFrame) {
+    open("long.mkv");
+    ASSERT_EQ(NO_ERROR, player->seekTo(10000, 0));
+    ASSERT_NE(0, player->setABRepeat(E_ORV_AB_REPEAT_SET_A));
+    ASSERT_TRUE(player->step(1));
+    ASSERT_NE(0, player->setABRepeat(E_ORV_AB_REPEAT_SET_B));
+    ASSERT_EQ(NO_ERROR, player->seekTo(10000, 0));
+    ASSERT_EQ(NO_ERROR, player->start());
+    for (int round = 0; round < 3; round++) {
+        ASSERT_TRUE(eventually([&] { return position() > 10000; })) << round;
+        ASSERT_TRUE(eventually([&] { return position() == 10000; })) << round;
+    }
+    ASSERT_NE(0, player->setABRepeat(E_ORV_AB_REPEAT_OFF));
+    EXPECT_TRUE(eventually([&] { return position() > 11000; }));
+}
+
 TEST_F(SpeedTest, RefusesSectionsWithoutALength) {
     open("long.mkv");
     EXPECT_EQ(0, player->setABRepeat(E_ORV_AB_REPEAT_SET_B)) << "no beginning yet";

@@ -15,14 +15,15 @@ class AbRepeat {
 public:
     AbRepeat(MpvHandle& mpv, PlayerState& state) : mMpv(mpv), mState(state) {}
 
-    // type: an E_Orv_AB_Repeat_Type. False for other types, where the media
-    // cannot seek, and for an end without or not behind a beginning.
+    // type: an E_Orv_AB_Repeat_Type. A section of one frame gets a second one. False for other
+    // types, where the media cannot seek, and for an end without or not behind a beginning.
     bool set(int type);
     void reset();
 
 private:
     bool setBegin();
     bool setEnd();
+    double shortest() const;
 
     MpvHandle& mMpv;
     PlayerState& mState;
