@@ -275,6 +275,32 @@ TEST_F(NetworkTest, AnAddressThatExpiresInTheMiddleIsAnError) {
     EXPECT_EQ(ORV_ERROR_HTTP - 403, endOf());
 }
 
+// FFmpeg logs to the player that was made first alone, about the media of all.
+TEST_F(NetworkTest, WhatBreaksOffIsAnErrorBesideAPlayerThatWasMadeBefore) {
+    const sp<TarnPlayer> first = new TarnPlayer(-1);
+    ASSERT_EQ(NO_ERROR, first->setDataSource(mediaPath("silent.mkv").c_str(), nullptr));
+    ASSERT_EQ(NO_ERROR, first->prepare());
+    HttpFaults faults;
+    faults.breakAt = 1500000;
+    HttpServer server(mediaPath("feature.mkv"), faults);
+    ASSERT_EQ(NO_ERROR, prepareUrl(server.url()));
+    EXPECT_EQ(ORV_ERROR_CONNECTION_LOST, endOf());
+    first->release();
+}
+
+TEST_F(NetworkTest, WhatAnotherPlayersServerAnswersIsNotOnesOwnError) {
+    HttpFaults faults;
+    faults.breakAt = 1500000;
+    HttpServer server(mediaPath("feature.mkv"), faults);
+    ASSERT_EQ(NO_ERROR, prepareUrl(server.url()));
+    HttpServer bad(mediaPath("silent.mkv"), answers(500));
+    const sp<TarnPlayer> second = new TarnPlayer(-1);
+    ASSERT_EQ(NO_ERROR, second->setDataSource(bad.url().c_str(), nullptr));
+    EXPECT_EQ(ORV_ERROR_HTTP - 500, second->prepare());
+    EXPECT_THAT(endOf(), testing::AnyOf(ORV_ERROR_CUT_SHORT, ORV_ERROR_CONNECTION_LOST));
+    second->release();
+}
+
 // Silence before the answer, in the head of the media and in their middle. Each
 // is a player of its own, as each takes the connection's 20 seconds.
 TEST_F(NetworkTest, SilenceEndsInTime) {

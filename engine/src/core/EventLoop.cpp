@@ -156,7 +156,7 @@ void EventLoop::onHook(const mpv_event_hook& hook) {
 
 void EventLoop::onLogMessage(const mpv_event_log_message& message) {
     const std::string text(message.text, strcspn(message.text, "\n"));
-    mMedia.onLogLine(text);
+    mMedia.onLogLine(message.prefix, text);
     if (message.log_level <= MPV_LOG_LEVEL_ERROR) {
         ALOGW("%s: %s", message.prefix, text.c_str());
     } else {

@@ -148,19 +148,27 @@ struct SeekCommand {
 }  // namespace
 
 bool MpvHandle::create() {
+    mLog.enter();
     mpv_handle* mpv = createWithPointInNumbers();
-    if (mpv == nullptr) return refused(__func__, "no playback core");
+    if (mpv == nullptr) {
+        mLog.leave();
+        return refused(__func__, "no playback core");
+    }
     if (setOptions(mpv) && initialize(mpv)) {
+        mLog.settle();
         mHandle = mpv;
         return true;
     }
     mpv_terminate_destroy(mpv);
+    mLog.leave();
     return false;
 }
 
 void MpvHandle::destroy() {
     mpv_handle* mpv = mHandle.exchange(nullptr);
-    if (mpv != nullptr) mpv_terminate_destroy(mpv);
+    if (mpv == nullptr) return;
+    mpv_terminate_destroy(mpv);
+    mLog.leave();
 }
 
 int MpvHandle::setProperty(const char* property, mpv_format format, void* value) {

@@ -10,6 +10,8 @@
 #include <string>
 #include <vector>
 
+#include "core/SharedLog.h"
+
 namespace orvtarn {
 
 // A property of mpv as a tree of values.
@@ -39,6 +41,8 @@ public:
     void destroy();
     // Null until there is one.
     mpv_handle* get() const { return mHandle; }
+    // Whether what FFmpeg logs is about this handle's media, and about no other's.
+    bool ownsLog() const { return mLog.isOwn(); }
 
     int set(const char* property, bool value);
     int set(const char* property, int64_t value);
@@ -73,6 +77,7 @@ private:
     bool getProperty(const char* property, mpv_format format, void* value) const;
 
     std::atomic<mpv_handle*> mHandle{nullptr};
+    SharedLog mLog;
 };
 
 }  // namespace orvtarn

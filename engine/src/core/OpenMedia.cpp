@@ -26,6 +26,16 @@ void OpenMedia::setSource(std::shared_ptr<MediaSource> source) {
 void OpenMedia::onStart() {
     if (mLoadFailed) settle();
     mTrouble.forget();
+    mMissedLines = false;
+}
+
+// With several players nobody can say whose media a line of FFmpeg's is about.
+void OpenMedia::onLogLine(const char* writer, const std::string& line) {
+    if (!SharedLog::isOfFfmpeg(writer) || mMpv.ownsLog()) {
+        mTrouble.note(line);
+    } else {
+        mMissedLines = true;
+    }
 }
 
 void OpenMedia::onBeforeOpening() {
@@ -110,11 +120,15 @@ bool OpenMedia::brokeOff() const {
     if (media->isOfBytes()) return media->readFailed();
     if (schemeOf(mOpening).empty() || !endsEarly()) return false;
     if (mTrouble.status() != android::NO_ERROR) return true;
-    // Of a connection that cannot be taken up again, nothing is logged. Those
-    // that can be may end before their last byte: an index may follow the media.
-    const bool seekable = mState.read([](const PlayerState::Values& v) { return v.seekable; });
     const int64_t position = mMpv.getInt("stream-pos").value_or(mFileSize);
-    return !seekable && (mFileSize <= 0 || position < mFileSize);
+    return !isSilenceGood() && (mFileSize <= 0 || position < mFileSize);
+}
+
+// Whether media about which nothing was logged are whole although bytes are left: an
+// index may follow them. Of a connection that cannot be taken up again, nothing is logged.
+bool OpenMedia::isSilenceGood() const {
+    const bool seekable = mState.read([](const PlayerState::Values& v) { return v.seekable; });
+    return seekable && mMpv.ownsLog() && !mMissedLines;
 }
 
 // The shown time is clearly before the end that the media name.

@@ -41,7 +41,7 @@ public:
     void onBeforeOpening();
     void onOpened();
     void onLoaded();
-    void onLogLine(const std::string& line) { mTrouble.note(line); }
+    void onLogLine(const char* writer, const std::string& line);
     void onEndReached(bool reached) { mEndReached = reached; }
     void onEndFile(const mpv_event_end_file& end);
     // Nothing of what was opened can be played.
@@ -60,6 +60,7 @@ private:
     void findCause(android::status_t status);
     void onEnd();
     bool brokeOff() const;
+    bool isSilenceGood() const;
     bool endsEarly() const;
     android::status_t causeOfBreak() const;
     bool sourceFailed() const;
@@ -77,6 +78,7 @@ private:
     bool mHasTracks = false;
     int64_t mFileSize = 0;  // bytes, 0 when unknown
     ReadTrouble mTrouble;
+    bool mMissedLines = false;  // which may have been about these media
     FailureCause mCause;
     // An end that waits for the log lines about its cause.
     bool mEndReached = false;
