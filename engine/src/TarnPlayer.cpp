@@ -1,5 +1,9 @@
 // SPDX-License-Identifier: Apache-2.0
 #include <orvtarn/TarnPlayer.h>
+#include <stream/IOrvStreamSource.h>
+
+#include <memory>
+#include <utility>
 
 #include "Engine.h"
 
@@ -57,7 +61,9 @@ status_t TarnPlayer::setDataSource(const char* url, const KeyedVector<String8, S
 }
 
 status_t TarnPlayer::setDataSource(IOrvStreamSource* source) {
-    return mEngine->statusWithCore(__func__, [&] { return mEngine->loader.setStream(source); });
+    std::unique_ptr<IOrvStreamSource> taken(source);
+    return mEngine->statusWithCore(__func__,
+                                   [&] { return mEngine->loader.setStream(std::move(taken)); });
 }
 
 status_t TarnPlayer::setDataSource(int fd, int64_t offset, int64_t length) {

@@ -103,7 +103,7 @@ TEST_F(DetailsTest, MetadataInSeveralScripts) {
 TEST_F(DetailsTest, MetadataOfAStreamThatIsReadOnce) {
     FakeStream stream(mediaPath("tagged.mp3"));
     stream.mSeekable = false;
-    ASSERT_EQ(NO_ERROR, player->setDataSource(&stream));
+    ASSERT_EQ(NO_ERROR, player->setDataSource(stream.forEngine()));
     ASSERT_EQ(NO_ERROR, player->prepare());
     MetaDataInfo info;
     ASSERT_TRUE(player->getMetaDataInfo(info));
@@ -214,7 +214,7 @@ TEST_F(DetailsTest, TheDescriptionTellsALengthThatTheSourceDoesNot) {
         IORV_PB_CTRL_SET_MEDIA_INFO_T info = stereo16(false);
         info.u4TotalDuration = 5000;
         ASSERT_EQ(NO_ERROR, player->setPCMMediaInfo(&info));
-        ASSERT_EQ(NO_ERROR, player->setDataSource(&stream));
+        ASSERT_EQ(NO_ERROR, player->setDataSource(stream.forEngine()));
         ASSERT_EQ(NO_ERROR, player->prepare());
         EXPECT_NEAR(hasLength ? 2000 : 5000, duration(), 20);
         player->reset();

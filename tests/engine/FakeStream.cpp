@@ -8,6 +8,45 @@
 #include "TestMedia.h"
 
 namespace orvtest {
+namespace {
+
+class TakenStream : public IOrvStreamSource {
+public:
+    explicit TakenStream(FakeStream& stream) : mStream(stream) {}
+    ~TakenStream() override { mStream.mDeletes++; }
+
+    int read(char* buffer, int len, int& readLen) override {
+        return mStream.read(buffer, len, readLen);
+    }
+    long long byteSeek(E_Orv_Stream_Seek_Type type, long long offset) override {
+        return mStream.byteSeek(type, offset);
+    }
+    uint32_t getFileLength() override { return mStream.getFileLength(); }
+    long long getCurrentPosition() override { return mStream.getCurrentPosition(); }
+    bool isValid() override { return mStream.isValid(); }
+    void setInvalid() override { mStream.setInvalid(); }
+    void lock() override { mStream.lock(); }
+    void unlock() override { mStream.unlock(); }
+    int getDataSourceType() override { return mStream.getDataSourceType(); }
+    bool isSeekable() override { return mStream.isSeekable(); }
+    void setThreadSelf() override { mStream.setThreadSelf(); }
+    bool isThreadSelf() override { return mStream.isThreadSelf(); }
+    void cancelRead() override { mStream.cancelRead(); }
+    void closeStream() override { mStream.closeStream(); }
+    long long timeSeek(long long first, long long second) override {
+        return mStream.timeSeek(first, second);
+    }
+    int getSeekType() override { return mStream.getSeekType(); }
+    bool isStallingSupport() override { return mStream.isStallingSupport(); }
+    uint32_t getDuration() override { return mStream.getDuration(); }
+
+private:
+    FakeStream& mStream;
+};
+
+}  // namespace
+
+IOrvStreamSource* FakeStream::forEngine() { return new TakenStream(*this); }
 
 FakeStream::FakeStream(const std::string& path)
     : mContent(bytesOf(path)), mDelivered(mContent.size()) {}

@@ -6,6 +6,7 @@
 #include <atomic>
 #include <chrono>
 #include <condition_variable>
+#include <memory>
 #include <mutex>
 #include <string>
 #include <vector>
@@ -16,6 +17,9 @@ namespace orvtest {
 class FakeStream : public IOrvStreamSource {
 public:
     explicit FakeStream(const std::string& path);
+
+    // A source for an engine to take, which leads to this one and counts its own end here.
+    IOrvStreamSource* forEngine();
 
     // Set before use.
     bool mSeekable = true;
@@ -61,6 +65,7 @@ public:
     std::atomic<int> mSeeks{0};
     std::atomic<int> mCancels{0};
     std::atomic<int> mCloses{0};
+    std::atomic<int> mDeletes{0};
     std::atomic<int> mInside{0};  // calls under way
     std::atomic<int64_t> mEndsAtNow{INT64_MAX};
 

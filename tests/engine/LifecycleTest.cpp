@@ -149,7 +149,7 @@ TEST_F(LifecycleTest, WithoutAReleaseTheLastReferenceCleansUp) {
     FakeStream stream(mediaPath("short.mp4"));
     {
         sp<TarnPlayer> other = new TarnPlayer(-1);
-        ASSERT_EQ(NO_ERROR, other->setDataSource(&stream));
+        ASSERT_EQ(NO_ERROR, other->setDataSource(stream.forEngine()));
         ASSERT_EQ(NO_ERROR, other->prepare());
         ASSERT_EQ(NO_ERROR, other->start());
     }

@@ -1,6 +1,6 @@
 // SPDX-License-Identifier: Apache-2.0
 // Several threads that release one player, or reset it meanwhile: when a call has
-// returned, what was lent to the player is free.
+// returned, what the player got is free.
 #include <chrono>
 #include <future>
 
@@ -29,8 +29,8 @@ public:
 
 class ReleaseTest : public PlayerTest {
 protected:
-    ReleaseTest() { EXPECT_EQ(NO_ERROR, player->setDataSource(&stream)); }
-    // Before the source that it was lent.
+    ReleaseTest() { EXPECT_EQ(NO_ERROR, player->setDataSource(stream.forEngine())); }
+    // Before the stream that its source leads to.
     ~ReleaseTest() override { player->release(); }
 
     // Releases on another thread, up to the source's close.

@@ -50,7 +50,7 @@ TEST_F(SecondReadingTest, APipeIsReadOnce) {
 TEST_F(SecondReadingTest, WhatCanOnlyBeReadOnceIsNoErrorToLog) {
     FakeStream stream(mediaPath("short.ts"));
     stream.mSeekable = false;
-    ASSERT_EQ(NO_ERROR, player->setDataSource(&stream));
+    ASSERT_EQ(NO_ERROR, player->setDataSource(stream.forEngine()));
     ASSERT_EQ(NO_ERROR, player->prepare());
     {
         LogCapture log;

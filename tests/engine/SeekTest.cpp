@@ -131,7 +131,7 @@ TEST_F(SeekTest, ManyAtOnceAllArrive) {
 // The second waits for the first, and has as long as that in all.
 TEST_F(SeekTest, WithoutDataTimesOut) {
     FakeStream stream(mediaPath("long.mkv"));
-    ASSERT_EQ(NO_ERROR, player->setDataSource(&stream));
+    ASSERT_EQ(NO_ERROR, player->setDataSource(stream.forEngine()));
     ASSERT_EQ(NO_ERROR, player->prepare());
     stream.blockAt(0);
     const auto seek = [&] { return player->seekTo(50000, Mode::SEEK_CLOSEST_SYNC); };

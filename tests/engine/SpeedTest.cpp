@@ -175,7 +175,7 @@ TEST_F(SpeedTest, EndsWithTheMedia) {
 
 TEST_F(SpeedTest, ARewindThatGetsNoDataGivesUp) {
     FakeStream stream(mediaPath("long.mkv"));
-    ASSERT_EQ(NO_ERROR, player->setDataSource(&stream));
+    ASSERT_EQ(NO_ERROR, player->setDataSource(stream.forEngine()));
     ASSERT_EQ(NO_ERROR, player->prepare());
     ASSERT_EQ(NO_ERROR, player->seekTo(50000, 0));
     stream.blockAt(0);

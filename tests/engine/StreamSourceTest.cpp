@@ -17,13 +17,13 @@ namespace {
 
 class StreamSourceTest : public PlayerTest {
 protected:
-    // Before the source that it was lent.
+    // Before the stream that its source leads to.
     ~StreamSourceTest() override { player->release(); }
 
     void makeStream(const char* name) { stream = std::make_unique<FakeStream>(mediaPath(name)); }
 
     status_t prepareStream() {
-        EXPECT_EQ(NO_ERROR, player->setDataSource(stream.get()));
+        EXPECT_EQ(NO_ERROR, player->setDataSource(stream->forEngine()));
         return player->prepare();
     }
 
@@ -41,6 +41,7 @@ TEST_F(StreamSourceTest, DeliversByteForByte) {
     expectDeliveredWhole();
     player->reset();
     EXPECT_EQ(1, stream->mCloses);
+    EXPECT_EQ(1, stream->mDeletes);
     EXPECT_FALSE(stream->isValid());
     EXPECT_TRUE(stream->isThreadSelf());
 }
@@ -220,7 +221,7 @@ TEST_F(BlockedReadTest, ReleaseEndsItAndLetsTheSourceGo) {
 TEST_F(BlockedReadTest, WhilePreparingResetEndsBoth) {
     makeStream("feature.mkv");
     stream->blockAt(100);
-    ASSERT_EQ(NO_ERROR, player->setDataSource(stream.get()));
+    ASSERT_EQ(NO_ERROR, player->setDataSource(stream->forEngine()));
     std::thread preparing([&] { EXPECT_EQ(INVALID_OPERATION, player->prepare()); });
     ASSERT_TRUE(stream->waitUntilBlocked());
     expectPrompt([&] { EXPECT_EQ(NO_ERROR, player->reset()); });
@@ -265,6 +266,27 @@ TEST_F(StreamSourceTest, TellsAboutItselfWhilePlaying) {
     EXPECT_EQ(3, info.mChapterCount);
     EXPECT_NEAR(10000, info.mDuration, 100);
     EXPECT_TRUE(player->isPlaying());
+}
+
+TEST_F(StreamSourceTest, ReleaseDeletesTheSource) {
+    makeStream("short.mp4");
+    ASSERT_EQ(NO_ERROR, prepareStream());
+    EXPECT_EQ(0, stream->mDeletes);
+    player->release();
+    EXPECT_EQ(1, stream->mCloses);
+    EXPECT_EQ(1, stream->mDeletes);
+}
+
+TEST_F(StreamSourceTest, ASourceThatIsRefusedIsDeletedAtOnce) {
+    makeStream("short.mp4");
+    ASSERT_EQ(NO_ERROR, prepareStream());
+    FakeStream second(mediaPath("short.mp4"));
+    EXPECT_EQ(INVALID_OPERATION, player->setDataSource(second.forEngine()));
+    EXPECT_EQ(1, second.mDeletes);
+    EXPECT_EQ(0, second.mReads + second.mCloses);
+    player->release();
+    EXPECT_EQ(INVALID_OPERATION, player->setDataSource(second.forEngine()));
+    EXPECT_EQ(2, second.mDeletes);
 }
 
 TEST_F(StreamSourceTest, ANullSourceIsRefused) {

@@ -58,11 +58,11 @@ public:
     // ORV_ERROR_SCHEME.
     // INVALID_OPERATION when a source is set already.
     status_t setDataSource(const char* url, const KeyedVector<String8, String8>* headers);
-    // The source is not deleted by the player. It must live until the next
-    // reset or release has returned: they end a read that blocks with
-    // cancelRead, then make the source invalid and close it. A source that says
-    // that it can seek is asked to go to its start and its end at once, for
-    // lengths of more than 32 bits.
+    // The player takes the source over, also when it refuses it, which deletes it at
+    // once. The next reset or release end a read that blocks with cancelRead, make the
+    // source invalid, close it and delete it, on the thread that they are called on. A
+    // source that says that it can seek is asked to go to its start and its end at
+    // once, for lengths of more than 32 bits.
     status_t setDataSource(IOrvStreamSource* source);
     // Reads length bytes from offset. The descriptor is duplicated, its own
     // position is not used. BAD_VALUE for a negative offset or length or a

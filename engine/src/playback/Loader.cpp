@@ -78,12 +78,12 @@ android::status_t Loader::setFd(int fd, int64_t offset, int64_t length) {
     return setSource("setDataSource", std::make_shared<FdMediaSource>(copy, offset, length));
 }
 
-android::status_t Loader::setStream(IOrvStreamSource* stream) {
+android::status_t Loader::setStream(std::unique_ptr<IOrvStreamSource> stream) {
     if (stream == nullptr) return failed(android::BAD_VALUE, "setDataSource", "no stream");
     // Asks the source nothing before the phase is known to be right.
     const Phase phase = mState.phase();
     if (phase != Phase::Idle) return PlayerState::wrongPhase("setDataSource", phase);
-    return setSource("setDataSource", std::make_shared<StreamMediaSource>(stream));
+    return setSource("setDataSource", std::make_shared<StreamMediaSource>(std::move(stream)));
 }
 
 android::status_t Loader::setSource(const char* operation,

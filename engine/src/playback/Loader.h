@@ -33,7 +33,8 @@ public:
 
     android::status_t setUrl(const char* url, RequestHeaders headers);
     android::status_t setFd(int fd, int64_t offset, int64_t length);
-    android::status_t setStream(IOrvStreamSource* stream);
+    // Takes the source over, also when it refuses it.
+    android::status_t setStream(std::unique_ptr<IOrvStreamSource> stream);
 
     android::status_t prepare();
     android::status_t prepareAsync();

@@ -1,11 +1,10 @@
 // SPDX-License-Identifier: Apache-2.0
 #include "source/StreamMediaSource.h"
 
-#include <stream/IOrvStreamSource.h>
-
 #include <algorithm>
 #include <chrono>
 #include <thread>
+#include <utility>
 
 #include "base/EngineLog.h"
 
@@ -61,7 +60,7 @@ public:
     bool seek(int64_t position) override {
         if (position == mPosition) return true;
         if (!mSource.mSeekable || position < 0) return false;
-        SourceLock lock(mSource.mStream);
+        SourceLock lock(mSource.mStream.get());
         if (!mSource.moveTo(position)) return false;
         mPosition = position;
         return true;
@@ -75,10 +74,26 @@ private:
     int64_t mPosition = 0;
 };
 
-StreamMediaSource::StreamMediaSource(IOrvStreamSource* stream)
-    : mStream(stream),
-      mSeekable(seeksToStart(stream)),
-      mStalling(stream->isStallingSupport()),
+// A use of the source that close waits for, where it is not too late.
+class StreamMediaSource::Call {
+public:
+    explicit Call(StreamMediaSource& source) : mSource(source), mEntered(source.mCalls.enter()) {}
+    ~Call() {
+        if (mEntered) mSource.mCalls.leave();
+    }
+    Call(const Call&) = delete;
+    Call& operator=(const Call&) = delete;
+    explicit operator bool() const { return mEntered; }
+
+private:
+    StreamMediaSource& mSource;
+    const bool mEntered;
+};
+
+StreamMediaSource::StreamMediaSource(std::unique_ptr<IOrvStreamSource> stream)
+    : mStream(std::move(stream)),
+      mSeekable(seeksToStart(mStream.get())),
+      mStalling(mStream->isStallingSupport()),
       mSize(measure()) {
     mStream->setThreadSelf();
 }
@@ -89,7 +104,7 @@ int64_t StreamMediaSource::measure() {
     const uint32_t low = mStream->getFileLength();
     if (low == kUnknownLength) return -1;
     if (!mSeekable) return low;
-    SourceLock lock(mStream);
+    SourceLock lock(mStream.get());
     const int64_t end = mStream->byteSeek(E_ORV_STREAM_SEEK_END, 0);
     if (end >= 0) mPosition = end;
     return end > 0 && static_cast<uint32_t>(end) == low ? end : low;
@@ -98,15 +113,16 @@ int64_t StreamMediaSource::measure() {
 std::unique_ptr<ByteSource> StreamMediaSource::openReader() {
     const bool another = mReaders.count() > 0 || mPosition != 0;
     if (another && !mSeekable) return nullptr;
-    if (!mStream->isValid() || !mReaders.enter()) return nullptr;
-    return std::make_unique<Reader>(*this);
+    if (!mReaders.enter()) return nullptr;
+    std::unique_ptr<ByteSource> reader = std::make_unique<Reader>(*this);
+    return mStream->isValid() ? std::move(reader) : nullptr;
 }
 
 int StreamMediaSource::readAt(int64_t position, uint8_t* buffer, int length) {
     const uint64_t cancels = mCancels;
     while (!mClosed && mCancels == cancels) {
         {
-            SourceLock lock(mStream);
+            SourceLock lock(mStream.get());
             if (!moveTo(position)) return -1;
             const int count = readOnce(buffer, length);
             if (count != 0 || !isStalled(position)) return count;
@@ -152,6 +168,11 @@ bool StreamMediaSource::awaitMore(uint64_t cancels) {
 }
 
 void StreamMediaSource::cancelReads() {
+    const Call call(*this);
+    if (call) cancelBlocked();
+}
+
+void StreamMediaSource::cancelBlocked() {
     mCancels++;
     if (mReading > 0) mStream->cancelRead();
 }
@@ -161,15 +182,19 @@ void StreamMediaSource::close() {
     mReaders.close();
     mStream->setInvalid();
     while (mReaders.count() > 0) {
-        cancelReads();
+        cancelBlocked();
         std::this_thread::sleep_for(kPollInterval);
     }
     mReaders.awaitNone();
     mStream->closeStream();
+    mCalls.close();
+    mCalls.awaitNone();
+    mStream.reset();
 }
 
 int64_t StreamMediaSource::ownDuration() {
-    const uint32_t duration = mClosed ? 0 : mStream->getDuration();
+    const Call call(*this);
+    const uint32_t duration = call ? mStream->getDuration() : 0;
     return duration == kUnknownLength ? 0 : duration;
 }
 

@@ -2,14 +2,13 @@
 #pragma once
 
 #include <stdint.h>
+#include <stream/IOrvStreamSource.h>
 
 #include <atomic>
 #include <memory>
 #include <string>
 
 #include "source/MediaSource.h"
-
-class IOrvStreamSource;
 
 namespace orvtarn {
 
@@ -18,8 +17,9 @@ namespace orvtarn {
 // source's own lock.
 class StreamMediaSource : public MediaSource {
 public:
-    // The source is borrowed until close has returned.
-    explicit StreamMediaSource(IOrvStreamSource* stream);
+    // Takes the source over. close deletes it, on its caller's thread: the source may
+    // hold on to what only a thread of the program's own can let go.
+    explicit StreamMediaSource(std::unique_ptr<IOrvStreamSource> stream);
 
     std::string name() const override { return kByteSourceName; }
     bool isOfBytes() const override { return true; }
@@ -31,7 +31,10 @@ public:
 private:
     class Reader;
 
+    class Call;
+
     int64_t ownDuration() override;
+    void cancelBlocked();
     int64_t measure();
     int readAt(int64_t position, uint8_t* buffer, int length);
     int readOnce(uint8_t* buffer, int length);
@@ -39,10 +42,11 @@ private:
     bool isStalled(int64_t position) const;
     bool awaitMore(uint64_t cancels);
 
-    IOrvStreamSource* const mStream;
+    std::unique_ptr<IOrvStreamSource> mStream;  // null once closed
     const bool mSeekable;
     const bool mStalling;
     ReaderCount mReaders;
+    ReaderCount mCalls;  // other uses of the source, on any thread
     // The source's; -1 when only a seek can find out.
     std::atomic<int64_t> mPosition{0};
     const int64_t mSize;  // -1 when unknown
