@@ -49,6 +49,15 @@ TEST_F(SourceTest, FileUrlsAreDecoded) {
     EXPECT_EQ(BAD_VALUE, setPath("file:///"));
 }
 
+TEST_F(SourceTest, APictureWithoutADecoderIsUnsupportedBesideSound) {
+    const std::string path = mediaPath("unknown-picture.mkv");
+    outputOf("sed 's|V_MPEG4/ISO/AVC|V_QQQQQ/QQQ/QQQ|' '" + mediaPath("tracks.mkv") + "' > '" +
+             path + "'");
+    EXPECT_EQ(ORV_ERROR_UNSUPPORTED, prepareUrl(path));
+    player->reset();
+    EXPECT_EQ(NO_ERROR, prepareUrl(mediaPath("tracks.mkv")));
+}
+
 // As /dev/stdin does: the path that such a link leads to is none.
 TEST_F(SourceTest, LinksToPipesAndDeletedFilesAreOpened) {
     const std::string path = mediaPath("deleted.mp4");

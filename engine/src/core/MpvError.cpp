@@ -15,6 +15,8 @@ android::status_t statusOfMpvError(int error) {
         case MPV_ERROR_UNKNOWN_FORMAT:
             return ORV_ERROR_MALFORMED;
         case MPV_ERROR_NOTHING_TO_PLAY:
+        // A picture without a decoder, for which mpv gives the sound up, too.
+        case MPV_ERROR_GENERIC:
             return ORV_ERROR_UNSUPPORTED;
         case MPV_ERROR_NOMEM:
             return android::NO_MEMORY;
