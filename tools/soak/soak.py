@@ -140,6 +140,8 @@ def follow(process, folder):
     checkpoints, counts, line = [], {}, LiveLine()
     with open(folder / "checkpoints.jsonl", "w", encoding="utf-8") as kept:
         for text in process.stdout:
+            if not text.startswith("{"):
+                continue  # What a virtual machine says that crashes.
             kept.write(text)
             row = json.loads(text)
             counts = row.get("counts", counts)

@@ -76,6 +76,13 @@ final class Session {
             action.end(cause.toString());
             judge(what, mayBeRefused, cause);
             return false;
+        } catch (IllegalArgumentException e) {
+            action.end(e.toString());
+            // What was possible may no longer be once the media have failed.
+            if (subject.expectation.isWell()) {
+                throw e;
+            }
+            return false;
         } catch (Exception | Error e) {
             action.end(e.toString());
             throw e;
