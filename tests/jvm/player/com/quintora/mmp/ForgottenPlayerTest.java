@@ -5,6 +5,7 @@ import static org.junit.jupiter.api.Assertions.assertEquals;
 import static org.junit.jupiter.api.Assertions.assertTrue;
 
 import java.lang.ref.WeakReference;
+import java.nio.file.Path;
 import java.util.List;
 import java.util.concurrent.CopyOnWriteArrayList;
 import java.util.logging.Handler;
@@ -75,6 +76,17 @@ class ForgottenPlayerTest {
         assertEquals(1, warnings.size());
     }
 
+    @Test
+    void aReleasedPlayerOfAStreamIsCollected() throws Exception {
+        for (boolean byReset : new boolean[] {false, true}) {
+            WeakReference<OrvMediaPlayer> released = streamAndEnd(byReset);
+            Wait.until("it was collected", () -> {
+                System.gc();
+                return released.get() == null;
+            });
+        }
+    }
+
     private static WeakReference<OrvMediaPlayer> playAndForget(Screen screen) throws Exception {
         OrvMediaPlayer player = new OrvMediaPlayer();
         player.addListener(new Recorder());
@@ -82,6 +94,19 @@ class ForgottenPlayerTest {
         player.setDataSource(Media.path("video.mp4"));
         player.prepareAndWait();
         player.start();
+        return new WeakReference<>(player);
+    }
+
+    /** Ends the stream by a reset, and forgets the player; or releases it. */
+    private static WeakReference<OrvMediaPlayer> streamAndEnd(boolean byReset) throws Exception {
+        OrvMediaPlayer player = new OrvMediaPlayer();
+        player.setDataSource(ChannelStreamSource.open(Path.of(Media.path("video.mp4"))));
+        player.prepareAndWait();
+        if (byReset) {
+            player.resetAndWait();
+        } else {
+            player.close();
+        }
         return new WeakReference<>(player);
     }
 
