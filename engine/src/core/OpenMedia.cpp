@@ -125,10 +125,12 @@ bool OpenMedia::brokeOff() const {
 }
 
 // Whether media about which nothing was logged are whole although bytes are left: an
-// index may follow them. Of a connection that cannot be taken up again, nothing is logged.
+// index may follow them, and a repeated section ends with bytes still to come. Of a
+// connection that cannot be taken up again, nothing is logged.
 bool OpenMedia::isSilenceGood() const {
     const bool seekable = mState.read([](const PlayerState::Values& v) { return v.seekable; });
-    return seekable && mMpv.ownsLog() && !mMissedLines;
+    const bool knowsAll = mMpv.ownsLog() && !mMissedLines;
+    return seekable && (knowsAll || !mMpv.getFlag("demuxer-cache-idle").value_or(true));
 }
 
 // The shown time is clearly before the end that the media name.
