@@ -24,6 +24,9 @@ Bytes counting(size_t size) {
     return bytes;
 }
 
+const ExpectedLine kNoMemory =
+    bridgeError("####  OrvMediaCliengetThumbnailInfo(): Out of memory !!!\n");
+
 class ThumbnailTest : public JniFixture {
 protected:
     ThumbnailTest() {
@@ -175,6 +178,17 @@ TEST_F(ThumbnailTest, NoHeightOrWidthIsNoThumbnail) {
     EXPECT_THAT(get(5, 0, 10), Returns("null").logs(lines));
 }
 
+// 256 MB a row, 128 rows: eight times what 32 bits can say.
+TEST_F(ThumbnailTest, MoreBytesThanARequestCanSayAreOutOfMemory) {
+    setUpEngine();
+    std::vector<ExpectedLine> lines = linesTo(5, 0x4000000, 128);
+    lines.insert(lines.end(), {widthLine(0x4000000), kNoMemory});
+    EXPECT_THAT(get(5, 0x4000000, 128), Returns("null").logs(lines));
+    // Those of which 32 bits would leave few.
+    EXPECT_EQ(get(5, 0x2000001, 128).returned, "null");
+    EXPECT_EQ(get(5, 16, -1).returned, "null");
+}
+
 TEST_F(ThumbnailTest, MissingService) {
     EXPECT_THAT(get(5, 10, 2),
                 Returns("null")
@@ -255,9 +269,7 @@ TEST_F(ThumbnailTest, FailedArrayFreesTheBuffer) {
 TEST_F(ThumbnailTest, OutOfMemory) {
     setUpEngine();
     std::vector<ExpectedLine> lines = linesTo(5, 10, 200);
-    lines.insert(
-        lines.end(),
-        {widthLine(16), bridgeError("####  OrvMediaCliengetThumbnailInfo(): Out of memory !!!\n")});
+    lines.insert(lines.end(), {widthLine(16), kNoMemory});
     auto failure = mallocCall.replace(
         [](size_t size) { return size == 12800 ? nullptr : mallocCall.real(size); });
     EXPECT_THAT(get(5, 10, 200), Returns("null").logs(lines));

@@ -94,20 +94,23 @@ jbyteArray OrvMediaClient_getThumbnailInfo(JNIEnv* env, jobject thiz, jobject th
         ALOGE("width_new :%d\n", widthNew);
     }
     const uint32_t paddedRowBytes = pixelBytes * widthNew;
-    const uint32_t paddedSize = static_cast<uint32_t>(request.i4Height) * paddedRowBytes;
-    const uint32_t packedSize = static_cast<uint32_t>(request.i4Height) * rowBytes;
+    const uint32_t height = static_cast<uint32_t>(request.i4Height);
+    const uint64_t paddedSize = uint64_t{height} * paddedRowBytes;
+    const uint32_t packedSize = height * rowBytes;
     if (paddedSize == 0) {
         ALOGE("####  OrvMediaCliengetThumbnailInfo(): thumbnail_Colormode not used now!\n");
         return nullptr;
     }
-    uint8_t* buffer = static_cast<uint8_t*>(malloc(paddedSize));
+    // No buffer has more bytes than the request can say.
+    uint8_t* buffer =
+        paddedSize <= UINT32_MAX ? static_cast<uint8_t*>(malloc(paddedSize)) : nullptr;
     if (buffer == nullptr) {
         ALOGE("####  OrvMediaCliengetThumbnailInfo(): Out of memory !!!\n");
         return nullptr;
     }
     memset(buffer, 0, paddedSize);
     request.pBuffer = buffer;
-    request.u4BufferSize = paddedSize;
+    request.u4BufferSize = static_cast<uint32_t>(paddedSize);
     if (!service->getThumbnailInfo(&request)) {
         ALOGI("OrvMediaCliengetThumbnailInfo(): GetThumbNail() failed");
         free(buffer);
