@@ -95,6 +95,16 @@ TEST_F(MetadataFilterTest, SixtyFourCodesAreAccepted) {
     EXPECT_EQ(dropped().size(), 64u);
 }
 
+TEST_F(MetadataFilterTest, CodesAreReadFromAnyByteOn) {
+    const uint8_t bytes[] = {9, 1, 0, 0, 0, 7, 1, 0, 0, 1, 0, 0, 0, 8, 0, 0, 0};
+    Parcel parcel;
+    parcel.setData(bytes, sizeof(bytes));
+    parcel.setDataPosition(1);
+    EXPECT_EQ(service->setMetadataFilter(parcel), android::NO_ERROR);
+    EXPECT_THAT(allowed(), ElementsAre(0x107));
+    EXPECT_THAT(dropped(), ElementsAre(8));
+}
+
 // A parcel that is refused, in which words it has.
 struct BadFilter {
     const char* name;

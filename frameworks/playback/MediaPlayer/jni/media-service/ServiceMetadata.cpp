@@ -3,6 +3,7 @@
 
 #include <binder/Parcel.h>
 #include <media/Metadata.h>
+#include <string.h>
 
 #include "jni/media-service/OrvMediaService.h"
 #include "jni/media-service/ServiceLog.h"
@@ -35,13 +36,17 @@ bool unmarshallFilter(const Parcel& p, SortedVector<int>* filter, int* status) {
         *status = NOT_ENOUGH_DATA;
         return false;
     }
-    const int32_t* codes = static_cast<const int32_t*>(p.readInplace(bytes));
+    const auto* codes = static_cast<const uint8_t*>(p.readInplace(bytes));
     if (codes == nullptr) {
         ALOGE("Filter had no data");
         *status = BAD_VALUE;
         return false;
     }
-    for (int32_t i = 0; i < count; ++i) filter->add(codes[i]);
+    for (int32_t i = 0; i < count; ++i) {
+        int code;  // the parcel's position may be at any byte
+        memcpy(&code, codes + i * sizeof(code), sizeof(code));
+        filter->add(code);
+    }
     *status = NO_ERROR;
     return true;
 }
