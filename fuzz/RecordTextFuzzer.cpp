@@ -3,16 +3,16 @@
 // Whatever the bytes, record texts keep their promises: they end within the
 // array, and never inside a character.
 #include <stdint.h>
-#include <stdlib.h>
 
 #include <algorithm>
 
 #include "base/RecordText.h"
+#include "support/Require.h"
 
 namespace {
 
 void require(bool holds) {
-    if (!holds) abort();
+    orvfuzz::require(holds, "a text ends within its array and no character");
 }
 
 // Each high surrogate is followed by a low one, which stands nowhere else.

@@ -1,12 +1,13 @@
 # SPDX-License-Identifier: Apache-2.0
 # shellcheck shell=bash
-# help: test [--target native|armhf|all | --release NAME] [--filter REGEX] [--no-lint]    every test; a filter runs those whose names match, natively unless a target is given; --release plays and tests in a root of that Debian release
-use packages build lint
+# help: test [--target native|armhf|all | --release NAME | --sanitize] [--filter REGEX] [--no-lint]    every test; a filter runs those whose names match, natively unless a target is given; --release plays and tests in a root of that Debian release; --sanitize runs the C++ tests and the fuzz targets' seeds with the address, leak and undefined-behaviour sanitizers
+use packages build lint preset
 
 target=
 release=
 filter=
 with_lint=yes
+sanitize=
 while [ $# -gt 0 ]; do
     case $1 in
     --target) target=${2:-} && shift ;;
@@ -16,13 +17,11 @@ while [ $# -gt 0 ]; do
     --filter) filter=${2:-} && shift ;;
     --filter=*) filter=${1#*=} ;;
     --no-lint) with_lint= ;;
+    --sanitize) sanitize=yes ;;
     *) die_usage "test does not know '$1'." ;;
     esac
     shift || die_usage "an option of test lacks its value."
 done
-
-# Some tests are one architecture's alone, and a filter may name just those.
-[ -n "$target" ] || { [ -n "$filter" ] && target=native; } || target=all
 
 # Media plays in real time: on a busy machine a test may miss its moment, and is
 # run once more. ctest shows both runs. Many tests wait more than they compute, so one
@@ -34,6 +33,17 @@ test_native() {
     on_some_display ctest --test-dir "$ORV_BUILD" --output-on-failure --no-tests=error \
         --repeat until-pass:2 --parallel "$(($(nproc) + 1))" \
         ${filter:+--tests-regex "$filter"}
+}
+
+# No Java: a virtual machine's own memory is beyond these sanitizers.
+test_sanitized() {
+    need_packages "build and test" play test
+    build_preset asan all
+    LSAN_OPTIONS=suppressions=$ORV_ROOT/cmake/lsan.supp:print_suppressions=0 \
+        UBSAN_OPTIONS=halt_on_error=1:print_stacktrace=1 on_some_display \
+        ctest --test-dir "$(preset_folder asan)" --output-on-failure --no-tests=error \
+        --repeat until-pass:2 --parallel "$(($(nproc) + 1))" \
+        --exclude-regex '^tools\.' ${filter:+--tests-regex "$filter"}
 }
 
 # The window's tests need a display; a virtual one does where there is none.
@@ -49,8 +59,18 @@ test_armhf() {
     "$ORV_ROOT/tools/armhf-test" ${filter:+--filter "$filter"}
 }
 
+if [ -n "$sanitize" ]; then
+    [ -z "$release$target" ] ||
+        die_usage "--sanitize tests on this machine alone, without --target and --release."
+    test_sanitized
+    exit
+fi
+
 [ -z "$release" ] || exec "$ORV_ROOT/tools/release-test" "$release" \
     ${filter:+--filter "$filter"} ${with_lint:---no-lint}
+
+# Some tests are one architecture's alone, and a filter may name just those.
+[ -n "$target" ] || { [ -n "$filter" ] && target=native; } || target=all
 
 case $target in
 native) test_native ;;
