@@ -38,10 +38,10 @@ class Mutant:
         return f"{self.file}:{self.line}"
 
     def diff(self, source):
-        """The lines that differ, each with - or + in front."""
+        """The lines that differ, each with - or + in front, between their neighbours."""
         before = source.decode().splitlines()
         after = self.apply(source).decode().splitlines()
-        lines = list(difflib.unified_diff(before, after, n=0, lineterm=""))[2:]
+        lines = list(difflib.unified_diff(before, after, n=1, lineterm=""))[2:]
         return [line for line in lines if not line.startswith("@@")]
 
 
