@@ -145,7 +145,7 @@ class CppTest(Folder):
 
     def test_neighbours_change_places_when_their_order_may_be_noticed(self):
         self.assertEqual(self.changes("""\
-            int call(); void one(int); extern int shared; int unrelated;
+            int call(); void one(int); extern int shared;
             #define LOG(text) one(sizeof text)
             void f(int a) {
                 LOG("enter");  // between
@@ -153,7 +153,7 @@ class CppTest(Folder):
                 one(x);
                 int y = 1;
                 y = 2;
-                unrelated = a;
+                shared = a;
                 if (y) return;
                 one(y);
                 one(y);
@@ -162,7 +162,29 @@ class CppTest(Folder):
             """, "swap-statements"), [
                 ('LOG("enter");  // between\n    int x = call();',
                  'int x = call();  // between\n    LOG("enter");'),
+                ("shared = a;\n    if (y) return;", "if (y) return;\n    shared = a;"),
                 ("if (y) return;\n    one(y);", "one(y);\n    if (y) return;")])
+
+    def test_neighbours_stay_that_do_not_see_each_other(self):
+        self.assertEqual(self.changes("""\
+            struct Color { int r, g; }; void use(Color*); void call();
+            void f(Color* given) {
+                Color own;
+                own.r = 1;
+                own.g = 2;
+                call();
+                given->r = own.r;
+                use(&own);
+                own.r = 3;
+                own.g = own.r;
+                int unused;
+                call();
+            }
+            """, "swap-statements"), [
+                ("call();\n    given->r = own.r;", "given->r = own.r;\n    call();"),
+                ("given->r = own.r;\n    use(&own);", "use(&own);\n    given->r = own.r;"),
+                ("use(&own);\n    own.r = 3;", "own.r = 3;\n    use(&own);"),
+                ("own.r = 3;\n    own.g = own.r;", "own.g = own.r;\n    own.r = 3;")])
 
     def test_macros_and_headers_of_others_are_left_alone(self):
         self.write("other/other.h", "inline int other() { return 1 + 2; }\n")
@@ -246,7 +268,7 @@ class JavaTest(Folder):
             (18, "Small.f", "return-value", "a < b", "!(a < b)"),
             (18, "Small.f", "relational", "<", "<="),
             (22, "Small.g", "return-value", "r", "null")])
-        self.assertEqual([m.line for m in found if m.operator == "swap-statements"], [7, 9, 10])
+        self.assertEqual([m.line for m in found if m.operator == "swap-statements"], [7, 8, 9, 10])
         self.assertEqual([m.text for m in found if m.operator == "remove-statement"], [
             "a = b + 2;", "notifyAll();", "b--;", 'System.out.println("a" + b);'])
 

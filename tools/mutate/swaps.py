@@ -5,8 +5,12 @@ something may notice."""
 import re
 
 from clang.cindex import CursorKind as Kind
+from clang.cindex import TypeKind
 
-CALLS = {Kind.CALL_EXPR, Kind.CXX_NEW_EXPR, Kind.CXX_DELETE_EXPR}
+EFFECTS = {Kind.CALL_EXPR, Kind.CXX_NEW_EXPR, Kind.CXX_DELETE_EXPR, Kind.RETURN_STMT,
+           Kind.BREAK_STMT, Kind.CONTINUE_STMT, Kind.GOTO_STMT, Kind.CXX_THROW_EXPR}
+PARTS = {Kind.MEMBER_REF_EXPR, Kind.ARRAY_SUBSCRIPT_EXPR, Kind.PAREN_EXPR, Kind.UNEXPOSED_EXPR}
+REFERENCES = {TypeKind.POINTER, TypeKind.LVALUEREFERENCE, TypeKind.RVALUEREFERENCE}
 CONTROL = {Kind.IF_STMT, Kind.FOR_STMT, Kind.WHILE_STMT, Kind.DO_STMT, Kind.SWITCH_STMT,
            Kind.CXX_FOR_RANGE_STMT, Kind.COMPOUND_STMT, Kind.CXX_TRY_STMT}
 LABELS = {Kind.CASE_STMT, Kind.DEFAULT_STMT, Kind.LABEL_STMT}
@@ -38,8 +42,9 @@ class Statement:
     def is_expression(self):
         return self.is_macro or self.cursor.kind.is_expression()
 
-    def has_call(self):
-        return self.is_macro or any(c.kind in CALLS for c in self.cursor.walk_preorder())
+    def has_effect(self):
+        """A call, or a way out."""
+        return self.is_macro or any(c.kind in EFFECTS for c in self.cursor.walk_preorder())
 
     def names(self):
         """Without what stands in texts."""
@@ -53,14 +58,26 @@ class Statement:
     def declared_type(self):
         return " ".join(c.type.spelling for c in self.cursor.get_children())
 
-    def changes_local_alone(self):
-        """An assignment without a call, to what the function itself declares."""
+    def target(self):
+        """What an assignment changes, as it is written; empty for another statement."""
         children = list(self.cursor.get_children())
-        if self.has_call() or not children or self.is_control():
-            return False
-        target = children[0].referenced
+        if not self.is_expression() or self.is_macro or len(children) not in (1, 2):
+            return ""
+        start, end = children[0].extent.start.offset, children[0].extent.end.offset
+        return self.text[start - self.start:end - self.start]
+
+    def changes_local_alone(self):
+        """An assignment to what the function itself declares."""
+        cursor = next(self.cursor.get_children(), None)
+        while cursor is not None and cursor.kind in PARTS:
+            inner = next(cursor.get_children(), None)
+            if inner is None or inner.type.kind in REFERENCES:
+                return False
+            cursor = inner
+        target = cursor and cursor.referenced
         return target is not None and target.kind in (Kind.VAR_DECL, Kind.PARM_DECL) \
-            and children[0].kind in (Kind.DECL_REF_EXPR, Kind.UNEXPOSED_EXPR)
+            and target.type.kind not in REFERENCES and target.semantic_parent is not None \
+            and target.semantic_parent.kind not in (Kind.TRANSLATION_UNIT, Kind.NAMESPACE)
 
 
 def is_worth_swapping(first, second):
@@ -70,10 +87,18 @@ def is_worth_swapping(first, second):
     # What a second statement needs of the first's declarations is not there before them.
     if first.declared() & second.names() or first.text == second.text:
         return False
-    if first.has_call() and second.has_call():
+    if first.has_effect() and second.has_effect():
         return True
-    shared = first.names() & second.names()
-    if not (first.has_call() or second.has_call()):
-        return bool(shared) and not (first.is_declaration() or second.is_declaration())
-    silent = second if first.has_call() else first
-    return not silent.is_declaration() and (bool(shared) or not silent.changes_local_alone())
+    if is_used(first.target(), second) or is_used(second.target(), first):
+        return True
+    if not (first.has_effect() or second.has_effect()):
+        return False
+    silent, other = (second, first) if first.has_effect() else (first, second)
+    if silent.is_declaration():
+        return False
+    return bool(silent.names() & other.names()) or not silent.changes_local_alone()
+
+
+def is_used(target, statement):
+    pattern = rf"(?<!\w){re.escape(target)}(?!\w)"
+    return bool(target) and re.search(pattern, statement.text) is not None

@@ -6,6 +6,7 @@ import dataclasses
 SLICE_SECONDS = 15
 SLICE_TESTS = 400
 UNNAMED = "(before any test)"
+TRIES = 3  # by itself, on a machine that may be busy
 
 
 @dataclasses.dataclass
@@ -30,7 +31,7 @@ def slices(tests, durations):
 
 
 def passing(run, tests, failure):
-    """Seconds of each test. One that fails beside others has a second chance by itself.
+    """Seconds of each test. One that fails beside others has more chances by itself.
 
     run(tests) gives a Run; failure(test) makes the exception for one that fails, or for
     None when they do not end."""
@@ -42,9 +43,17 @@ def passing(run, tests, failure):
         durations.update(result.passed)
         if not result.failed:
             break
-        alone = run([result.failed]) if result.failed in left else result
-        if alone.failed or alone.timed_out:
+        passed = by_itself(run, result.failed) if result.failed in left else {}
+        if not passed:
             raise failure(result.failed)
-        durations.update(alone.passed)
+        durations.update(passed)
         left = [test for test in left if test not in durations]
     return durations
+
+
+def by_itself(run, test):
+    for _ in range(TRIES):
+        alone = run([test])
+        if alone.passed and not alone.failed and not alone.timed_out:
+            return alone.passed
+    return {}

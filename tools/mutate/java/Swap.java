@@ -1,22 +1,22 @@
 // SPDX-License-Identifier: Apache-2.0
 import com.sun.source.tree.AssignmentTree;
 import com.sun.source.tree.BlockTree;
+import com.sun.source.tree.CompoundAssignmentTree;
 import com.sun.source.tree.DoWhileLoopTree;
 import com.sun.source.tree.EnhancedForLoopTree;
 import com.sun.source.tree.ExpressionStatementTree;
 import com.sun.source.tree.ForLoopTree;
 import com.sun.source.tree.IfTree;
-import com.sun.source.tree.MethodInvocationTree;
-import com.sun.source.tree.NewClassTree;
 import com.sun.source.tree.StatementTree;
 import com.sun.source.tree.SwitchTree;
 import com.sun.source.tree.SynchronizedTree;
 import com.sun.source.tree.Tree;
 import com.sun.source.tree.TryTree;
+import com.sun.source.tree.UnaryTree;
 import com.sun.source.tree.VariableTree;
 import com.sun.source.tree.WhileLoopTree;
 import com.sun.source.util.TreeScanner;
-import java.util.Collections;
+import java.util.EnumSet;
 import java.util.HashSet;
 import java.util.List;
 import java.util.Set;
@@ -30,6 +30,10 @@ final class Swap {
             ExpressionStatementTree.class, VariableTree.class, IfTree.class, ForLoopTree.class,
             EnhancedForLoopTree.class, WhileLoopTree.class, DoWhileLoopTree.class,
             SwitchTree.class, SynchronizedTree.class, TryTree.class, BlockTree.class);
+
+    private static final Set<Tree.Kind> EFFECTS = EnumSet.of(
+            Tree.Kind.METHOD_INVOCATION, Tree.Kind.NEW_CLASS, Tree.Kind.RETURN, Tree.Kind.THROW,
+            Tree.Kind.BREAK, Tree.Kind.CONTINUE);
 
     private final Source source;
     private final StatementTree first;
@@ -52,27 +56,44 @@ final class Swap {
                 && names(second).contains(declared.getName().toString())) {
             return false;
         }
-        boolean bothSilent = !hasCall(first) && !hasCall(second);
-        boolean declares = first instanceof VariableTree || second instanceof VariableTree;
-        if (bothSilent) {
-            return !shared.isEmpty() && !declares;
-        }
-        if (hasCall(first) && hasCall(second)) {
+        if (hasEffect(first) && hasEffect(second) || changesWhatTheOtherUses()) {
             return true;
         }
-        StatementTree silent = hasCall(first) ? second : first;
-        return !(silent instanceof VariableTree) && (!shared.isEmpty() || isAssignment(silent));
+        if (!hasEffect(first) && !hasEffect(second)) {
+            return false;
+        }
+        StatementTree silent = hasEffect(first) ? second : first;
+        return !(silent instanceof VariableTree) && (!shared.isEmpty() || target(silent) != null);
+    }
+
+    private boolean changesWhatTheOtherUses() {
+        return isUsed(target(first), second) || isUsed(target(second), first);
+    }
+
+    private boolean isUsed(String target, StatementTree statement) {
+        return target != null && Pattern.compile("(?<!\\w)" + Pattern.quote(target) + "(?!\\w)")
+                .matcher(source.of(statement)).find();
+    }
+
+    /** What a statement changes, as it is written; null for those that only call. */
+    private String target(StatementTree statement) {
+        if (!(statement instanceof ExpressionStatementTree expression)) {
+            return null;
+        }
+        if (expression.getExpression() instanceof AssignmentTree assignment) {
+            return source.of(assignment.getVariable());
+        }
+        if (expression.getExpression() instanceof CompoundAssignmentTree assignment) {
+            return source.of(assignment.getVariable());
+        }
+        return expression.getExpression() instanceof UnaryTree step
+                ? source.of(step.getExpression()) : null;
     }
 
     private boolean isFit(StatementTree statement) {
         String text = source.of(statement);
         return KINDS.stream().anyMatch(kind -> kind.isInstance(statement))
                 && !text.startsWith("this(") && !text.startsWith("super(");
-    }
-
-    private static boolean isAssignment(StatementTree statement) {
-        return statement instanceof ExpressionStatementTree expression
-                && expression.getExpression() instanceof AssignmentTree;
     }
 
     /** Without what stands in texts. */
@@ -86,21 +107,16 @@ final class Swap {
         return names;
     }
 
-    private static boolean hasCall(Tree tree) {
+    /** A call, or a way out. */
+    private static boolean hasEffect(Tree tree) {
         boolean[] found = {false};
         new TreeScanner<Void, Void>() {
             @Override
-            public Void visitMethodInvocation(MethodInvocationTree call, Void none) {
-                found[0] = true;
-                return null;
+            public Void scan(Tree part, Void none) {
+                found[0] = found[0] || part != null && EFFECTS.contains(part.getKind());
+                return found[0] ? null : super.scan(part, none);
             }
-
-            @Override
-            public Void visitNewClass(NewClassTree creation, Void none) {
-                found[0] = true;
-                return null;
-            }
-        }.scan(Collections.singleton(tree), null);
+        }.scan(tree, null);
         return found[0];
     }
 }
