@@ -28,8 +28,8 @@ class Area:
         self._confirms = confirms
         self._on_display = on_display
 
-    def find(self):
-        return self._inner.find(self.jobs)
+    def find(self, files):
+        return self._inner.find(self.jobs, files)
 
     @contextlib.contextmanager
     def trial(self):

@@ -50,10 +50,12 @@ class JavaArea:
             raise Failed(f"{self.build} has no tests of the Java half.")
         return commands
 
-    def find(self, _):
-        """All mutants of the area."""
-        lines = self._scan([]).splitlines()
-        sources = {str(path): path.read_bytes() for path in self.sources}
+    def find(self, _, files=None):
+        """All mutants of the area; of those files, when some are given."""
+        chosen = [path for path in self.sources
+                  if files is None or os.path.relpath(path, self.root) in files]
+        lines = self._scan([], chosen).splitlines() if chosen else []
+        sources = {str(path): path.read_bytes() for path in chosen}
         return numbered(self._mutant(line.split("\t"), sources) for line in lines)
 
     def _mutant(self, fields, sources):
@@ -64,12 +66,12 @@ class JavaArea:
                       source.count(b"\n", 0, start) + 1, start, end, source[start:end].decode(),
                       base64.b64decode(becomes).decode(), first, last)
 
-    def _scan(self, options):
+    def _scan(self, options, sources):
         classes = self.work.with_name("java-tool")
         if not self._compile(TOOL.glob("*.java"), classes, []):
             raise Failed("the tool for Java sources cannot be compiled.")
         return output_of([str(self._java), *QUICK, "-cp", str(classes), "FindMutants", *options,
-                          *map(str, self.sources)], self.root)
+                          *map(str, sources)], self.root)
 
     def prepare(self):
         shutil.rmtree(self.work, ignore_errors=True)
@@ -140,7 +142,7 @@ class JavaArea:
 
     def _instrumented(self, workshop):
         copies = workshop.folder / "reach"
-        self._scan(["--reach", str(copies)])
+        self._scan(["--reach", str(copies)], self.sources)
         inner = copies / self.root.relative_to("/") / "java"
         (inner / "module-info.java").unlink()
         shutil.copy(TOOL / "OrvReach.java", inner)

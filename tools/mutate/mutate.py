@@ -119,7 +119,7 @@ def run(options, make_area, listed):
     met = True
     for name in GOALS if options.area == "all" else [options.area]:
         area = make_area(name, options, say)
-        mutants = area.find()
+        mutants = area.find(files)
         for sentence in equivalents.stale(mutants, {m.file for m in mutants}):
             say(sentence)
             met = False
@@ -155,10 +155,12 @@ def try_area(area, mutants, equivalents, source_of):
         with alone_in(area.work), area.trial() as trial:
             try_all(trial, mutants, equivalents, report, source_of, area.jobs)
     finally:
-        met = report.print_table()
-        print(f"{time.monotonic() - started:.0f} seconds for {len(report.results)} of "
-              f"{len(mutants)} mutants", flush=True)
-    return met
+        # Also of what an interrupted run has found.
+        if report.results:
+            report.print_table()
+            print(f"{time.monotonic() - started:.0f} seconds for {len(report.results)} of "
+                  f"{len(mutants)} mutants", flush=True)
+    return report.meets_goals()
 
 
 def main(arguments, make_area=areas.make, listed=FOLDER / "equivalents.toml"):

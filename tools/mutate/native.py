@@ -3,6 +3,8 @@
 rest of a test program. The objects are those of the build tree, copied, so that
 neither it nor the sources are touched."""
 
+import dataclasses
+import hashlib
 import json
 import multiprocessing
 import os
@@ -14,11 +16,10 @@ import subprocess
 import gtest
 import processes
 import reach
-from mutant import Failed, numbered
+from mutant import Failed, Mutant, numbered
 
 # No time is spent on what a mutant is not asked for.
 LEAN = ["-O1", "-g0", "-w"]
-SOURCES = (".cpp", ".h")
 
 
 def output_of(command, folder):
@@ -56,7 +57,6 @@ class NativeArea:
         self.program = self.build / "bin" / program
         self.work = self.build / "mutate" / name
         self.base = self.work / "base"
-        self._users = {}
         entries = json.loads((self.build / "compile_commands.json").read_text())
         self.link_words = self._link_command()
         units = [Unit(entry, self.build) for entry in entries
@@ -65,14 +65,40 @@ class NativeArea:
         self.units = [unit for unit in units if unit.object in self.link_words]
         if not self.units:
             raise Failed(f"{self.program} is not made of sources below {folder}.")
+        self._users = self._users_of_files()
 
-    def find(self, jobs):
-        """All mutants of the area."""
+    def find(self, jobs, files=None):
+        """All mutants of the area; of units that those files go into, when some are given."""
+        units = self.units if files is None else \
+            [unit for unit in self.units if any(unit in self.users(file) for file in files)]
         with multiprocessing.Pool(jobs) as pool:
-            found = pool.map(self._find_in, self.units, chunksize=1)
+            found = pool.map(self._find_in, units, chunksize=1)
         return numbered(m for mutants in found for m in mutants)
 
     def _find_in(self, unit):
+        """Kept until the unit changes: to read all of an area takes a minute."""
+        kept = self.work.with_name(f"found-{self.name}") / f"{unit.object.replace('/', '_')}.json"
+        digest = self._digest(unit)
+        if kept.is_file():
+            content = json.loads(kept.read_text())
+            if content["digest"] == digest:
+                return [Mutant(**fields) for fields in content["mutants"]]
+        found = self._read(unit)
+        kept.parent.mkdir(parents=True, exist_ok=True)
+        kept.write_text(json.dumps(
+            {"digest": digest, "mutants": [dataclasses.asdict(mutant) for mutant in found]}))
+        return found
+
+    def _digest(self, unit):
+        """Of what the mutants depend on: the unit's words, its own files and this tool."""
+        own = sorted(file for file, units in self._users.items() if unit in units)
+        digest = hashlib.sha256(shlex.join(unit.command).encode())
+        for path in [*(self.root / file for file in own),
+                     *sorted(pathlib.Path(__file__).parent.glob("*.py"))]:
+            digest.update(path.read_bytes())
+        return digest.hexdigest()
+
+    def _read(self, unit):
         import cpp  # clang's module, which --help does without
 
         def wanted(path):
@@ -91,7 +117,6 @@ class NativeArea:
                 target = self.base / word
                 target.parent.mkdir(parents=True, exist_ok=True)
                 shutil.copy2(source, target)
-        self._users = self._users_of_headers()
 
     def _link_command(self):
         wanted = os.path.relpath(self.program, self.build)
@@ -103,8 +128,8 @@ class NativeArea:
                     return words
         raise Failed(f"the build does not say how {self.program} is linked.")
 
-    def _users_of_headers(self):
-        """The units that a source or header of the area goes into."""
+    def _users_of_files(self):
+        """The units that each source and header of the area goes into."""
         users = {}
         units = {unit.object: unit for unit in self.units}
         unit = None

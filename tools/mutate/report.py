@@ -40,24 +40,27 @@ class Report:
             print("\r\033[K", end="", file=sys.stderr, flush=True)
 
     def print_table(self):
-        """A row for each operator of each area; (whether every area meets its goal)"""
+        """A row for each operator of each area."""
         self._clear()
         rows = [("area", "operator", "made", *OUTCOMES, "score")]
-        met = True
         for area in GOALS:
-            here = [(m.operator, outcome) for m, outcome, _ in self.results if m.area == area]
-            if not here:
-                continue
+            here = self._of_area(area)
             for operator in sorted({operator for operator, _ in here}):
                 rows.append((area, operator, *counted([o for p, o in here if p == operator])))
-            rows.append((area, "all", *counted([outcome for _, outcome in here])))
-            share = score([outcome for _, outcome in here])
-            met = met and (share is None or share >= GOALS[area])
+            if here:
+                rows.append((area, "all", *counted([outcome for _, outcome in here])))
         widths = [max(len(row[i]) for row in rows) for i in range(len(rows[0]))]
         for row in rows:
             print("  ".join(cell.ljust(width) if i < 2 else cell.rjust(width)
                             for i, (cell, width) in enumerate(zip(row, widths))).rstrip())
-        return met
+
+    def meets_goals(self):
+        scores = {area: score([o for _, o in self._of_area(area)]) for area in GOALS}
+        return all(share is None or share >= GOALS[area] for area, share in scores.items())
+
+    def _of_area(self, area):
+        """(operator, outcome) of each."""
+        return [(m.operator, outcome) for m, outcome, _ in self.results if m.area == area]
 
 
 def score(outcomes):
