@@ -189,9 +189,13 @@ class CppTest(Folder):
     def test_macros_and_headers_of_others_are_left_alone(self):
         self.write("other/other.h", "inline int other() { return 1 + 2; }\n")
         self.write("own/own.h", "#pragma once\nclass C { int own() { return 3 * a; } int a; };\n")
+        self.write("other/c.h", "static inline int c() { return 1 + 2; }\n")
         found = self.find("""\
             #include "../other/other.h"
             #include "own.h"
+            extern "C" {
+            #include "../other/c.h"
+            }
             #define TWICE(x) ((x) + (x))
             int f(int a) { return TWICE(a * 4); }
             """)

@@ -70,6 +70,7 @@ class FileFinder:
     def __init__(self, path, area, name, macros):
         with open(path, "rb") as file:
             self.source = file.read()
+        self.path = path
         self.area = area
         self.name = name
         self.macros = macros
@@ -78,6 +79,9 @@ class FileFinder:
         self.loops = []  # of the loops and switches around, whether each is a loop
 
     def look_for_functions(self, cursor):
+        # A file may be included within what another one opens.
+        if cursor.location.file is None or cursor.location.file.name != self.path:
+            return
         if cursor.kind in FUNCTIONS:
             if cursor.is_definition():
                 self.function = cursor
