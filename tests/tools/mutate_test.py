@@ -276,6 +276,23 @@ class JavaTest(Folder):
         self.assertEqual([m.text for m in found if m.operator == "remove-statement"], [
             "a = b + 2;", "notifyAll();", "b--;", 'System.out.println("a" + b);'])
 
+    def test_a_constructor_assigns_in_any_order_what_nobody_sees_yet(self):
+        found = self.find("""\
+            class Small {
+                private final Object a;
+                private final Object b;
+                private final Object c;
+                Small(Object given) {
+                    a = given;
+                    b = new Object();
+                    c = given;
+                    given.equals(this);
+                }
+            }
+            """)
+        self.assertEqual([m.text.split() for m in found if m.operator == "swap-statements"],
+                         [["c", "=", "given;", "given.equals(this);"]])
+
 
 class RunTest(Folder):
     """On a program of one source and a few tests."""

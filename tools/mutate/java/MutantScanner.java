@@ -213,7 +213,8 @@ final class MutantScanner extends MethodScanner {
     }
 
     private void swapWhereWorth(StatementTree first, StatementTree second) {
-        if (!new Swap(source, first, second).isWorth()) {
+        boolean isInConstructor = method() != null && method().getReturnType() == null;
+        if (!new Swap(source, first, second, isInConstructor).isWorth()) {
             return;
         }
         String between = source.text.substring(source.end(first), source.start(second));

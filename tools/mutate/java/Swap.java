@@ -31,6 +31,8 @@ final class Swap {
             EnhancedForLoopTree.class, WhileLoopTree.class, DoWhileLoopTree.class,
             SwitchTree.class, SynchronizedTree.class, TryTree.class, BlockTree.class);
 
+    private static final Pattern GIVES_THIS_AWAY =
+            Pattern.compile("\\bthis\\b(?!\\.)|->|::|(?<![.\\w])(?!new\\b)[a-z]\\w*\\(");
     private static final Set<Tree.Kind> EFFECTS = EnumSet.of(
             Tree.Kind.METHOD_INVOCATION, Tree.Kind.NEW_CLASS, Tree.Kind.RETURN, Tree.Kind.THROW,
             Tree.Kind.BREAK, Tree.Kind.CONTINUE);
@@ -38,11 +40,13 @@ final class Swap {
     private final Source source;
     private final StatementTree first;
     private final StatementTree second;
+    private final boolean isInConstructor;
 
-    Swap(Source source, StatementTree first, StatementTree second) {
+    Swap(Source source, StatementTree first, StatementTree second, boolean isInConstructor) {
         this.source = source;
         this.first = first;
         this.second = second;
+        this.isInConstructor = isInConstructor;
     }
 
     boolean isWorth() {
@@ -63,7 +67,17 @@ final class Swap {
             return false;
         }
         StatementTree silent = hasEffect(first) ? second : first;
-        return !(silent instanceof VariableTree) && (!shared.isEmpty() || target(silent) != null);
+        StatementTree other = hasEffect(first) ? first : second;
+        if (silent instanceof VariableTree || isInConstructor && !mayUseThis(other)) {
+            return false;
+        }
+        return !shared.isEmpty() || target(silent) != null;
+    }
+
+    // Nobody else has an object that is being made, unless it is given away.
+    private boolean mayUseThis(StatementTree statement) {
+        return !(statement instanceof ExpressionStatementTree)
+                || GIVES_THIS_AWAY.matcher(source.of(statement)).find();
     }
 
     private boolean changesWhatTheOtherUses() {
