@@ -5,7 +5,6 @@ import com.quintora.mmp.internal.base.PlayerThreads;
 import com.quintora.mmp.internal.base.Turns;
 import java.lang.ref.WeakReference;
 import java.util.concurrent.Future;
-import java.util.concurrent.atomic.AtomicInteger;
 import org.jetbrains.annotations.Nullable;
 
 /**
@@ -14,8 +13,10 @@ import org.jetbrains.annotations.Nullable;
  */
 public final class Watcher {
     private final Turns turns = new Turns(PlayerThreads::run);
-    private final AtomicInteger round = new AtomicInteger();
     private final WeakReference<PlayerObserver> observer;
+    // Counted in turns: rounds begin in the order in which they are numbered, or an earlier
+    // one would end the looks of a later one.
+    private int round;
     private volatile int preparingEpoch = -1;
     private volatile @Nullable Future<?> nextLook;
 
@@ -37,8 +38,8 @@ public final class Watcher {
 
     /** Looks at once, and from then on as often as the player's state needs. */
     public void wake() {
-        int mine = round.incrementAndGet();
         turns.execute(() -> {
+            int mine = ++round;
             PlayerObserver looking = observer.get();
             if (looking != null) {
                 looking.begin();
@@ -62,7 +63,7 @@ public final class Watcher {
 
     private void look(int mine) {
         PlayerObserver looking = observer.get();
-        if (looking == null || mine != round.get()) {
+        if (looking == null || mine != round) {
             return; // Collected, or a later wake looks instead.
         }
         int delay = looking.look(preparingEpoch);
