@@ -11,6 +11,11 @@ from pathlib import Path
 CHECKER = Path(__file__).with_name("checked_java.py")
 FOLDER = os.environ["ORV_PLANTED"]
 JAVA = os.environ["ORV_JAVA_COMMAND"].split("|")
+VERSION = subprocess.run(
+    [*JAVA, "-version"], stderr=subprocess.PIPE, check=True, encoding="utf-8"
+).stderr
+# Later virtual machines say nothing of references.
+COUNTS_REFERENCES = ' version "17' in VERSION
 
 
 def check(*names, expected=""):
@@ -33,6 +38,7 @@ class CheckedJavaTest(unittest.TestCase):
         status, _ = check("deleteReferences", "callChecked")
         self.assertEqual(0, status)
 
+    @unittest.skipUnless(COUNTS_REFERENCES, "only Java 17 counts references")
     def test_references_that_are_kept_fail(self):
         status, lines = check("keepReferences")
         self.assertEqual(1, status)
@@ -57,12 +63,17 @@ class CheckedJavaTest(unittest.TestCase):
         here, elsewhere = listed.format("Planted*.callUnchecked"), listed.format("Other.method")
         self.assertEqual(0, check("callUnchecked", expected=here)[0])
         self.assertEqual(1, check("callUnchecked", expected=elsewhere)[0])
-        self.assertEqual(1, check("callUnchecked", "keepReferences", expected=here)[0])
+
+    @unittest.skipUnless(COUNTS_REFERENCES, "only Java 17 counts references")
+    def test_what_is_listed_covers_nothing_else(self):
+        listed = "*Call*VoidMethodV | Planted*.callUnchecked | on purpose\n"
+        self.assertEqual(1, check("callUnchecked", "keepReferences", expected=listed)[0])
 
     def test_the_projects_own_list_does_not_cover_them(self):
         own = CHECKER.with_name("xcheck-expected.txt")
-        for mistake in "keepReferences", "callUnchecked":
-            self.assertEqual(1, run(own, mistake)[0])
+        self.assertEqual(1, run(own, "callUnchecked")[0])
+        if COUNTS_REFERENCES:
+            self.assertEqual(1, run(own, "keepReferences")[0])
 
     def test_the_status_of_java_is_kept(self):
         status, _ = check("noSuchMethod")

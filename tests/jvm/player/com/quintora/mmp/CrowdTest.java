@@ -26,7 +26,7 @@ import org.junit.jupiter.params.provider.ValueSource;
 /** Sixteen threads that call whatever they like of one player. */
 class CrowdTest extends PlayerFixture {
     private static final int THREADS = 16;
-    private static final int CALLS = 150;
+    private static final int CALLS = 150 / Wait.PATIENCE;
 
     private final Queue<String> unexpected = new ConcurrentLinkedQueue<>();
     private final Queue<CompletableFuture<?>> promised = new ConcurrentLinkedQueue<>();

@@ -8,9 +8,11 @@ import java.util.concurrent.Callable;
 
 /** Waits for conditions, with a bound that slow machines can stretch. */
 public final class Wait {
+    /** How many times slower than a usual machine this one may be. */
+    public static final int PATIENCE = Integer.getInteger("orv.test.patience", 1);
+
     /** The bound, generous: only broken code ever waits so long. */
-    public static final Duration LIMIT =
-            Duration.ofSeconds(20L * Integer.getInteger("orv.test.patience", 1));
+    public static final Duration LIMIT = Duration.ofSeconds(20L * PATIENCE);
 
     private Wait() {}
 
