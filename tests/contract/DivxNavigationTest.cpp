@@ -159,6 +159,7 @@ struct PositionField {
     const char* name;
     const char* signature;
 };
+void PrintTo(const PositionField& field, std::ostream* out) { *out << field.name; }
 const PositionField kPositionFields[] = {{"ui8_clip_id", "J"},
                                          {"ui4_title_idx", "I"},
                                          {"ui4_playlist_idx", "I"},

@@ -140,6 +140,7 @@ struct ModeCase {
     int mode;
     int bytesPerPixel;
 };
+void PrintTo(const ModeCase& one, std::ostream* out) { *out << one.mode; }
 
 class ThumbnailModeTest : public ThumbnailTest, public testing::WithParamInterface<ModeCase> {};
 
