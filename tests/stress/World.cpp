@@ -35,7 +35,7 @@ int32_t holdersOf(const sp<android::Surface>& surface) {
 }  // namespace
 
 World::World() : playerClass(orvtest::definePlayerClasses(vm)) {
-    defineJavaMembers(vm, ORV_JAVA_MEMBERS);
+    orvtest::defineJavaMembers(vm, ORV_JAVA_MEMBERS);
     vm.find("java/lang/ref/WeakReference")->field("mNumber", "I");
     playerClass.findMethod("readStream", "(I)I", false)->implementation =
         [](const fakejni::Invocation& call) {
