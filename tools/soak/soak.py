@@ -54,8 +54,9 @@ def parse(arguments):
                         help="how many cycles run at once (default: 4)")
     parser.add_argument("--batch", metavar="N", type=positive, default=10,
                         help="cycles between two checkpoints (default: 10)")
-    parser.add_argument("--limit", metavar="SECONDS", type=positive, default=90,
-                        help="after which an action hangs (default: 90)")
+    parser.add_argument("--limit", metavar="SECONDS", type=positive, default=150,
+                        help="after which an action hangs (default: 150, as a player tries a server that"
+                             " has fallen silent for more than 90)")
     parser.add_argument("--plant", metavar="FAULT,...", type=plants,
                         help="faults of this command's own, to see it fail: " + ", ".join(PLANTS))
     return parser.parse_args(arguments)
