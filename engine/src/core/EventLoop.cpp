@@ -228,7 +228,7 @@ void EventLoop::endUnattendedSeek() {
 // The first picture is not shown before its filters are right. mpv is asked for
 // it once more; where it cannot seek, the filters begin with the second one. mpv may
 // seek by itself as well, since its filters changed: its answer to the request, among
-// the events, tells which of the seeks is the last.
+// the events, shows which of the seeks is the last.
 bool EventLoop::drawsAnew() {
     if (mRedraw == Redraw::Asked || mRedraw == Redraw::Accepted) return true;
     mRedraw = Redraw::None;
