@@ -112,7 +112,7 @@ void defineCallbacks(fakejni::Class& player) {
 }
 
 ObjectPtr newFilledObject(fakejni::Vm& vm, const std::string& path, Words& words) {
-    const ObjectPtr object = vm.newObject(path);
+    ObjectPtr object = vm.newObject(path);
     for (const auto& field : object->type->fields) {
         object->set(field->name, wordOf(vm, field->signature, words));
     }

@@ -9,7 +9,6 @@
 namespace orvfuzz {
 
 using fakejni::ObjectPtr;
-using fakejni::Value;
 
 std::string NativeArguments::takeType() {
     const char* start = mRest;

@@ -193,7 +193,7 @@ struct Native<Function> {
         std::vector<std::string> types = typesOf(signature);
         std::reverse(types.begin(), types.end());
         const auto takeType = [&types] {
-            const std::string type = types.back();
+            std::string type = types.back();
             types.pop_back();
             return type;
         };
@@ -391,6 +391,7 @@ void InjectedFailuresTest::failEachAllocation() {
     for (int n = 1;; n++) {
         std::unique_ptr<AllocationFailure> failure;
         const bool came = attempt("allocation " + std::to_string(n) + " is null", [&] {
+            // NOLINTNEXTLINE(modernize-make-unique): it can be neither copied nor moved
             failure.reset(new AllocationFailure(AllocationFailure::nth(n)));
             return [&failure] {
                 const bool failed = failure->failed() != 0;

@@ -1,6 +1,7 @@
 // SPDX-License-Identifier: Apache-2.0
 // Servers of the worst kind: media from them end as they should, or in an error
 // that says what is wrong.
+#include <gmock/gmock.h>
 #include <orvtarn/PlayerTypes.h>
 #include <stdlib.h>
 #include <sys/stat.h>
