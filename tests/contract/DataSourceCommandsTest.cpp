@@ -125,6 +125,7 @@ TEST_F(DataSourceCommandsTest, DescriptorIsNeitherDuplicatedNorClosed) {
     ASSERT_EQ(pipe(ends), 0);
     const int lowest = lowestFreeDescriptor();
     jobject descriptor = vm.local(newFileDescriptor(vm, ends[0]));
+    const Untraced number(*this);  // which the system chooses
     EXPECT_THAT(setDataSource(descriptor, 0, 9).engine,
                 testing::ElementsAre("setDataSource(" + std::to_string(ends[0]) + ", 0, 9)"));
     call<void>("native_release", "()V");

@@ -13,6 +13,7 @@
 
 #include "JniFixture.h"
 #include "NativeMethodRows.h"
+#include "dispatch/SyncToAsync.h"
 #include "jni/DivxNavigation.h"
 #include "jni/OrvMediaClient.h"
 
@@ -198,6 +199,7 @@ protected:
 };
 
 TEST_F(JavaMembersTest, AreTheListOfTheDoctor) {
+    ORV::SyncToAsync::getInstance();  // the first use logs more than the later ones
     addNativeMethods();
     loadLibrary();
     initClass();
