@@ -9,6 +9,7 @@ namespace orvtest {
 
 ORV_OPEN_MEMBER(DispatcherMutex, ORV::SyncToAsync, m_mutex);
 ORV_OPEN_MEMBER(DispatcherActions, ORV::SyncToAsync, m_actions);
+ORV_OPEN_MEMBER(DispatcherHandlers, ORV::SyncToAsync, m_handlers);
 
 DispatcherFixture::DispatcherFixture()
     : dispatcher(ORV::SyncToAsync::getInstance()),
@@ -26,6 +27,11 @@ void DispatcherFixture::SetUp() {
 }
 
 os::Mutex& DispatcherFixture::dispatcherMutex() { return dispatcher->*memberOf(DispatcherMutex{}); }
+
+size_t DispatcherFixture::handlers() {
+    const Hold held = hold();
+    return (dispatcher->*memberOf(DispatcherHandlers{})).size();
+}
 
 size_t DispatcherFixture::pending() {
     const Hold held = hold();

@@ -40,6 +40,8 @@ protected:
     os::Mutex& dispatcherMutex();
     // How many actions were added and not yet deleted.
     size_t pending();
+    // How many services have a poster.
+    size_t handlers();
 
     // Waits until that line was logged so often and the worker is done with
     // the action that it was about.

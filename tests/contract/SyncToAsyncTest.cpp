@@ -5,6 +5,7 @@
 #include <sys/prctl.h>
 
 #include <algorithm>
+#include <optional>
 #include <set>
 #include <thread>
 
@@ -272,6 +273,37 @@ TEST_F(SyncToAsyncTest, EachChangeWaitsForTheMutex) {
         expectToWaitFor(dispatcherMutex(), change);
     }
     waitForPauses(1);
+}
+
+// Waiting is not enough: what is done before it would not be guarded.
+TEST_F(SyncToAsyncTest, NothingChangesBeforeTheMutexIsTaken) {
+    const android::sp<ORV::MsgDispatcher> poster =
+        new ORV::MsgDispatcher(vm.env(), vm.local(player), string("two"));
+    ORV::SyncToAsyncAction* listed = nullptr;
+    const std::pair<const char*, std::function<void()>> changes[] = {
+        {"addAction", [&] { dispatcher->addAction(action(service, 1)); }},
+        {"abortAction", [&] { dispatcher->abortAction(listed); }},
+        {"abortAllActions", [&] { dispatcher->abortAllActions(service, true); }},
+        {"addMsgHandler", [&] { dispatcher->addMsgHandler(service, poster); }},
+        {"delMsgHandler", [&] { dispatcher->delMsgHandler(service); }}};
+    for (const auto& [name, change] : changes) {
+        SCOPED_TRACE(name);
+        std::optional<OtherThread> changing;
+        {
+            const Hold held = hold();
+            listed = action(service, 2);
+            dispatcher->addAction(listed);
+            const size_t actions = pending();
+            const size_t posters = handlers();
+            changing.emplace(change);
+            EXPECT_TRUE(changing->isStopped());
+            EXPECT_EQ(pending(), actions);
+            EXPECT_EQ(listed->cancelled, 0);
+            EXPECT_EQ(handlers(), posters);
+        }
+        changing->join();
+        while (pending() != 0) std::this_thread::yield();
+    }
 }
 
 TEST_F(SyncToAsyncTest, MutexIsHeldWhileJavaRunsAndInThePause) {
