@@ -27,11 +27,12 @@ std::string escaped(const std::string& text) {
 std::string withoutNumbersOfThisRun(const std::string& text) {
     static const std::regex kPointer("0x[0-9a-f]{5,}");
     static const std::regex kLine("Line:[0-9]+");
-    // Where Java awaits a text and its length, the DivX records bring an address.
-    static const std::regex kAddress("null, -?[0-9]+");
+    // Two DivX records pass arguments that do not fit the signature: what Java makes of
+    // them differs by the machine's word, or is an address.
+    static const std::regex kMisfits("(setDivx(DisplayInfo|LastMemoryFilePosition)Prm)\\(.*");
     std::string steady = std::regex_replace(text, kPointer, "%p");
     steady = std::regex_replace(steady, kLine, "Line:%d");
-    return std::regex_replace(steady, kAddress, "null, %d");
+    return std::regex_replace(steady, kMisfits, "$1");
 }
 
 }  // namespace
