@@ -1,6 +1,9 @@
 // SPDX-License-Identifier: Apache-2.0
 #include "PlayerTest.h"
 
+#include <android/log.h>
+
+#include <algorithm>
 #include <chrono>
 #include <thread>
 
@@ -32,6 +35,13 @@ bool remains(const std::function<bool()>& condition) {
     EXPECT_TRUE(eventually(isOver, 60)) << "the other player does not play";
     other->release();
     return holds;
+}
+
+std::vector<LogLine> complaints(const LogCapture& log) {
+    std::vector<LogLine> lines = log.lines("TarnPlayer");
+    const auto informs = [](const LogLine& line) { return line.priority < ANDROID_LOG_WARN; };
+    lines.erase(std::remove_if(lines.begin(), lines.end(), informs), lines.end());
+    return lines;
 }
 
 PlayerTest::PlayerTest() {

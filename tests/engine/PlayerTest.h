@@ -6,9 +6,11 @@
 
 #include <functional>
 #include <string>
+#include <vector>
 
 #include "EventRecorder.h"
 #include "FrameSink.h"
+#include "LogCapture.h"
 #include "TestMedia.h"
 
 namespace orvtest {
@@ -20,6 +22,10 @@ bool eventually(const std::function<bool()>& condition, int seconds = 15);
 // dozen frames: what the first would do of itself by then comes no later on a slow
 // machine.
 bool remains(const std::function<bool()>& condition);
+
+// The player's lines that warn or report an error; what else its libraries log differs
+// by the machine.
+std::vector<LogLine> complaints(const LogCapture& log);
 
 // A player with a surface and a listener, released at the end.
 class PlayerTest : public testing::Test {
