@@ -199,7 +199,9 @@ class CrowdTest extends PlayerFixture {
             }
             succeeded.put(name, true);
         } catch (Exception | Error e) {
-            if (!isAllowed(e)) {
+            // Not all media that the others set play at that speed.
+            boolean deniesSpeed = name.equals("setSpeed") && e instanceof IllegalArgumentException;
+            if (!isAllowed(e) && !deniesSpeed) {
                 unexpected.add(name + ": " + e);
             }
         }
