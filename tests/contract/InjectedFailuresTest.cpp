@@ -18,6 +18,7 @@
 #include "JavaInputStreamFixture.h"
 #include "JavaMembers.h"
 #include "NativeMethodRows.h"
+#include "PlatformCalls.h"
 #include "PosixCalls.h"
 #include "RecordTexts.h"
 #include "Trace.h"
@@ -451,6 +452,9 @@ void InjectedFailuresTest::runWithoutMachine() {
 }
 
 TEST_P(InjectedFailuresTest, EachIsAsStated) {
+    if (GetParam().name == "setDataSourceFD" && platformHelpersAreInline()) {
+        GTEST_SKIP() << "it would count the calls of the platform's helper";
+    }
     {
         const Untraced first(*this);
         begin();

@@ -1,11 +1,14 @@
 // SPDX-License-Identifier: Apache-2.0
 // The platform's functions that the product calls, for the trace: the linker sends
 // the program's calls here. Each is one step; how it works is left out.
+#include "PlatformCalls.h"
+
 #include <android_runtime/AndroidRuntime.h>
 #include <gui/Surface.h>
 #include <nativehelper/JNIHelp.h>
 
 #include <string>
+#include <utility>
 
 #include "Trace.h"
 
@@ -55,3 +58,19 @@ sp<Surface> getSurface(JNIEnv* env, jobject surface) {
     const Trace::Pause pause;
     return realGetSurface(env, surface);
 }
+
+namespace {
+
+// The functions of a library take C's environment, too.
+template <class Env>
+auto isInLibrary(int) -> decltype(jniThrowException(std::declval<Env>(), "", ""), true) {
+    return true;
+}
+template <class Env>
+bool isInLibrary(long) {
+    return false;
+}
+
+}  // namespace
+
+bool orvtest::platformHelpersAreInline() { return !isInLibrary<C_JNIEnv*>(0); }
