@@ -1,5 +1,6 @@
 // SPDX-License-Identifier: Apache-2.0
 // What comes of a call of libav's that fails: an error, and nothing is broken for the next.
+#include <gmock/gmock.h>
 #include <gtest/gtest.h>
 #include <orvtarn/PlayerTypes.h>
 
