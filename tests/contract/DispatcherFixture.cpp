@@ -35,7 +35,11 @@ size_t DispatcherFixture::handlers() {
 
 size_t DispatcherFixture::pending() {
     const Hold held = hold();
-    return (dispatcher->*memberOf(DispatcherActions{})).size();
+    return actions().size();
+}
+
+std::list<ORV::SyncToAsyncAction*>& DispatcherFixture::actions() {
+    return dispatcher->*memberOf(DispatcherActions{});
 }
 
 void DispatcherFixture::addHandler(const Service& service, const std::string& name) {

@@ -5,6 +5,7 @@
 
 #include <condition_variable>
 #include <functional>
+#include <list>
 #include <mutex>
 #include <string>
 #include <vector>
@@ -40,6 +41,8 @@ protected:
     os::Mutex& dispatcherMutex();
     // How many actions were added and not yet deleted.
     size_t pending();
+    // Those actions, for who holds the mutex.
+    std::list<ORV::SyncToAsyncAction*>& actions();
     // How many services have a poster.
     size_t handlers();
 

@@ -84,6 +84,7 @@ public:
 
     sp<android::Surface> surface;
     sp<ORV::MsgDispatcher> poster;
+    std::vector<std::unique_ptr<JavaInputStream>> engineStreams;
 
 protected:
     void SetUp() override {
@@ -132,6 +133,10 @@ private:
     }
 
     void fillEngine() {
+        // A scripted engine frees none, so that the test does.
+        engine->takeStream = [this](IOrvStreamSource* source) {
+            engineStreams.emplace_back(static_cast<JavaInputStream*>(source));
+        };
         for (const char* tracks :
              {"getVideoTrackCount", "getAudioTrackCount", "getSubtitleTrackCount"}) {
             engine->put(tracks, 2);
@@ -359,6 +364,7 @@ bool InjectedFailuresTest::attempt(const std::string& failure, const Arm& arm) {
 // Whatever a failure left, a player can be released, set up and used.
 void InjectedFailuresTest::checkNextPlayer() {
     stream.reset();
+    engineStreams.clear();
     poster.clear();
     call<void>("native_release", "()V");
     EXPECT_EQ(ScriptedEngine::live(), 0);

@@ -2,9 +2,13 @@
 // The stream's two mutexes: which operation holds which while Java is asked.
 #include <errno.h>
 
+#include <optional>
+
 #include "JavaInputStreamFixture.h"
 #include "MutexProbe.h"
 #include "PrivateMember.h"
+#include "jni/JavaVm.h"
+#include "os/ScopedMutex.h"
 
 namespace orvtest {
 
@@ -54,6 +58,29 @@ TEST_F(JavaInputStreamLocksTest, SizePositionAndDurationAreSerialised) {
     EXPECT_THAT(tried, SizeIs(3));
     EXPECT_THAT(tried, Each(Tried(EBUSY, 0)));
     EXPECT_EQ(tryFromAnotherThread(callMutex()), 0);
+}
+
+// Nothing of them is done, and no line comes, before the call mutex is theirs.
+TEST_F(JavaInputStreamLocksTest, SizePositionAndDurationBeginWithTheCallMutex) {
+    log.clear();
+    g__JavaVM = nullptr;
+    const std::pair<const char*, std::function<void()>> operations[] = {
+        {"getFileLength", [&] { stream->getFileLength(); }},
+        {"getCurrentPosition", [&] { stream->getCurrentPosition(); }},
+        {"getDuration", [&] { stream->getDuration(); }}};
+    for (const auto& [name, operation] : operations) {
+        SCOPED_TRACE(name);
+        std::optional<OtherThread> waiting;
+        {
+            const os::ScopedMutex held(callMutex());
+            waiting.emplace(operation);
+            EXPECT_TRUE(waiting->isStopped());
+            EXPECT_THAT(log.take(), testing::IsEmpty());
+        }
+        waiting->join();
+        EXPECT_THAT(log.take(), testing::Not(testing::IsEmpty()));
+    }
+    g__JavaVM = vm.javaVm();
 }
 
 TEST_F(JavaInputStreamLocksTest, ReadsAndSeeksHoldNoMutex) {

@@ -58,12 +58,39 @@ TEST_F(JavaInputStreamTest, DestructionGivesTheObjectBackBeforeTheClass) {
     EXPECT_THAT(vm.callsOf("AttachCurrentThread"), IsEmpty());
 }
 
+// Another thread's reads end while the references go.
+TEST_F(JavaInputStreamTest, IsInvalidBehindTheFirstLineOfItsDestruction) {
+    make();
+    JavaInputStream* const dying = stream.get();
+    std::vector<bool> valid;
+    const auto look = [&] { valid.push_back(dying->isValid()); };
+    log.whenLogged(enter("JavaInputStream::~JavaInputStream"), [&] {
+        look();
+        vm.whenCalled("GetEnv", look);
+    });
+    stream.reset();
+    vm.whenCalled("GetEnv", [] {});
+    EXPECT_THAT(valid, ElementsAre(true, false));
+}
+
 TEST_F(JavaInputStreamTest, SetInvalidLogsAndClearsTheFlag) {
     make();
     EXPECT_THAT(onEngine([&] { stream->setInvalid(); }),
                 ReturnsNothing().logs(
                     {enter("JavaInputStream::setInvalid"), leave("JavaInputStream::setInvalid")}));
     EXPECT_FALSE(stream->isValid());
+}
+
+TEST_F(JavaInputStreamTest, IsInvalidBetweenTheLinesOfSetInvalid) {
+    make();
+    std::vector<bool> valid;
+    log.whenLogged(enter("JavaInputStream::setInvalid"), [&] {
+        valid.push_back(stream->isValid());
+        log.whenLogged(leave("JavaInputStream::setInvalid"),
+                       [&] { valid.push_back(stream->isValid()); });
+    });
+    stream->setInvalid();
+    EXPECT_THAT(valid, ElementsAre(true, false));
 }
 
 TEST_F(JavaInputStreamTest, ThreadSelfIsAPlainFlag) {

@@ -4,7 +4,9 @@
 #include <jni/media-service/MediaClientListener.h>
 
 #include <algorithm>
+#include <optional>
 
+#include "MutexProbe.h"
 #include "PrivateMember.h"
 #include "ServiceFixture.h"
 
@@ -88,6 +90,22 @@ TEST_F(MediaClientListenerTest, ActionCarriesTheEventAndNoService) {
         EXPECT_EQ(action.payload->ext2, 7);
         EXPECT_EQ(action.payload->obj, &parcel);
     }
+    EXPECT_TRUE(log.waitFor(discarded[1]));
+}
+
+// The leave line says that the dispatcher has the event.
+TEST_F(MediaClientListenerTest, LeavesWhenTheActionIsAdded) {
+    ORV::SyncToAsync& dispatcher = *ORV::SyncToAsync::getInstance();
+    const ExpectedLine leave = info("MediaClientListener::notify(): Leave\n").tagged(kTag);
+    sp<MediaClientListener> listener = new MediaClientListener;
+    std::optional<OtherThread> notifying;
+    {
+        os::ScopedMutex hold(dispatcher.*memberOf(ListenedMutex{}));
+        notifying.emplace([&] { listener->notify(1, 2, 3, nullptr); });
+        EXPECT_TRUE(notifying->isStopped());
+        EXPECT_THAT(log.lines(), testing::Not(testing::Contains(LineIs(leave))));
+    }
+    notifying->join();
     EXPECT_TRUE(log.waitFor(discarded[1]));
 }
 

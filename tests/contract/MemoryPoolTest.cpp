@@ -99,6 +99,25 @@ TEST_F(MemoryPoolTest, HeaderIsTheContractsOnA32BitTarget) {
     EXPECT_EQ(MEMORY_HEADER_SIZE, sizeof(void*) == 4 ? 16u : 32u);
 }
 
+// Whoever has the semaphore finds whole blocks on the list.
+TEST_F(MemoryPoolTest, BlockIsWholeBeforeTheSemaphoreIsGivenBack) {
+    void* itself = nullptr;
+    int size = 0;
+    auto look = semPostCall.replace([&](sem_t* semaphore) {
+        const MemoryBlock* block = memorys.head.prev;
+        if (block != &memorys.head) {
+            size = block->size;
+            memcpy(&itself, reinterpret_cast<const char*>(block) + MEMORY_HEADER_SIZE,
+                   sizeof(itself));
+        }
+        return semPostCall.real(semaphore);
+    });
+    void* memory = mem_alloc(100);
+    EXPECT_EQ(itself, memory);
+    EXPECT_EQ(size, 100);
+    mem_free(memory);
+}
+
 TEST_F(MemoryPoolTest, BlocksStandInTheOrderOfTheirAllocation) {
     void* first = mem_alloc(1);
     void* second = mem_alloc(2);
@@ -173,9 +192,14 @@ TEST_F(MemoryPoolTest, FailedMappingIsReportedAndLeavesTheListAsItWas) {
             errno = ENOMEM;
             return MAP_FAILED;
         });
+        auto post = semPostCall.replace([](sem_t* semaphore) {
+            fputs("given back\n", stderr);
+            return semPostCall.real(semaphore);
+        });
         EXPECT_EQ(mem_alloc(4096), nullptr);
     }
-    EXPECT_EQ(GetCapturedStderr(), std::string("mmap failed \n: ") + strerror(ENOMEM) + "\n");
+    EXPECT_EQ(GetCapturedStderr(),
+              std::string("mmap failed \n: ") + strerror(ENOMEM) + "\ngiven back\n");
     EXPECT_EQ(liveBlocks(), std::vector<MemoryBlock*>{blockOf(kept)});
     EXPECT_EQ(semaphoreValue(), 1);
     mem_free(kept);
@@ -257,6 +281,17 @@ TEST(MemoryPoolSemaphoreTest, UninitialisationDestroysTheSemaphoreAndKeepsTheBlo
     EXPECT_EQ(liveBlocks(), std::vector<MemoryBlock*>{blockOf(kept)});
     EXPECT_EQ(blockOf(kept)->size, 1);
     mem_free(kept);
+    EXPECT_EQ(mem_uninit(), 0);
+}
+
+TEST(MemoryPoolSemaphoreTest, SemaphoreIsNotSharedWithOtherProcesses) {
+    int shared = -1;
+    auto record = semInitCall.replace([&](sem_t* s, int isShared, unsigned value) {
+        if (s == &sem) shared = isShared;
+        return semInitCall.real(s, isShared, value);
+    });
+    ASSERT_EQ(mem_init(), 0);
+    EXPECT_EQ(shared, 0);
     EXPECT_EQ(mem_uninit(), 0);
 }
 

@@ -16,6 +16,7 @@ using android::OrvMediaService;
 
 ORV_OPEN_MEMBER(AllowSet, OrvMediaService, mMetadataAllow);
 ORV_OPEN_MEMBER(DropSet, OrvMediaService, mMetadataDrop);
+ORV_OPEN_MEMBER(UpdatedSet, OrvMediaService, mMetadataUpdated);
 ORV_OPEN_MEMBER(MetadataLock, OrvMediaService, mMetadataLock);
 
 namespace {
@@ -166,6 +167,38 @@ TEST_F(MetadataFilterTest, UpdatesAndTheFiltersReadersWaitForTheLock) {
         }
         other->join();
     }
+}
+
+// Waiting is not enough: what they do before it would not be guarded.
+TEST_F(MetadataFilterTest, TheSetsAreNotTouchedBeforeTheLockIsTaken) {
+    attachPlayer();
+    SortedVector<int>& updated = service.get()->*memberOf(UpdatedSet{});
+    SortedVector<int>& dropping = service.get()->*memberOf(DropSet{});
+    Parcel reply;
+    bool isDropped = true;
+    std::unique_ptr<OtherThread> getting, asking, adding;
+    {
+        android::Mutex::Autolock held(service.get()->*memberOf(MetadataLock{}));
+        dropping.add(5);
+        getting = std::make_unique<OtherThread>([&] { service->getMetadata(true, false, &reply); });
+        asking = std::make_unique<OtherThread>([&] { isDropped = service->shouldDropMetadata(5); });
+        EXPECT_TRUE(getting->isStopped());
+        EXPECT_TRUE(asking->isStopped());
+        updated.add(7);
+        dropping.clear();
+    }
+    getting->join();
+    asking->join();
+    EXPECT_FALSE(isDropped);
+    EXPECT_THAT(engine->calls(), ElementsAre("getMetadata({7})"));
+    {
+        android::Mutex::Autolock held(service.get()->*memberOf(MetadataLock{}));
+        adding = std::make_unique<OtherThread>([&] { service->addNewMetadataUpdate(9); });
+        EXPECT_TRUE(adding->isStopped());
+        EXPECT_TRUE(updated.isEmpty());
+    }
+    adding->join();
+    EXPECT_FALSE(updated.isEmpty());
 }
 
 TEST_F(MetadataFilterTest, ParcelWithoutItsBytesIsABadValue) {

@@ -72,9 +72,15 @@ TEST(OsMessageQueueTest, ManySendersLoseNothingAndKeepTheirOwnOrder) {
 
 TEST(OsMessageQueueTest, SendWaitsForTheMutex) {
     os::MessageQueue<int> queue;
+    int posts = 0;
+    const auto record = semPostCall.replace([&](sem_t* sem) {
+        posts++;
+        return semPostCall.real(sem);
+    });
     expectToWaitFor(
         queue.*memberOf(QueueMutex{}), [&] { queue.send(2); },
         [&] { (queue.*memberOf(QueueItems{})).push(1); });
+    EXPECT_EQ(posts, 0) << "it looked whether the queue is empty before it had the mutex";
     EXPECT_EQ(queue.recv(), 1);
     EXPECT_EQ(queue.recv(), 2);
 }

@@ -6,10 +6,16 @@
 
 #include <string>
 #include <thread>
+#include <vector>
 
 #include "MutexProbe.h"
+#include "PosixCalls.h"
+#include "PrivateMember.h"
 
 namespace orvtest {
+
+ORV_OPEN_MEMBER(MutexAttributes, os::Mutex, mAttributes);
+
 namespace {
 
 TEST(OsMutexTest, IsFreeOnlyAfterItsOwnerUnlockedItAsOftenAsItLockedIt) {
@@ -43,6 +49,28 @@ TEST(OsMutexTest, IsALockThroughItsInterface) {
     EXPECT_EQ(tryFromAnotherThread(mutex), EBUSY);
     EXPECT_EQ(lock.unlock(), 0);
     EXPECT_EQ(tryFromAnotherThread(mutex), 0);
+}
+
+TEST(OsMutexTest, DestructionGivesTheAttributesBackBeforeTheMutex) {
+    std::vector<const void*> expected;
+    std::vector<const void*> destroyed;
+    const std::thread::id self = std::this_thread::get_id();
+    const auto note = [&](const void* block) {
+        if (std::this_thread::get_id() == self) destroyed.push_back(block);
+    };
+    auto attributes = pthreadMutexattrDestroyCall.replace([&](pthread_mutexattr_t* block) {
+        note(block);
+        return pthreadMutexattrDestroyCall.real(block);
+    });
+    auto mutexes = pthreadMutexDestroyCall.replace([&](pthread_mutex_t* block) {
+        note(block);
+        return pthreadMutexDestroyCall.real(block);
+    });
+    {
+        os::Mutex mutex;
+        expected = {&(mutex.*memberOf(MutexAttributes{})), nativeMutex(mutex)};
+    }
+    EXPECT_EQ(destroyed, expected);
 }
 
 // Refuses both, to show that a scope guard looks at neither result.

@@ -8,6 +8,7 @@
 #include <functional>
 #include <future>
 #include <mutex>
+#include <optional>
 #include <thread>
 #include <vector>
 
@@ -112,6 +113,62 @@ TEST(OsThreadTest, BlocksSigtermForItselfOnly) {
     EXPECT_EQ(sigismember(&here, SIGTERM), 0);
 }
 
+// Leaves all bits set on the stack where the functions that are called next have theirs.
+__attribute__((noinline)) void dirtyTheStack() {
+    volatile char bytes[4096];
+    for (volatile char& byte : bytes) byte = -1;
+}
+
+struct Entry {
+    void* (*function)(void*);
+    void* argument;
+};
+
+void* enterOnADirtyStack(void* data) {
+    const Entry entry = *static_cast<Entry*>(data);
+    dirtyTheStack();
+    return entry.function(entry.argument);
+}
+
+TEST(OsThreadTest, BlocksNoOtherSignalWhateverItsStackHolds) {
+    Entry entry = {};
+    auto creation = pthreadCreateCall.replace([&](pthread_t* thread, const pthread_attr_t* block,
+                                                  void* (*function)(void*), void* argument) {
+        entry = {function, argument};
+        return pthreadCreateCall.real(thread, block, enterOnADirtyStack, &entry);
+    });
+    sigset_t inside;
+    Worker worker("worker", [&] { pthread_sigmask(SIG_SETMASK, nullptr, &inside); });
+    worker.Start();
+    worker.Wait();
+    sigset_t expected;
+    pthread_sigmask(SIG_SETMASK, nullptr, &expected);
+    sigaddset(&expected, SIGTERM);
+    for (int signal = 1; signal <= SIGRTMAX; signal++) {
+        EXPECT_EQ(sigismember(&inside, signal), sigismember(&expected, signal)) << signal;
+    }
+}
+
+TEST(OsThreadTest, ItsEntryReturnsItsArgument) {
+    pthread_t handle = {};
+    void* given = nullptr;
+    auto creation =
+        pthreadCreateCall.replace([&](pthread_t* thread, const pthread_attr_t* attributes,
+                                      void* (*entry)(void*), void* argument) {
+            given = argument;
+            const int result = pthreadCreateCall.real(thread, attributes, entry, argument);
+            handle = *thread;
+            return result;
+        });
+    Worker worker("worker", [] {});
+    worker.Start();
+    worker.Wait();
+    void* returned = nullptr;
+    ASSERT_EQ(pthread_join(handle, &returned), 0);
+    EXPECT_EQ(returned, given);
+    EXPECT_EQ(returned, &worker);
+}
+
 // The restoring comes last, behind the signal that Run has returned.
 TEST(OsThreadTest, IgnoresTheFirstRealTimeSignalWhileItRuns) {
     const std::thread::id self = std::this_thread::get_id();
@@ -130,6 +187,11 @@ TEST(OsThreadTest, IgnoresTheFirstRealTimeSignalWhileItRuns) {
             // An earlier test's thread may still be on its way to its restoring.
             static thread_local bool installedHere = false;
             if (previous == nullptr && !installedHere) return 0;
+            if (!installedHere) {
+                char name[16] = {};
+                prctl(PR_GET_NAME, name, 0, 0, 0);
+                EXPECT_STRNE(name, "worker") << "it is named behind the first call";
+            }
             installedHere = true;
             EXPECT_EQ(signal, 32);
             note(previous != nullptr ? "install" : "restore");
@@ -174,12 +236,24 @@ TEST(OsThreadTest, WaitGivesTheSystemsResultAndMinusOneWithoutASignal) {
 TEST(OsThreadTest, DestructionGivesItsSignalAndItsAttributesBack) {
     int semaphores = 0;
     int attributes = 0;
+    std::optional<Deletion> deletion;
     auto signals = semDestroyCall.replace([&](sem_t* sem) {
+        EXPECT_EQ(attributes, 0) << "the signal goes first";
         semaphores++;
         return semDestroyCall.real(sem);
     });
+    // Others destroy attributes, too: a sanitizer those that it asks for the stack with.
+    std::atomic<const pthread_attr_t*> own{nullptr};
+    auto creations = pthreadCreateCall.replace(
+        [&](pthread_t* thread, const pthread_attr_t* block, void* (*entry)(void*), void* argument) {
+            own = block;
+            return pthreadCreateCall.real(thread, block, entry, argument);
+        });
     auto blocks = pthreadAttrDestroyCall.replace([&](pthread_attr_t* block) {
-        attributes++;
+        if (block == own) {
+            EXPECT_FALSE(deletion && deletion->happened()) << "what is deleted is destroyed";
+            attributes++;
+        }
         return pthreadAttrDestroyCall.real(block);
     });
     {
@@ -191,6 +265,7 @@ TEST(OsThreadTest, DestructionGivesItsSignalAndItsAttributesBack) {
         Worker worker("worker", [] {});
         worker.Start();
         worker.Wait();
+        deletion.emplace(worker.*memberOf(Attributes{}));
     }
     EXPECT_EQ(semaphores, 2);
     EXPECT_EQ(attributes, 1);

@@ -171,6 +171,10 @@ INSTANTIATE_TEST_SUITE_P(Modes, ThumbnailModeTest,
 
 TEST_F(ThumbnailTest, NoHeightOrWidthIsNoThumbnail) {
     setUpEngine();
+    const auto watch = mallocCall.replace([](size_t size) {
+        EXPECT_NE(size, 0u) << "a block that nobody frees";
+        return mallocCall.real(size);
+    });
     std::vector<ExpectedLine> lines = linesTo(5, 10, 0);
     lines.insert(lines.end(), {widthLine(16), kModeNotUsed});
     EXPECT_THAT(get(5, 10, 0), Returns("null").logs(lines));

@@ -190,6 +190,15 @@ TEST_F(PlaybackCommandsTest, DurationIsTheEnginesWhateverItsStatus) {
     }
 }
 
+TEST_F(PlaybackCommandsTest, DurationWithoutEngineIsZero) {
+    setUpWithoutEngine();
+    EXPECT_THAT(run("getDuration"),
+                Returns("0").logs({enter("OrvMediaClient_getDuration"), service("getDuration()"),
+                                   serviceError("OrvMediaService::getDuration(): NO_INIT"),
+                                   bridgeInfo("OrvMediaClient_getDuration(): 0 (msec)"),
+                                   leave("OrvMediaClient_getDuration")}));
+}
+
 TEST_F(PlaybackCommandsTest, IsPlayingIsTheEnginesAnswer) {
     setUpPlayer().answer("isPlaying", {0});
     EXPECT_EQ(run("isPlaying").returned, "false");

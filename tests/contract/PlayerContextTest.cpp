@@ -239,7 +239,7 @@ TEST_F(PlayerContextTest, CreatePlayerWithoutServiceOrEnvironmentLogs) {
         observeAction([&] { android::createPlayer(nullptr, nullptr, E_ORV_PLAYER_TYPE_TARN); }),
         ReturnsNothing().logs(
             {enter("createPlayer"), bridgeError("createPlayer(): OrvMediaService==NULL\n")}));
-    EXPECT_EQ(ScriptedEngine::live(), 0);
+    EXPECT_THAT(ScriptedEngine::all(), testing::IsEmpty());
 }
 
 TEST_F(PlayerContextTest, CreatePlayerIgnoresTheType) {
@@ -281,6 +281,26 @@ TEST_F(PlayerContextTest, SetMediaServiceSwapsAndReturnsTheOldOneAlive) {
     EXPECT_THAT(set(nullptr), swapped);
     EXPECT_EQ(old, second);
     EXPECT_EQ(context(), 0);
+}
+
+// The field is read before a reference is taken, and written when both have changed.
+TEST_F(PlayerContextTest, SetMediaServiceCountsBetweenItsReadAndItsWrite) {
+    jobject thiz = vm.local(player);
+    sp<OrvMediaService> first = new OrvMediaService;
+    sp<OrvMediaService> second = new OrvMediaService;
+    android::setMediaService(vm.env(), thiz, first);
+    std::vector<int> counts;
+    const auto count = [&] {
+        counts.push_back(first->getStrongCount());
+        counts.push_back(second->getStrongCount());
+    };
+    vm.whenCalled("GetLongField", count);
+    vm.whenCalled("SetLongField", count);
+    const sp<OrvMediaService> old = android::setMediaService(vm.env(), thiz, second);
+    for (const char* function : {"GetLongField", "SetLongField"}) vm.whenCalled(function, [] {});
+    // At the write, the first one has the test's reference and the one to be returned.
+    EXPECT_THAT(counts, testing::ElementsAre(2, 1, 2, 2));
+    android::setMediaService(vm.env(), thiz, nullptr);
 }
 
 TEST_F(PlayerContextTest, ResetForwardsAndKeepsTheService) {

@@ -113,6 +113,25 @@ std::vector<Event> everyCode() {
 
 INSTANTIATE_TEST_SUITE_P(Codes, EventLineTest, testing::ValuesIn(everyCode()));
 
+// The lines around the callback say when it runs.
+TEST_F(ServiceEventsTest, CallbackRunsBetweenItsLines) {
+    sp<RecordingListener> listener = listen();
+    listener->whenNotified = [&] {
+        EXPECT_THAT(log.take(), LinesAre({info("MEDIA_PREPARED, " + self() + ", prepared"),
+                                          info(" " + self() + ", callback application")}));
+    };
+    service->notify(1, 0, 0, nullptr);
+    EXPECT_THAT(log.take(), LinesAre({info(" " + self() + ", back from callback")}));
+}
+
+TEST_F(ServiceEventsTest, ListenerIsLookedUpBehindTheEventsLine) {
+    listen();
+    log.whenLogged(info("MEDIA_PREPARED, " + self() + ", prepared"),
+                   [&] { service->setListener(nullptr); });
+    service->notify(1, 0, 0, nullptr);
+    EXPECT_THAT(events, ElementsAre("destroyed"));
+}
+
 TEST_F(ServiceEventsTest, ParcelIsHandedOnAsItCame) {
     listen();
     Parcel parcel;

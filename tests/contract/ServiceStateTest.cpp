@@ -81,6 +81,39 @@ TEST_F(ServiceStateTest, CookieIsTheServiceWiredLast) {
     EXPECT_EQ(cookie(), 0u);
 }
 
+// Reads the cookie as it goes.
+class LeavingListener : public SilentListener {
+public:
+    explicit LeavingListener(std::function<void()> leave) : mLeave(std::move(leave)) {}
+    ~LeavingListener() override { mLeave(); }
+
+private:
+    const std::function<void()> mLeave;
+};
+
+TEST_F(ServiceStateTest, TheOldListenerGoesBeforeTheCookieChanges) {
+    uint64_t then = 0;
+    service->setListener(new LeavingListener([&] { then = cookie(); }));
+    service->setListener(nullptr);
+    EXPECT_EQ(then, addressOf(service));
+}
+
+TEST_F(ServiceStateTest, TheEngineGoesBeforeTheServicesListener) {
+    attachPlayer();
+    int engines = -1;
+    service->setListener(new LeavingListener([&] { engines = ScriptedEngine::live(); }));
+    service.clear();
+    EXPECT_EQ(engines, 0);
+}
+
+TEST_F(ServiceStateTest, TheEnginesListenerIsTakenBackBehindItsLine) {
+    attachPlayer();
+    bool hadListener = false;
+    log.whenLogged(info("setNotifyCallback"), [&] { hadListener = engine->listener() != nullptr; });
+    service.clear();
+    EXPECT_TRUE(hadListener);
+}
+
 TEST_F(ServiceStateTest, FlagFollowsConstructionAndAnyDestruction) {
     flag() = false;
     sp<OrvMediaService> other = new OrvMediaService;

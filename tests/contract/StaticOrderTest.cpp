@@ -8,12 +8,12 @@
 
 namespace orvtest {
 
-ORV_OPEN_MEMBER(DispatcherMutex, ORV::SyncToAsync, s_mutexGlobal);
+ORV_OPEN_MEMBER(DispatchersCreationMutex, ORV::SyncToAsync, s_mutexGlobal);
 
 namespace {
 
 TEST(StaticOrderTest, TheServiceLockComesFirstAndThenTheDispatchersMutex) {
-    const pthread_mutex_t* dispatchers = nativeMutex(*memberOf(DispatcherMutex{}));
+    const pthread_mutex_t* dispatchers = nativeMutex(*memberOf(DispatchersCreationMutex{}));
     const std::vector<const pthread_mutex_t*> made = mutexesMadeFirst();
     ASSERT_EQ(made.size(), 2u) << "both have a priority, and nothing else here";
     EXPECT_NE(made[0], dispatchers);

@@ -100,6 +100,10 @@ TEST_F(TwoSubtitleSourcesTest, MissingServiceIsLoggedAndTheRestGoesOn) {
         set(nullptr, string("i")),
         ReturnsNothing().logs({enter(name), missing, null("pszUrlSub"), path("pszUrlSub", "(null)"),
                                path("pszUrlIdx", "i"), leave(name)}));
+    EXPECT_THAT(
+        set(string("s"), nullptr),
+        ReturnsNothing().logs({enter(name), missing, path("pszUrlSub", "s"), null("pszUrlIdx"),
+                               path("pszUrlIdx", "(null)"), leave(name)}));
 }
 
 class TimedTextSourceTest : public JniFixture {

@@ -58,6 +58,18 @@ TEST_F(SyncToAsyncHandlersTest, DeletesEachActionAndItsPayloadWhenItIsDone) {
     dispatcher->delMsgHandler(service);
 }
 
+// What letting go of the references leads to does not meet it any more.
+TEST_F(SyncToAsyncHandlersTest, HandlerIsTakenOutBeforeItIsDeleted) {
+    const size_t before = handlers();
+    addHandler(service, "one");
+    size_t during = before + 1;
+    vm.whenCalled("DeleteGlobalRef", [&] { during = handlers(); });
+    dispatcher->delMsgHandler(service);
+    vm.whenCalled("DeleteGlobalRef", [] {});
+    EXPECT_EQ(during, before);
+    EXPECT_EQ(handlers(), before);
+}
+
 TEST_F(SyncToAsyncHandlersTest, DeleteLogsItsSteps) {
     addHandler(service, "one");
     log.clear();
@@ -211,6 +223,38 @@ TEST_F(SyncToAsyncLifeTest, IsMadeUnderTheGlobalMutex) {
         _exit(tried == EBUSY ? 0 : 1);
     };
     EXPECT_EXIT(use(), testing::ExitedWithCode(0), "");
+}
+
+TEST_F(SyncToAsyncLifeTest, TheWorkerIsStartedBetweenTheConstructorsLines) {
+    const auto use = [] {
+        const auto look = pthreadCreateCall.replace([&](auto... arguments) {
+            fputs("the worker starts\n", stderr);
+            return pthreadCreateCall.real(arguments...);
+        });
+        ORV::SyncToAsync::getInstance();
+        _exit(0);
+    };
+    EXPECT_EXIT(use(), testing::ExitedWithCode(0),
+                testing::MatchesRegex("(.|\n)*SyncToAsync::SyncToAsync\\(\\): Enter\n"
+                                      "the worker starts\n"
+                                      "[^\n]*SyncToAsync::SyncToAsync\\(\\): Leave\n"));
+}
+
+TEST_F(SyncToAsyncLifeTest, TheWorkerIsEndedBehindTheDestructorsFirstLine) {
+    const auto use = [] {
+        // Made first, so that it goes last.
+        static const auto look = semPostCall.replace([](sem_t* semaphore) {
+            fputs("a wake-up\n", stderr);
+            return semPostCall.real(semaphore);
+        });
+        ORV::SyncToAsync::getInstance();
+        exit(0);
+    };
+    EXPECT_EXIT(use(), testing::ExitedWithCode(0),
+                testing::MatchesRegex("(.|\n)*SyncToAsync::~SyncToAsync\\(\\): Enter\n"
+                                      "a wake-up\n"
+                                      "a wake-up\n"
+                                      "[^\n]*SyncToAsync::~SyncToAsync\\(\\): Leave\n"));
 }
 
 // The worker is through with all that was added before the last line comes.

@@ -5,14 +5,25 @@
 #include <sys/prctl.h>
 
 #include <algorithm>
+#include <atomic>
+#include <chrono>
+#include <memory>
 #include <optional>
 #include <set>
 #include <thread>
 
 #include "DispatcherFixture.h"
 #include "MutexProbe.h"
+#include "PrivateMember.h"
 
 namespace orvtest {
+
+using DispatchersQueue = os::MessageQueue<ORV::SyncToAsyncAction*>;
+ORV_OPEN_MEMBER(DispatcherQueue, ORV::SyncToAsync, m_queue);
+ORV_OPEN_MEMBER(DispatcherQueueItems, DispatchersQueue, mQueue);
+ORV_OPEN_MEMBER(DispatcherQueueMutex, DispatchersQueue, mMutex);
+ORV_OPEN_MEMBER(DispatcherQueueWakeUp, DispatchersQueue, mWakeUp);
+
 namespace {
 
 using android::OrvMediaService;
@@ -273,6 +284,142 @@ TEST_F(SyncToAsyncTest, EachChangeWaitsForTheMutex) {
         expectToWaitFor(dispatcherMutex(), change);
     }
     waitForPauses(1);
+}
+
+// What they look for is what there is once they have the mutex.
+TEST_F(SyncToAsyncTest, NothingIsLookedUpBeforeTheMutexIsTaken) {
+    ORV::SyncToAsyncAction late;  // listed alone: the worker does not get it
+    late.cancelled = 0;
+    expectToWaitFor(
+        dispatcherMutex(), [&] { dispatcher->abortAction(&late); },
+        [&] { actions().push_back(&late); });
+    EXPECT_EQ(late.cancelled, 1);
+    {
+        const Hold held = hold();
+        actions().remove(&late);
+    }
+    dispatcher->delMsgHandler(service);
+    const size_t before = handlers();
+    expectToWaitFor(
+        dispatcherMutex(), [&] { dispatcher->delMsgHandler(service); },
+        [&] { addHandler(service, "late"); });
+    EXPECT_EQ(handlers(), before);
+}
+
+// The sender judges whether the queue is empty when it has the queue's mutex.
+TEST_F(SyncToAsyncTest, TheWorkerIsNotWokenForAQueueThatHasAnItem) {
+    auto& queue = dispatcher->*memberOf(DispatcherQueue{});
+    std::atomic<int> wakeUps{0};
+    std::optional<OtherThread> adding;
+    {
+        const auto count = semPostCall.replace([&](sem_t* semaphore) {
+            wakeUps++;
+            return semPostCall.real(semaphore);
+        });
+        {
+            const os::ScopedMutex held(queue.*memberOf(DispatcherQueueMutex{}));
+            adding.emplace([&] { dispatcher->addAction(action(service, 2)); });
+            EXPECT_TRUE(adding->isStopped());
+            (queue.*memberOf(DispatcherQueueItems{})).push(action(service, 1));
+        }
+        adding->join();
+    }
+    EXPECT_EQ(wakeUps, 0);
+    (queue.*memberOf(DispatcherQueueWakeUp{})).release();
+    waitForPauses(2);
+    EXPECT_THAT(posted(), ElementsAre("\"one\" 1", "\"one\" 2"));
+}
+
+TEST_F(SyncToAsyncTest, TheWorkerTakesAnItemWithTheQueuesMutex) {
+    auto& queue = dispatcher->*memberOf(DispatcherQueue{});
+    os::Mutex& mutex = queue.*memberOf(DispatcherQueueMutex{});
+    {
+        const os::ScopedMutex held(mutex);
+        dispatcher->addAction(action(service, 1));
+        while (!isAwaited(mutex) && pauses().empty()) std::this_thread::yield();
+        EXPECT_THAT(pauses(), IsEmpty()) << "it does not wait";
+    }
+    waitForPauses(1);
+}
+
+TEST_F(SyncToAsyncTest, TheWorkerSleepsWhileThereIsNothingToDo) {
+    auto& queue = dispatcher->*memberOf(DispatcherQueue{});
+    const void* wakeUp = &(queue.*memberOf(DispatcherQueueWakeUp{}));
+    // The worker may go through its wait again at any time.
+    const auto sleeps = std::make_shared<std::atomic<bool>>(false);
+    const auto look = semWaitCall.replace([wakeUp, sleeps](sem_t* semaphore) {
+        if (semaphore == wakeUp) *sleeps = true;
+        return semWaitCall.real(semaphore);
+    });
+    dispatcher->addAction(action(service, 1));
+    waitForPauses(1);
+    const auto end = std::chrono::steady_clock::now() + std::chrono::seconds(10);
+    while (!*sleeps && std::chrono::steady_clock::now() < end) std::this_thread::yield();
+    EXPECT_TRUE(*sleeps);
+}
+
+// An argument that is refused needs no mutex.
+TEST_F(SyncToAsyncTest, NullIsRefusedWithoutWaiting) {
+    const std::pair<const char*, std::function<void()>> refusals[] = {
+        {"addAction", [&] { dispatcher->addAction(nullptr); }},
+        {"abortAction", [&] { dispatcher->abortAction(nullptr); }},
+        {"abortAllActions", [&] { dispatcher->abortAllActions(nullptr, true); }},
+        {"addMsgHandler", [&] { dispatcher->addMsgHandler(service, nullptr); }},
+        {"delMsgHandler", [&] { dispatcher->delMsgHandler(nullptr); }}};
+    for (const auto& [name, refusal] : refusals) {
+        SCOPED_TRACE(name);
+        std::optional<OtherThread> refused;
+        const Hold held = hold();
+        refused.emplace(refusal);
+        EXPECT_FALSE(refused->isStopped());
+        refused->join();
+    }
+}
+
+// The last line of an operation comes when all of it is done.
+TEST_F(SyncToAsyncTest, LeaveLinesComeBehindTheChange) {
+    size_t handlersAtTheEnd = 0;
+    log.whenLogged(dispatcherInfo("SyncToAsync::addMsgHandler(): Leave"),
+                   [&] { handlersAtTheEnd = handlers(); });
+    const size_t before = handlers();
+    addHandler(service, "two");
+    EXPECT_EQ(handlersAtTheEnd, before + 1);
+    dispatcher->delMsgHandler(service);
+
+    int32_t cancelledAtTheEnd = 0;
+    {
+        const Hold held = hold();
+        auto* marked = action(service, 1);
+        dispatcher->addAction(marked);
+        log.whenLogged(dispatcherInfo("SyncToAsync::abortAllActions(): Leave"),
+                       [&] { cancelledAtTheEnd = marked->cancelled; });
+        dispatcher->abortAllActions(service, true);
+    }
+    EXPECT_EQ(cancelledAtTheEnd, 1);
+    waitForPauses(1);
+}
+
+TEST_F(SyncToAsyncTest, DiscardedActionsAreDeletedBehindTheirLine) {
+    size_t pendingAtTheLine = 0;
+    auto* invalid = action(service, 1);
+    invalid->valid = false;
+    for (const auto& [line, discarded] :
+         {std::pair(kNotValid, invalid), std::pair(kNoPoster, action(new OrvMediaService, 2))}) {
+        SCOPED_TRACE(line.text);
+        log.whenLogged(line, [&] { pendingAtTheLine = pending(); });
+        dispatcher->addAction(discarded);
+        waitFor(line);
+        EXPECT_EQ(pendingAtTheLine, 1u);
+    }
+}
+
+TEST_F(SyncToAsyncTest, CancelledActionOfAnUnknownKindIsLoggedAsCancelled) {
+    auto* both = action(service, 1);
+    both->kind = 1;
+    both->cancelled = 1;
+    dispatcher->addAction(both);
+    waitForPauses(1);
+    EXPECT_THAT(dispatcherLines(), LinesAre({kCancelled}));
 }
 
 // Waiting is not enough: what is done before it would not be guarded.

@@ -15,6 +15,8 @@ int __real_nanosleep(const timespec*, timespec*);
 int __real_sigaction(int, const struct sigaction*, struct sigaction*);
 int __real_pthread_attr_init(pthread_attr_t*);
 int __real_pthread_attr_destroy(pthread_attr_t*);
+int __real_pthread_mutex_destroy(pthread_mutex_t*);
+int __real_pthread_mutexattr_destroy(pthread_mutexattr_t*);
 int __real_pthread_create(pthread_t*, const pthread_attr_t*, void* (*)(void*), void*);
 void* __real_mmap(void*, size_t, int, int, int, off_t);
 int __real_munmap(void*, size_t);
@@ -33,6 +35,8 @@ PosixCall<int(const timespec*, timespec*)> nanosleepCall(__real_nanosleep);
 PosixCall<int(int, const struct sigaction*, struct sigaction*)> sigactionCall(__real_sigaction);
 PosixCall<int(pthread_attr_t*)> pthreadAttrInitCall(__real_pthread_attr_init);
 PosixCall<int(pthread_attr_t*)> pthreadAttrDestroyCall(__real_pthread_attr_destroy);
+PosixCall<int(pthread_mutex_t*)> pthreadMutexDestroyCall(__real_pthread_mutex_destroy);
+PosixCall<int(pthread_mutexattr_t*)> pthreadMutexattrDestroyCall(__real_pthread_mutexattr_destroy);
 PosixCall<int(pthread_t*, const pthread_attr_t*, void* (*)(void*), void*)> pthreadCreateCall(
     __real_pthread_create);
 PosixCall<void*(void*, size_t, int, int, int, off_t)> mmapCall(__real_mmap);
@@ -64,6 +68,12 @@ int __wrap_pthread_attr_init(pthread_attr_t* attributes) {
 }
 int __wrap_pthread_attr_destroy(pthread_attr_t* attributes) {
     return orvtest::pthreadAttrDestroyCall(attributes);
+}
+int __wrap_pthread_mutex_destroy(pthread_mutex_t* mutex) {
+    return orvtest::pthreadMutexDestroyCall(mutex);
+}
+int __wrap_pthread_mutexattr_destroy(pthread_mutexattr_t* attributes) {
+    return orvtest::pthreadMutexattrDestroyCall(attributes);
 }
 int __wrap_pthread_create(pthread_t* thread, const pthread_attr_t* attributes,
                           void* (*entry)(void*), void* argument) {

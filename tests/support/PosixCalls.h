@@ -73,6 +73,8 @@ extern PosixCall<int(const timespec*, timespec*)> nanosleepCall;
 extern PosixCall<int(int, const struct sigaction*, struct sigaction*)> sigactionCall;
 extern PosixCall<int(pthread_attr_t*)> pthreadAttrInitCall;
 extern PosixCall<int(pthread_attr_t*)> pthreadAttrDestroyCall;
+extern PosixCall<int(pthread_mutex_t*)> pthreadMutexDestroyCall;
+extern PosixCall<int(pthread_mutexattr_t*)> pthreadMutexattrDestroyCall;
 extern PosixCall<int(pthread_t*, const pthread_attr_t*, void* (*)(void*), void*)> pthreadCreateCall;
 extern PosixCall<void*(void*, size_t, int, int, int, off_t)> mmapCall;
 extern PosixCall<int(void*, size_t)> munmapCall;

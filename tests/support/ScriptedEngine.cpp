@@ -68,6 +68,7 @@ void ScriptedEngine::sendEvent(int msg, int ext1, int ext2, const android::Parce
 }
 
 void ScriptedEngine::answer(const std::string& operation, std::initializer_list<int> results) {
+    std::lock_guard<std::mutex> lock(mMutex);
     mAnswers[operation] = results;
 }
 

@@ -6,6 +6,7 @@
 #include <algorithm>
 
 #include "FakeJni/EnvSupport.h"
+#include "Trace.h"
 
 namespace fakejni {
 
@@ -59,7 +60,9 @@ ObjectPtr* elementOf(Entry& entry, jobjectArray handle, jsize index) {
 jobject getObjectArrayElement(JNIEnv* env, jobjectArray handle, jsize index) {
     Entry entry(env, "GetObjectArrayElement", std::to_string(index));
     ObjectPtr* element = elementOf(entry, handle, index);
-    return element == nullptr ? nullptr : entry.local(*element);
+    if (element == nullptr) return nullptr;
+    orvtest::Trace::add("jni", "  is " + toString(Value::of(*element)));
+    return entry.local(*element);
 }
 
 void setObjectArrayElement(JNIEnv* env, jobjectArray handle, jsize index, jobject value) {

@@ -4,6 +4,7 @@
 
 #include "FakeJni/EnvSupport.h"
 #include "FakeJni/ModifiedUtf8.h"
+#include "Trace.h"
 
 namespace fakejni {
 
@@ -83,6 +84,7 @@ void giveBack(JNIEnv* env, const char* function, jstring handle, const void* buf
     ObjectPtr owner = entry.vm.unpin(buffer, function);
     if (owner == nullptr) return;
     if (owner != string) entry.violation("the characters belong to another string");
+    orvtest::Trace::add("jni", "  of " + toString(Value::of(owner)));
     free(const_cast<void*>(buffer));
 }
 
