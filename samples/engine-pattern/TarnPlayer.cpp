@@ -4,6 +4,7 @@
 #include <log/log.h>
 #include <orvtarn/TarnPlayer.h>
 #include <stdio.h>
+#include <stream/IOrvStreamSource.h>
 
 #include <algorithm>
 #include <chrono>
@@ -192,7 +193,8 @@ status_t TarnPlayer::stop() { return mEngine->go(__func__, OPEN | STOPPED, STOPP
 status_t TarnPlayer::reset() { return mEngine->go(__func__, ALIVE, IDLE); }
 status_t TarnPlayer::release() { return mEngine->release(), NO_ERROR; }
 // Every frame is a key frame, to which all modes lead.
-status_t TarnPlayer::seekTo(int msec, int) {
+status_t TarnPlayer::seekTo(int msec, int mode) {
+    if (mode < 0 || mode > 3) return refuse(__func__), BAD_VALUE;
     return mEngine->run(__func__, OPEN, [=](Engine& e) {
         if (e.phase == COMPLETED) e.phase = PAUSED;
         e.time = std::clamp<Time>(msec * 1ms, 0ms, e.duration);
@@ -211,11 +213,10 @@ bool TarnPlayer::canDoSeek(int) { return mEngine->is(OPEN); }
 bool TarnPlayer::isPlaying() { return mEngine->is(STARTED); }
 int TarnPlayer::getBufferPercent() { return mEngine->is(OPEN) ? 100 : 0; }
 status_t TarnPlayer::getCurrentPosition(int* msec) {
-    return mEngine->run(nullptr, OPEN, [=](Engine& e) { *msec = static_cast<int>(e.time / 1ms); });
+    return mEngine->run(nullptr, OPEN, [=](Engine& e) { *msec = int(e.time / 1ms); });
 }
-status_t TarnPlayer::getDuration(int* msec) {
-    return mEngine->run(__func__, OPEN | STOPPED,
-                        [=](Engine& e) { *msec = static_cast<int>(e.duration / 1ms); });
+status_t TarnPlayer::getDuration(int* to) {
+    return mEngine->run(__func__, OPEN | STOPPED, [=](Engine& e) { *to = int(e.duration / 1ms); });
 }
 status_t TarnPlayer::getVideoWidth(int* w) { return *w = mEngine->is(OPEN) * kWidth, NO_ERROR; }
 status_t TarnPlayer::getVideoHeight(int* h) { return *h = mEngine->is(OPEN) * kHeight, NO_ERROR; }
@@ -242,9 +243,9 @@ status_t TarnPlayer::getCurrentSubtitleIndex(int* index) { return *index = -1, m
 bool TarnPlayer::offSubtitleTrack() { return mEngine->is(OPEN); }
 // What has no meaning here, and what this engine does not do.
 void TarnPlayer::configPlayer(bool) {}
-status_t TarnPlayer::setVolume(float, float) { return NO_ERROR; }
+status_t TarnPlayer::setVolume(float l, float r) { return l + r >= 0 ? NO_ERROR : BAD_VALUE; }
 status_t TarnPlayer::getMetadata(const SortedVector<int>&, Parcel*) { return NO_ERROR; }
-status_t TarnPlayer::setDataSource(IOrvStreamSource*) { return refuse(__func__); }
+status_t TarnPlayer::setDataSource(IOrvStreamSource* s) { return delete s, refuse(__func__); }
 status_t TarnPlayer::setDataSource(int, int64_t, int64_t) { return refuse(__func__); }
 status_t TarnPlayer::setParameter(int, const Parcel&) { return refuse(__func__), BAD_VALUE; }
 status_t TarnPlayer::getParameter(int, Parcel*) { return refuse(__func__), BAD_VALUE; }
@@ -274,5 +275,4 @@ bool TarnPlayer::setSubtitleDataSource(const char*) { return !refuse(__func__); 
 bool TarnPlayer::setSubtitleDataSourceEx(const char*, const char*) { return !refuse(__func__); }
 bool TarnPlayer::setSubtitleAttr(int, void*) { return !refuse(__func__); }
 bool TarnPlayer::flushSubtitleAttr() { return !refuse(__func__); }
-
 }  // namespace android

@@ -4,16 +4,25 @@
 #include <string.h>
 
 #include <algorithm>
-
-#include "TestMedia.h"
+#include <fstream>
+#include <iterator>
+#include <utility>
 
 namespace orvtest {
 namespace {
 
+std::vector<uint8_t> contentOf(const std::string& path) {
+    std::ifstream file(path, std::ios::binary);
+    return {std::istreambuf_iterator<char>(file), std::istreambuf_iterator<char>()};
+}
+
 class TakenStream : public IOrvStreamSource {
 public:
     explicit TakenStream(FakeStream& stream) : mStream(stream) {}
-    ~TakenStream() override { mStream.mDeletes++; }
+    ~TakenStream() override {
+        mStream.mDeletedOn = std::this_thread::get_id();
+        mStream.mDeletes++;
+    }
 
     int read(char* buffer, int len, int& readLen) override {
         return mStream.read(buffer, len, readLen);
@@ -49,7 +58,7 @@ private:
 IOrvStreamSource* FakeStream::forEngine() { return new TakenStream(*this); }
 
 FakeStream::FakeStream(const std::string& path)
-    : mContent(bytesOf(path)), mDelivered(mContent.size()) {}
+    : mContent(contentOf(path)), mDelivered(mContent.size()) {}
 
 void FakeStream::blockAt(int64_t position) {
     std::lock_guard<std::mutex> lock(mMutex);

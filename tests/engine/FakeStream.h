@@ -9,6 +9,7 @@
 #include <memory>
 #include <mutex>
 #include <string>
+#include <thread>
 #include <vector>
 
 namespace orvtest {
@@ -66,6 +67,7 @@ public:
     std::atomic<int> mCancels{0};
     std::atomic<int> mCloses{0};
     std::atomic<int> mDeletes{0};
+    std::atomic<std::thread::id> mDeletedOn{};
     std::atomic<int> mInside{0};  // calls under way
     std::atomic<int64_t> mEndsAtNow{INT64_MAX};
 

@@ -244,6 +244,16 @@ TEST_F(NetworkTest, AServerThatIsGoneDoesNotUndoTheEnd) {
     EXPECT_EQ(NO_ERROR, endOf());
 }
 
+// It takes connections all the same.
+TEST_F(NetworkTest, AServerThatFallsSilentIsReported) {
+    HttpFaults faults;
+    faults.stallAt = 1500000;
+    HttpServer server(mediaPath("feature.mkv"), faults);
+    ASSERT_EQ(NO_ERROR, prepareUrl(server.url()));
+    server.setSilent(true);
+    EXPECT_EQ(ORV_ERROR_NO_ANSWER, endOf());
+}
+
 TEST_F(NetworkTest, WhatBreaksOffIsAnError) {
     HttpFaults faults;
     faults.breakAt = 1500000;

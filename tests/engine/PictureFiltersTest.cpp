@@ -104,8 +104,8 @@ TEST(PictureFilters, AlwaysNameTheInput) {
     traits.matrix = AVCOL_SPC_UNSPECIFIED;
     traits.range = AVCOL_RANGE_UNSPECIFIED;
     EXPECT_THAT(pictureFilters(traits), HasSubstr("tin=16:pin=9:min=9:rin=limited"));
-    traits.primaries = static_cast<AVColorPrimaries>(200);
-    traits.matrix = static_cast<AVColorSpace>(200);
+    traits.primaries = AVCOL_PRI_NB;
+    traits.matrix = AVCOL_SPC_NB;
     traits.range = AVCOL_RANGE_JPEG;
     EXPECT_THAT(pictureFilters(traits), HasSubstr("tin=16:pin=9:min=9:rin=full"));
     traits.matrix = AVCOL_SPC_RGB;

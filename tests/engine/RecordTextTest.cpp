@@ -51,9 +51,10 @@ TEST(RecordText, KeepsTextsOfSeveralScripts) {
 
 TEST(RecordText, KeepsTheEdgesOfEachSequenceLength) {
     const std::string edges =
-        "\x01\x7F\xC2\x80\xDF\xBF\xE0\xA0\x80\xED\x9F\xBF\xEE\x80\x80\xEF\xBF\xBF";
+        "\x01\x7F\xC2\x80\xDF\xBF\xE0\xA0\x80\xE0\xBF\xBF\xED\x9F\xBF\xEE\x80\x80\xEF\xBF\xBF";
     EXPECT_EQ(narrow(edges), edges);
-    EXPECT_EQ(wide(edges), (std::u16string{1, 0x7F, 0x80, 0x7FF, 0x800, 0xD7FF, 0xE000, 0xFFFF}));
+    EXPECT_EQ(wide(edges),
+              (std::u16string{1, 0x7F, 0x80, 0x7FF, 0x800, 0xFFF, 0xD7FF, 0xE000, 0xFFFF}));
     EXPECT_EQ(wide("\xF0\x90\x80\x80"), (std::u16string{0xD800, 0xDC00}));
     EXPECT_EQ(wide("\xF4\x8F\xBF\xBF"), (std::u16string{0xDBFF, 0xDFFF}));
 }

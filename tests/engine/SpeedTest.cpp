@@ -1,11 +1,15 @@
 // SPDX-License-Identifier: Apache-2.0
 // Speeds, backward play, single frames and repeated sections.
+#include <fcntl.h>
+#include <unistd.h>
+
 #include <chrono>
 #include <filesystem>
 #include <fstream>
 
 #include "CoreCalls.h"
 #include "FakeStream.h"
+#include "HttpServer.h"
 #include "PlayerTest.h"
 
 using namespace android;
@@ -142,6 +146,54 @@ TEST_F(SpeedTest, NewMediaPlaysAtTheNormalSpeed) {
     EXPECT_EQ(1000, speed());
     ASSERT_EQ(NO_ERROR, player->start());
     EXPECT_TRUE(eventually([&] { return position() > 500; }));
+}
+
+// mpv would take the single frame for a still picture, and know no positions any more.
+TEST_F(SpeedTest, PlaysOnAfterItWasBackwardAtTheStart) {
+    open("slides.mkv");
+    ASSERT_EQ(NO_ERROR, player->setSpeed(-4000));
+    ASSERT_EQ(NO_ERROR, player->start());
+    ASSERT_TRUE(eventually([&] { return speed() == 1000; }));
+    for (int step = 0; step < 5; step++) {
+        const int shown = position();
+        ASSERT_TRUE(eventually([&] { return position() > shown; })) << step;
+    }
+}
+
+// mpv does not find back from the end that they have.
+TEST_F(SpeedTest, RewindsMediaThatEndTooEarly) {
+    const int file = ::open(mediaPath("silent.mkv").c_str(), O_RDONLY | O_CLOEXEC);
+    ASSERT_EQ(NO_ERROR, player->setDataSource(file, 0, 21044));
+    close(file);
+    ASSERT_EQ(NO_ERROR, player->prepare());
+    ASSERT_EQ(NO_ERROR, player->start());
+    ASSERT_TRUE(eventually([&] { return events->count(MEDIA_PLAYBACK_COMPLETE) > 0; }));
+    // For a second after its last read, mpv would look for more by itself.
+    const sp<EventRecorder> seen = new EventRecorder;
+    const sp<TarnPlayer> other = new TarnPlayer(-1);
+    other->setNotifyCallback(seen);
+    ASSERT_EQ(NO_ERROR, other->setDataSource(mediaPath("silent.mkv").c_str(), nullptr));
+    ASSERT_EQ(NO_ERROR, other->prepare());
+    ASSERT_EQ(NO_ERROR, other->start());
+    ASSERT_TRUE(seen->waitFor(MEDIA_PLAYBACK_COMPLETE));
+    other->release();
+    ASSERT_EQ(NO_ERROR, player->setSpeed(-1000));
+    ASSERT_EQ(NO_ERROR, player->start());
+    EXPECT_TRUE(eventually([&] { return speed() == 1000; }, 30)) << "the start is reached";
+    ASSERT_EQ(NO_ERROR, player->seekTo(0, 0));
+    EXPECT_TRUE(eventually([&] { return position() > 100; }));
+}
+
+// All of them is kept by mpv, and has no key frame but the first.
+TEST_F(SpeedTest, PlaysSlidesOfAServerBackward) {
+    HttpServer server(mediaPath("slides.mkv"));
+    ASSERT_EQ(NO_ERROR, player->setDataSource(server.url().c_str(), nullptr));
+    ASSERT_EQ(NO_ERROR, player->prepare());
+    ASSERT_EQ(NO_ERROR, player->seekTo(6000, 3));
+    ASSERT_TRUE(player->canDoTrick(-4000));
+    ASSERT_EQ(NO_ERROR, player->setSpeed(-4000));
+    ASSERT_EQ(NO_ERROR, player->start());
+    EXPECT_TRUE(eventually([&] { return position() < 6000; }));
 }
 
 // Whether one of the process's threads has that name.

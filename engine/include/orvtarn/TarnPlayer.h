@@ -27,7 +27,8 @@ namespace android {
 // A player is idle, initialized (setDataSource), preparing, prepared, started,
 // paused, stopped, completed, in error or released. An operation that its state
 // does not allow is INVALID_OPERATION or false, and every failure logs one line.
-// getCurrentPosition, which is asked again and again, alone does not. reset
+// getCurrentPosition, which is asked again and again, alone does not. An operation
+// that an engine does not offer is refused so in every state. reset
 // leads back to idle from everywhere but released, and ends what other
 // threads are waiting for, as stop and release do; what they waited for is then
 // INVALID_OPERATION. Surface, volume, looping, role and parameters outlast a
@@ -36,6 +37,10 @@ namespace android {
 // Programs without an event channel follow a player by asking for its position
 // (see getCurrentPosition), which distinguishes all states. Events go to the
 // listener on a thread of the engine's own, on which it may call the player.
+// Media that are ready are one MEDIA_PREPARED, each seek that was done is one
+// MEDIA_SEEK_COMPLETE, the end is one MEDIA_PLAYBACK_COMPLETE and what ends the
+// media otherwise one MEDIA_ERROR. The picture's size is MEDIA_SET_VIDEO_SIZE,
+// before the media are ready and whenever it changes.
 class TarnPlayer : public MediaPlayerBase {
 public:
     // decoder: the number of the hardware decoder to use, -1 for any. This engine
@@ -129,7 +134,7 @@ public:
     // speed is. Media that cannot seek do not play backward.
     bool canDoSeek(int speed);
     bool canDoTrick(int speed);
-    // The desktop has no such setting: always false.
+    // False without such a setting, as on the desktop.
     bool setTS(unsigned short ts);
     // Frames, negative for back. Pauses, and blocks until the last one is shown.
     // False without a picture and for a frame before the first or past the last.
@@ -206,8 +211,7 @@ public:
     // The media are raw samples: without a description two channels of signed
     // little-endian 16 bits at 44100 Hz.
     void setPcmFlag();
-    // The desktop locks nothing: INVALID_OPERATION, and BAD_VALUE for what is no
-    // PIN of four digits.
+    // BAD_VALUE for what is no PIN of four digits. The desktop locks nothing.
     status_t setUnLockPin(int pin);
 
 protected:

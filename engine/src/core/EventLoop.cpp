@@ -83,13 +83,14 @@ void EventLoop::run() {
     nameThisThread("orv-events");
     bool isEmpty = true;  // no event waits
     while (!mQuit) {
-        const mpv_event& event = *mpv_wait_event(mMpv.get(), isEmpty ? -1 : 0);
+        const mpv_event& event = *mpv_wait_event(mMpv.get(), isEmpty ? mMedia.patience() : 0);
         handle(event);
         // A frame's time may be among the reports that wait, and mpv hands out its
         // log after everything else.
         isEmpty = event.event_id == MPV_EVENT_NONE;
         if (!isEmpty) continue;
         mMedia.settle();
+        mMedia.watchServer();
         mFrames.answer();
     }
 }
@@ -187,6 +188,7 @@ void EventLoop::onRestart() {
     const bool again = drawsAnew();
     const bool opened = mState.update([&](PlayerState::Values& v) {
         v.restarts++;
+        v.left = false;
         if (v.phase != Phase::Preparing || again) return false;
         v.restarted = true;
         v.hasVideo = hasVideo;

@@ -9,7 +9,8 @@
 
 namespace orvtarn {
 
-struct FrameSize {
+// Aligned by its size, as an atomic one is stored: clang would call libatomic for less.
+struct alignas(8) FrameSize {
     int width = 0;  // pixels
     int height = 0;
     bool operator==(FrameSize other) const {

@@ -248,6 +248,9 @@ bool MpvHandle::getNode(const char* property, MpvNode& node) const {
 
 int MpvHandle::setBackward(bool backward) {
     if (mHandle == nullptr) return MPV_ERROR_UNINITIALIZED;
+    // From what mpv keeps of a stream it may find no key frame to play backward from, and
+    // then waits for good: it is to read anew.
+    set("demuxer-seekable-cache", backward ? "no" : "auto");
     return assign(mHandle, {kDirection, std::string(backward ? kBackward : "forward")});
 }
 

@@ -4,6 +4,8 @@
 #include <media/MediaPlayerInterface.h>
 #include <orvtarn/PlayerTypes.h>
 
+#include <chrono>
+#include <cmath>
 #include <utility>
 
 #include "base/EngineLog.h"
@@ -15,6 +17,9 @@ namespace {
 
 // Tracks of one file may end at different times. Seconds.
 constexpr double kEndSlack = 1.5;
+// What was read and not played of one track when the others have come to their end is less.
+// Seconds.
+constexpr double kAhead = 0.5;
 
 }  // namespace
 
@@ -26,6 +31,7 @@ void OpenMedia::setSource(std::shared_ptr<MediaSource> source) {
 void OpenMedia::onStart() {
     if (mLoadFailed) settle();
     mTrouble.forget();
+    mWentOnFrom = -1;
     mMissedLines = false;
 }
 
@@ -101,9 +107,27 @@ void OpenMedia::findCause(android::status_t status) {
                 [this, session](android::status_t cause) { failIn(session, cause); });
 }
 
+void OpenMedia::watchServer() {
+    const std::shared_ptr<MediaSource> media = source();
+    const bool waits = mState.read([](const PlayerState::Values& v) { return v.awaitsData(); });
+    if (media == nullptr || !waits || !isOpenedScheme(schemeOf(mOpening))) return mSilence.stop();
+    if (!mSilence.isDue(reached(), std::chrono::steady_clock::now())) return;
+    const uint64_t session = this->session();
+    mCause.find(media, mOpening, ORV_ERROR_IO, [this, session](android::status_t cause) {
+        // Otherwise mpv gets through to it again, or reports why not.
+        if (cause == ORV_ERROR_NO_ANSWER) failIn(session, cause);
+    });
+}
+
+// Changes while data come.
+int64_t OpenMedia::reached() const {
+    const double until = mMpv.getDouble("demuxer-cache-time").value_or(0);
+    return mMpv.getInt("stream-pos").value_or(0) + std::llround(until * 1e6);
+}
+
 void OpenMedia::onEnd() {
     // The report may be older than a seek away from the end.
-    if (!mMpv.getFlag("eof-reached").value_or(false)) return;
+    if (!mMpv.getFlag("eof-reached").value_or(false) || goesOn()) return;
     if (brokeOff()) {
         mMpv.set("pause", true);
         return failIn(session(), causeOfBreak());
@@ -111,6 +135,17 @@ void OpenMedia::onEnd() {
     // A seek may pass the end on its way; it has the end looked for when done.
     if (mState.read([](const PlayerState::Values& v) { return v.seeking; })) return;
     if (mEndHandler()) mNotifier.post(android::MEDIA_PLAYBACK_COMPLETE);
+}
+
+// mpv stands at the end of a section that was repeated until just now, which is like the
+// end of the media to it: a seek has it play what follows.
+bool OpenMedia::goesOn() {
+    const double position = mMpv.getDouble("time-pos").value_or(mWentOnFrom);
+    const double ahead = mMpv.getDouble("demuxer-cache-duration").value_or(0);
+    if (!endsEarly() || ahead < kAhead || position == mWentOnFrom) return false;
+    if (mState.phase() != Phase::Started) return false;
+    mWentOnFrom = position;
+    return mMpv.seek(position, "absolute+exact") >= 0;
 }
 
 // Whether the media came to an end because nobody gives their bytes any more.

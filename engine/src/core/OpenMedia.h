@@ -6,6 +6,7 @@
 #include <utils/Errors.h>
 
 #include <atomic>
+#include <chrono>
 #include <functional>
 #include <memory>
 #include <mutex>
@@ -16,6 +17,7 @@
 #include "core/Notifier.h"
 #include "core/PlayerState.h"
 #include "core/ReadTrouble.h"
+#include "core/SilenceWatch.h"
 #include "source/FailureCause.h"
 #include "source/MediaSource.h"
 
@@ -52,6 +54,11 @@ public:
     // Delivers an end or failure that was reported. All that mpv has logged about it
     // is known by now.
     void settle();
+    // Asks a server of which nothing has come for long whether it is there, and fails
+    // the media when it gives no answer.
+    void watchServer();
+    // Seconds until that is worthwhile, -1 for ever.
+    double patience() const { return mSilence.remaining(std::chrono::steady_clock::now()); }
     // What mpv says of the duration, or the source where mpv only guesses. Seconds.
     double durationOf(double byMpv) const;
 
@@ -59,11 +66,13 @@ private:
     void onLoadFailed(android::status_t status);
     void findCause(android::status_t status);
     void onEnd();
+    bool goesOn();
     bool brokeOff() const;
     bool isSilenceGood() const;
     bool endsEarly() const;
     android::status_t causeOfBreak() const;
     bool sourceFailed() const;
+    int64_t reached() const;
     uint64_t session() const;
     void failIn(uint64_t session, android::status_t status);
     std::shared_ptr<MediaSource> source() const;
@@ -79,9 +88,11 @@ private:
     int64_t mFileSize = 0;  // bytes, 0 when unknown
     ReadTrouble mTrouble;
     bool mMissedLines = false;  // which may have been about these media
+    SilenceWatch mSilence;
     FailureCause mCause;
     // An end that waits for the log lines about its cause.
     bool mEndReached = false;
+    double mWentOnFrom = -1;  // the position, seconds
     std::atomic<bool> mLooksForEnd{false};
     std::optional<android::status_t> mLoadFailed;
     uint64_t mFailedSession = 0;

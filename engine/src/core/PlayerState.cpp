@@ -30,6 +30,10 @@ PlayerState::Position PlayerState::Values::currentPosition() const {
     return {android::NO_ERROR, toMilliseconds(phase == Phase::Completed ? duration : reached)};
 }
 
+bool PlayerState::Values::awaitsData() const {
+    return fileOpen && (phase == Phase::Preparing || (isOpen() && (left || buffering)));
+}
+
 void PlayerState::Values::beginSeek() {
     seeksOf = seeks;
     restartsOf = restarts;
@@ -38,6 +42,7 @@ void PlayerState::Values::beginSeek() {
 void PlayerState::Values::onSeek() {
     if (seeks == seeksOf) restartsOf = restarts;
     seeks++;
+    left = true;
 }
 
 bool PlayerState::Values::isArriving() const {
@@ -46,7 +51,7 @@ bool PlayerState::Values::isArriving() const {
 
 void PlayerState::Values::forgetMedia() {
     const Values fresh;
-    fileStarted = restarted = framed = hasVideo = seekable = buffering = false;
+    fileStarted = left = restarted = framed = hasVideo = seekable = buffering = false;
     if (!attended) seeking = false;  // who attends it ends it
     startUs.reset();
     position = fresh.position;

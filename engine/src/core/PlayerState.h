@@ -32,8 +32,9 @@ const char* phaseName(Phase phase);
 // loop, read and waited for by anybody.
 class PlayerState {
 public:
-    // What programs ask for again and again, as getCurrentPosition answers it.
-    struct Position {
+    // What programs ask for again and again, as getCurrentPosition answers it. Aligned by
+    // its size, as an atomic one is stored: clang would call libatomic for less.
+    struct alignas(8) Position {
         android::status_t status = android::INVALID_OPERATION;
         int32_t msec = 0;
     };
@@ -48,6 +49,7 @@ public:
         // Of the media that is open; see forgetMedia.
         bool fileOpen = false;     // from the load to mpv's word that it ended
         bool fileStarted = false;  // mpv has taken the load up
+        bool left = false;         // mpv is on its way to another position
         bool restarted = false;    // playback is ready to go on from the first position
         bool framed = false;       // its first frame was handed out
         bool hasVideo = false;
@@ -74,6 +76,8 @@ public:
         // A seek or the load goes on with mpv paused.
         bool isHeld() const { return attended || phase == Phase::Preparing; }
         Position currentPosition() const;
+        // Playback would go on, or begin, if there were more of the media.
+        bool awaitsData() const;
         // A seek is about to be given to mpv.
         void beginSeek();
         // mpv has left the place where it was. A restart that is reported before is of

@@ -4,17 +4,9 @@
 #include <algorithm>
 
 #include "base/EngineLog.h"
+#include "playback/ShortestSection.h"
 
 namespace orvtarn {
-namespace {
-
-// Of media that name no rate.
-constexpr double kUsualRate = 25;  // frames a second
-// mpv takes what it plays of one frame alone for a still picture, which has no position,
-// and never takes that back while the media are open.
-constexpr double kFewestFrames = 1.5;
-
-}  // namespace
 
 bool AbRepeat::set(int type) {
     if (mState.requireOpen("setABRepeat") != android::NO_ERROR) return false;
@@ -53,13 +45,7 @@ bool AbRepeat::setEnd() {
     if (!begin) return refused("setABRepeat", "the section has no beginning");
     if (!now || *now <= *begin)
         return refused("setABRepeat", "the end is not behind the beginning");
-    return mMpv.set("ab-loop-b", std::max(*now, *begin + shortest())) >= 0;
-}
-
-// How long a section must be at least to have two frames, in seconds.
-double AbRepeat::shortest() const {
-    const double rate = mMpv.getDouble("container-fps").value_or(0);
-    return kFewestFrames / (rate > 0 ? rate : kUsualRate);
+    return mMpv.set("ab-loop-b", std::max(*now, *begin + shortestSection(mMpv))) >= 0;
 }
 
 }  // namespace orvtarn

@@ -23,7 +23,6 @@ public:
 private:
     bool setBegin();
     bool setEnd();
-    double shortest() const;
 
     MpvHandle& mMpv;
     PlayerState& mState;

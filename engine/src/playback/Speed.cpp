@@ -4,10 +4,12 @@
 #include <orvtarn/PlayerTypes.h>
 #include <stdlib.h>
 
+#include <algorithm>
 #include <chrono>
 
 #include "base/EngineLog.h"
 #include "base/ThreadName.h"
+#include "playback/ShortestSection.h"
 
 namespace orvtarn {
 namespace {
@@ -19,15 +21,12 @@ constexpr int kFastestBackwardPlay = 8000;
 // Above this the decoder cannot follow without leaving frames out.
 constexpr int kFastestFullDecoding = 16000;
 constexpr std::chrono::milliseconds kJumpInterval{100};
+// So near to the start there is nothing to play backward. Seconds.
+constexpr double kStart = 0.5;
 
 bool isSpeed(int speed) {
     return speed >= ORV_SPEED_MIN && speed <= ORV_SPEED_MAX && abs(speed) >= kSlowest;
 }
-
-// mpv stands still, and this unit seeks.
-bool jumps(int speed) { return speed < -kFastestBackwardPlay; }
-
-bool playsBackward(int speed) { return speed < 0 && !jumps(speed); }
 
 }  // namespace
 
@@ -44,25 +43,38 @@ status_t Speed::set(int speed) {
 }
 
 status_t Speed::apply(int speed) {
-    const int error = setTempo(speed);
+    const bool jumps = speed < -kFastestBackwardPlay || (speed < 0 && isAtStart());
+    status_t status = play(speed, jumps);
+    // In damaged media mpv may not find a way back.
+    if (status == android::TIMED_OUT && speed < 0 && !jumps) status = play(speed, true);
+    if (status != android::NO_ERROR) becomeNormal();
+    return status;
+}
+
+status_t Speed::play(int speed, bool jumps) {
+    const int error = setTempo(speed, jumps);
     if (error < 0) return failed(android::UNKNOWN_ERROR, "setSpeed", mpv_error_string(error));
-    const bool turns = playsBackward(speed) != playsBackward(mSpeed);
-    if (turns) {
-        const status_t status = mSeeker.setDirection("setSpeed", playsBackward(speed));
-        if (status != android::NO_ERROR) {
-            setTempo(mSpeed);
-            return status;
-        }
+    const bool backward = speed < 0 && !jumps;
+    if (backward != mMpv.isBackward()) {
+        const status_t status = mSeeker.setDirection("setSpeed", backward);
+        if (status != android::NO_ERROR) return status;
     }
     mSpeed = speed;
-    mTransport.setTrick(jumps(speed), speed < 0);
-    if (jumps(speed)) startJumping(speed);
+    mTransport.setTrick(jumps, speed < 0);
+    if (jumps) startJumping(speed);
     return android::NO_ERROR;
 }
 
+// mpv takes what it plays of one frame alone for a still picture, and never takes that
+// back while the media are open.
+bool Speed::isAtStart() const {
+    const double start = std::max(kStart, shortestSection(mMpv));
+    return mState.read([start](const PlayerState::Values& v) { return v.position < start; });
+}
+
 // How fast mpv plays, whatever the direction. 0 or an mpv_error.
-int Speed::setTempo(int speed) {
-    const double tempo = jumps(speed) ? 1.0 : abs(speed) / 1000.0;
+int Speed::setTempo(int speed, bool jumps) {
+    const double tempo = jumps ? 1.0 : abs(speed) / 1000.0;
     mFrameTiming.setSpeed(speed < 0 ? -tempo : tempo);
     const int error = mMpv.set("framedrop", speed > kFastestFullDecoding ? "decoder+vo" : "vo");
     return error < 0 ? error : mMpv.set("speed", tempo);
@@ -91,7 +103,7 @@ bool Speed::onEndReached() {
 
 void Speed::becomeNormal() {
     mSpeed = ORV_SPEED_NORMAL;
-    setTempo(ORV_SPEED_NORMAL);
+    setTempo(ORV_SPEED_NORMAL, false);
     mMpv.setBackward(false);
     mTransport.setTrick(false, false);
 }

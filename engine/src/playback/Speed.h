@@ -16,9 +16,10 @@
 namespace orvtarn {
 
 // Play speeds, in thousandths; negative ones play backward. mpv plays
-// backward at up to eight times the speed; beyond, this unit seeks from key
-// frame to key frame by the clock. At its start, media that were played
-// backward go on forward at the normal speed.
+// backward at up to eight times the speed; beyond, and where mpv finds no way
+// back, mpv stands still and this unit seeks from key frame to key frame by the
+// clock. At its start, media that were played backward go on forward at the
+// normal speed.
 class Speed {
 public:
     Speed(MpvHandle& mpv, PlayerState& state, Seeker& seeker, Transport& transport,
@@ -31,7 +32,7 @@ public:
           mFrameTiming(frameTiming) {}
     ~Speed() { stopJumping(); }
 
-    // BAD_VALUE outside of 250..32000 forward or backward, INVALID_OPERATION
+    // Normal when it fails. BAD_VALUE outside of 250..32000 forward or backward, INVALID_OPERATION
     // before the media is prepared and backward in media that cannot seek.
     android::status_t set(int speed);
     int get() const { return mSpeed; }
@@ -48,7 +49,9 @@ public:
 
 private:
     android::status_t apply(int speed);
-    int setTempo(int speed);
+    android::status_t play(int speed, bool jumps);
+    bool isAtStart() const;
+    int setTempo(int speed, bool jumps);
     void becomeNormal();
     void startJumping(int speed);
     void stopJumping();
