@@ -1,10 +1,11 @@
 # SPDX-License-Identifier: Apache-2.0
 # shellcheck shell=bash
-# help: fuzz [NAME] [--time SECONDS] [--runs N] [--seed N]    looks for inputs that crash or break a promise: of target NAME, or of all, SECONDS each; without arguments lists the targets
+# help: fuzz [NAME | --all] [--time SECONDS] [--runs N] [--seed N]    looks for inputs that crash or break a promise: of target NAME, or of all, one a processor at a time, SECONDS (60) each; prints a line for each target and the sum of the runs; without arguments lists the targets
 use packages preset
 
 readonly USUAL_TIME=60
 name=
+all=
 declare -A limits=()
 
 # A target's comment, up to its first full stop.
@@ -29,7 +30,8 @@ while [ $# -gt 0 ]; do
     case $1 in
     --time | --runs | --seed) take_limit "${1#--}" "${2:-}" && shift ;;
     --time=* | --runs=* | --seed=*) take_limit "$(expr "$1" : '--\([a-z]*\)')" "${1#*=}" ;;
-    --help) name= && limits=() && break ;;
+    --all) all=yes ;;
+    --help) name= && all= && limits=() && break ;;
     -*) die_usage "fuzz does not know '$1'." ;;
     *)
         [ -z "$name" ] || die_usage "fuzz takes one target, not '$name' and '$1'."
@@ -40,13 +42,14 @@ while [ $# -gt 0 ]; do
 done
 [ -z "$name" ] || all_targets | grep -qxF -- "$name" ||
     die_usage "there is no fuzz target '$name'; ./orv fuzz lists them."
-if [ -z "$name" ] && [ ${#limits[@]} = 0 ]; then
+[ -z "$name" ] || [ -z "$all" ] || die_usage "fuzz takes --all or a target, not both."
+if [ -z "$name$all" ] && [ ${#limits[@]} = 0 ]; then
     printf 'Fuzz targets:\n'
     describe_targets
     exit 0
 fi
 
-folder=$(preset_folder fuzz)
+folder=$(preset_folder asan)
 
 # libFuzzer's options of a target.
 fuzzer_options() {
@@ -64,19 +67,27 @@ fuzz_target() {
     local target=$1 status=0 options
     mkdir -p -- "$folder/grown/$target"
     mapfile -t options < <(fuzzer_options "$target")
-    "$folder/bin/$target" "${options[@]}" "$folder/grown/$target" \
+    LSAN_OPTIONS=suppressions=$ORV_ROOT/cmake/lsan.supp:print_suppressions=0 \
+        "$folder/bin/$target" "${options[@]}" "$folder/grown/$target" \
         "$ORV_ROOT/fuzz/corpus/$target" >"$ORV_BUILD/log/fuzz-$target.log" 2>&1 </dev/null ||
         status=$?
     report_target "$target" "$status"
 }
 
+# runs_of TARGET…: the runs of them together, in this call.
+runs_of() {
+    local target
+    for target; do
+        sed -n 's/^stat::number_of_executed_units: *//p' "$ORV_BUILD/log/fuzz-$target.log"
+    done | awk '{ sum += $1 } END { print sum + 0 }'
+}
+
 # report_target TARGET STATUS: the line of a target, and its findings.
 report_target() {
     local target=$1 log=$ORV_BUILD/log/fuzz-$1.log
-    awk -v target="$target" '
-        /stat::number_of_executed_units/ { runs = $2 }
+    awk -v target="$target" -v runs="$(runs_of "$target")" '
         match($0, / cov: [0-9]+/) { cover = substr($0, RSTART + 6, RLENGTH - 6) }
-        END { printf "%-22s  %12s runs  %6s places covered\n", target, runs + 0, cover + 0 }' "$log"
+        END { printf "%-22s  %12s runs  %6s places covered\n", target, runs, cover + 0 }' "$log"
     [ "$2" != 0 ] || return 0
     grep -m 1 -E '^broken: |^SUMMARY: |ERROR: |runtime error: ' "$log" | sed 's/^/    /' || true
     keep_findings "$target" || printf '    it ended with status %s; see %s\n' "$2" "$log"
@@ -87,7 +98,8 @@ report_target() {
 keep_findings() {
     local input seed status=1
     for input in "$found/$1"-*; do
-        [ -f "$input" ] || continue
+        # Empty for a leak that is found at the end, of no one input.
+        [ -s "$input" ] || continue
         seed=fuzz/corpus/$1/found-$(sha256sum <"$input" | cut -c 1-10)
         mv -- "$input" "$ORV_ROOT/$seed"
         printf '    found: %s, which is a seed of the tests now; to see it again: %s %s\n' \
@@ -99,10 +111,11 @@ keep_findings() {
 
 need_packages "fuzz" play test fuzz
 mapfile -t targets < <(if [ -n "$name" ]; then printf '%s\n' "$name"; else all_targets; fi)
-build_preset fuzz "${targets[@]}"
+build_preset asan "${targets[@]}"
 found=$(mktemp -d)
 trap 'rm -rf -- "$found"' EXIT
 
+started=$SECONDS
 failed=
 running=0
 for target in "${targets[@]}"; do
@@ -117,4 +130,6 @@ while [ "$running" -gt 0 ]; do
     wait -n || failed=yes
     running=$((running - 1))
 done
+[ ${#targets[@]} = 1 ] ||
+    printf '%-22s  %12s runs  in %s s\n' "${#targets[@]} targets" "$(runs_of "${targets[@]}")" "$((SECONDS - started))"
 [ -z "$failed" ]

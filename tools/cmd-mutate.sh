@@ -9,8 +9,8 @@ while [ $# -gt 0 ]; do
     case $1 in
     --area) area=${2:-} && shift ;;
     --area=*) area=${1#*=} ;;
-    --sample | --seed | --since | --filter | --jobs) shift ;;
-    --sample=* | --seed=* | --since=* | --filter=* | --jobs=* | --list) ;;
+    --sample | --seed | --since | --filter | --resume | --jobs) shift ;;
+    --sample=* | --seed=* | --since=* | --filter=* | --resume=* | --jobs=* | --list) ;;
     -h | --help) exec "$ORV_ROOT/tools/mutate/mutate.py" --help ;;
     *) die_usage "mutate does not know '$1'." ;;
     esac

@@ -9,7 +9,7 @@ folder=$(mktemp -d)
 trap 'rm -rf -- "$folder"' EXIT
 # Findings are written into the checkout: it is a copy.
 root=$folder/checkout
-mkdir -p "$root/fuzz/corpus" "$folder/bin" "$folder/build/fuzz/bin"
+mkdir -p "$root/fuzz/corpus" "$folder/bin" "$folder/build/asan/bin"
 cp -r "$source/orv" "$source/tools" "$root"
 cp "$source"/fuzz/*Fuzzer.cpp "$root/fuzz"
 for target in "$root"/fuzz/*Fuzzer.cpp; do
@@ -27,7 +27,7 @@ done
 # stand_in STATUS: a target that says what libFuzzer says, and has found something
 # unless STATUS is 0.
 stand_in() {
-    cat >"$folder/build/fuzz/bin/PcmFuzzer" <<END
+    cat >"$folder/build/asan/bin/PcmFuzzer" <<END
 #!/bin/bash
 printf '%s\n' "\$@" >"$folder/arguments"
 echo '#2 INITED cov: 41 ft: 2 corp: 1/1b'
@@ -40,7 +40,7 @@ for argument; do
 done
 exit $1
 END
-    chmod +x "$folder/build/fuzz/bin/PcmFuzzer"
+    chmod +x "$folder/build/asan/bin/PcmFuzzer"
 }
 
 # expect WHAT STATUS TEXT ARGUMENTS…: TEXT stands in what ./orv fuzz says of them.
@@ -64,6 +64,7 @@ passes() {
 expect "no arguments" 0 "  PcmFuzzer               The description of a raw PCM stream"
 expect "another target" 2 "there is no fuzz target 'Nope'; ./orv fuzz lists them." Nope
 expect "two targets" 2 "fuzz takes one target, not 'PcmFuzzer' and 'EventFuzzer'." PcmFuzzer EventFuzzer
+expect "a target and all" 2 "fuzz takes --all or a target, not both." --all PcmFuzzer
 expect "another option" 2 "fuzz does not know '--fast'." --fast
 expect "a time that is no number" 2 "--time of fuzz is a whole number from 1 on, not 'soon'." --time soon
 expect "no time at all" 2 "--time of fuzz is a whole number from 1 on, not '0'." --time=0
@@ -79,6 +80,20 @@ if grep -q max_total_time "$folder/arguments"; then
     echo "FAILED: a number of runs has a time, too"
     failures=$((failures + 1))
 fi
+
+count=0
+for target in "$root"/fuzz/*Fuzzer.cpp; do
+    name=$(basename -- "$target" .cpp)
+    [ "$name" = PcmFuzzer ] || cp "$folder/build/asan/bin/PcmFuzzer" "$folder/build/asan/bin/$name"
+    count=$((count + 1))
+done
+expect "all targets" 0 "$(printf '%-22s  %12s runs  in ' "$count targets" $((4567 * count)))" --all
+passes -max_total_time=60
+[ "$(grep -c ' runs  ' "$folder/said")" = $((count + 1)) ] || {
+    echo "FAILED: not one line for each target and one for all:"
+    cat "$folder/said"
+    failures=$((failures + 1))
+}
 
 stand_in 77
 expect "a finding" 1 "broken: the sky is up" PcmFuzzer

@@ -168,7 +168,11 @@ class CppTest(Folder):
     def test_neighbours_stay_that_do_not_see_each_other(self):
         self.assertEqual(self.changes("""\
             struct Color { int r, g; }; void use(Color*); void call();
+            struct Text { Text(); Text(int); };
             void f(Color* given) {
+                call();
+                Text text;
+                call();
                 Color own;
                 own.r = 1;
                 own.g = 2;
@@ -411,6 +415,66 @@ class RunTest(Folder):
         seed = said.split()[-1]
         self.assertEqual(sample("--seed", seed)[2], said)
 
+    def test_a_run_goes_on_where_another_ended(self):
+        build, journal = self.build(), self.folder / "journal"
+        options = ("--resume", str(journal), "--filter", "sum |nobodyAsks")
+        self.mutate(build, "--resume", str(journal), "--filter", "sum ")
+        kept = journal.read_text().splitlines()
+        self.assertEqual(sorted(json.loads(line)[1] for line in kept), ["noticed", "noticed"])
+        lines = self.mutate(build, *options)[1]
+        self.assertRegex(lines[-2], r"^product +all +6 +2 +0 +4 ")
+        self.assertEqual(len(journal.read_text().splitlines()), 6)
+        # What nothing noticed is tried again, and all of a source that has changed.
+        self.mutate(build, *options)
+        self.assertEqual(len(journal.read_text().splitlines()), 10)
+        journal.write_text("[[1], 2, 3]\nnonsense\n")
+        status, _, said = self.mutate(build, *options)
+        self.assertEqual(status, 1)
+        self.assertIn("journal is not a file of ./orv mutate --resume.", said)
+        status, _, said = self.mutate(build, "--resume", str(self.folder))
+        self.assertIn(f"{self.folder} cannot be written: Is a directory.", said)
+
+    LOOP = """\
+        #include <condition_variable>
+        #include <mutex>
+        #include <thread>
+        std::mutex& mutex = *new std::mutex;  // the loop goes on till the end
+        std::condition_variable& changed = *new std::condition_variable;
+        int asked = 0, done = 0;
+        void work() {}
+        void loop() {
+            for (;;) {
+                std::unique_lock<std::mutex> lock(mutex);
+                changed.wait(lock, [] { return asked > done; });
+                work();
+                done = asked;
+                changed.notify_all();
+            }
+        }
+        int ask() {
+            static const bool begun = [] { std::thread(loop).detach(); return true; }();
+            std::unique_lock<std::mutex> lock(mutex);
+            asked += begun;
+            changed.notify_all();
+            changed.wait(lock, [] { return asked == done; });
+            return done;
+        }
+        """
+
+    def test_a_loop_is_of_each_test_that_has_its_thread_do_something(self):
+        self.SMALL = self.LOOP
+        build = self.build("""\
+            #include <gtest/gtest.h>
+            int ask();
+            TEST(Loop, Begins) { ask(); }
+            TEST(Loop, GoesOn) { const int before = ask(); EXPECT_EQ(ask(), before + 1); }
+            """)
+        lines = self.mutate(build, "--filter", "loop relational")[1]
+        reach = json.loads((build / "mutate/reach-product.json").read_text())["calls"]
+        found = {line: sorted(names) for line, names in reach["frameworks/small.cpp"].items()}
+        self.assertEqual(found["8"], ["Loop.Begins", "Loop.GoesOn"], found)
+        self.assertTrue(lines[-1])
+
     def test_only_what_has_changed_since_a_revision(self):
         build = self.build()
         git = ["git", "-C", str(self.folder), "-c", "user.name=n", "-c", "user.email=e"]
@@ -458,6 +522,12 @@ class EquivalentsTest(Folder):
         mutant = Mutant("product", "a.cpp", "f", "swap-statements", 9, 0, 0, "one();\n   two();",
                         "two();\n   one();", 1, 20)
         self.assertTrue(Equivalents(path).matches(mutant))
+        entry = path.read_text()
+        path.write_text(entry.replace('"one();  two();"', '["two(); one();", "one(); two();"]'))
+        self.assertTrue(Equivalents(path).matches(mutant))
+        self.assertRegex("".join(Equivalents(path).stale([mutant], {"a.cpp"})),
+                         "^e.toml: nothing in a.cpp is 'two[^.]*any more.$")
+        path.write_text(entry)
         path.write_text(path.read_text().replace("neither sees the other", " "))
         with self.assertRaisesRegex(Failed, "an entry of a.cpp lacks 'reason'"):
             Equivalents(path)

@@ -53,8 +53,23 @@ void noteInChild(uintptr_t address) {
     if (isChild || getpid() != mainProcess) append(childsTest + addressText(address) + "\n");
 }
 
+void note(uintptr_t address) {
+    if (insert(address)) noteInChild(address);
+}
+
+// What a thread is within. A loop that an earlier test began on a thread of its own is
+// of each later test, too, that has the thread call something.
+constexpr size_t kDepth = 256;
+thread_local uintptr_t frames[kDepth];
+thread_local size_t depth = 0;
+thread_local unsigned notedFor = 0;
+std::atomic<unsigned> testNumber{1};
+
 class Reach : public testing::EmptyTestEventListener {
-    void OnTestStart(const testing::TestInfo& info) override { childsTest = name(info); }
+    void OnTestStart(const testing::TestInfo& info) override {
+        childsTest = name(info);
+        ++testNumber;
+    }
     void OnTestEnd(const testing::TestInfo& info) override {
         std::string line = name(info);
         for (auto& slot : slots) {
@@ -91,7 +106,14 @@ const bool listens = [] {
 
 extern "C" void __cyg_profile_func_enter(void* function, void*) {
     const auto address = reinterpret_cast<uintptr_t>(function);
-    if (insert(address)) noteInChild(address);
+    if (depth < kDepth) frames[depth] = address;
+    ++depth;
+    const unsigned number = testNumber;
+    if (notedFor != number) {
+        notedFor = number;
+        for (size_t i = 0; i < depth && i < kDepth; ++i) note(frames[i]);
+    }
+    note(address);
 }
 
-extern "C" void __cyg_profile_func_exit(void*, void*) {}
+extern "C" void __cyg_profile_func_exit(void*, void*) { --depth; }

@@ -27,18 +27,24 @@ class Equivalents:
                                 f"has the unknown '{unknown[0]}'."))
 
     def matches(self, mutant):
-        return any(matches(entry, mutant) for entry in self._entries)
+        return any(matches(entry, text, mutant)
+                   for entry in self._entries for text in texts(entry))
 
     def stale(self, mutants, files):
         """A sentence for each entry of those files that fits no mutant any more."""
-        return [f"{self._path.name}: nothing in {entry['file']} is '{squeeze(entry['text'])}' "
+        return [f"{self._path.name}: nothing in {entry['file']} is '{squeeze(text)}' "
                 f"for {entry['operator']} in {entry['function']} any more."
-                for entry in self._entries if entry["file"] in files
-                and not any(matches(entry, mutant) for mutant in mutants)]
+                for entry in self._entries if entry["file"] in files for text in texts(entry)
+                if not any(matches(entry, text, mutant) for mutant in mutants)]
 
 
-def matches(entry, mutant):
-    return (entry["file"], entry["function"], entry["operator"], squeeze(entry["text"])) == (
+def texts(entry):
+    """One, or a list of those alike."""
+    return [entry["text"]] if isinstance(entry["text"], str) else entry["text"]
+
+
+def matches(entry, text, mutant):
+    return (entry["file"], entry["function"], entry["operator"], squeeze(text)) == (
         mutant.file, mutant.function, mutant.operator, squeeze(mutant.text)) \
         and ("becomes" not in entry or squeeze(entry["becomes"]) == squeeze(mutant.becomes)) \
         and entry.get("number", mutant.number) == mutant.number

@@ -18,6 +18,7 @@ import time
 import areas
 import processes
 from equivalents import Equivalents
+from journal import Journal
 from mutant import Failed
 from report import GOALS, Report
 
@@ -49,6 +50,9 @@ def options_of(arguments):
     parser.add_argument("--filter", metavar="REGEX", type=re.compile, default="",
                         help="those alone whose 'FILE:LINE FUNCTION OPERATOR' matches")
     parser.add_argument("--list", action="store_true", help="list them without trying any")
+    parser.add_argument("--resume", metavar="FILE",
+                        help="notes each outcome in FILE as it comes, and tries no more what FILE "
+                             "says was noticed in the same source")
     parser.add_argument("--jobs", type=positive, metavar="J",
                         help="that many at a time; default: one for each processor")
     parser.add_argument("--root", required=True, help=argparse.SUPPRESS)
@@ -85,12 +89,14 @@ def list_mutants(mutants, equivalents, source_of):
         print("".join(f"    {line}\n" for line in mutant.diff(source_of(mutant))), end="")
 
 
-def try_all(trial, mutants, equivalents, report, source_of, jobs):
+def try_all(trial, mutants, equivalents, journal, report, source_of, jobs):
     """Adds the outcome of each to the report."""
     rest = []
     for mutant in mutants:
-        if equivalents.matches(mutant):
-            report.add(mutant, "equivalent", "", [])
+        known = ("equivalent", "") if equivalents.matches(mutant) else \
+            journal and journal.outcome(mutant)
+        if known:
+            report.add(mutant, *known, [])
         else:
             rest.append(mutant)
     if not rest:
@@ -99,6 +105,8 @@ def try_all(trial, mutants, equivalents, report, source_of, jobs):
 
     def judge(mutant):
         outcome, detail = trial.judge(mutant)
+        if journal:
+            journal.note(mutant, outcome, detail)
         report.add(mutant, outcome, detail, mutant.diff(source_of(mutant)))
     # The first failure, or Ctrl-C, ends the rest.
     with concurrent.futures.ThreadPoolExecutor(jobs) as pool:
@@ -132,7 +140,10 @@ def run(options, make_area, listed):
         if options.list:
             list_mutants(mutants, equivalents, source_of)
             continue
-        met = try_area(area, mutants, equivalents, source_of) and met
+        with contextlib.ExitStack() as stack:
+            journal = options.resume and stack.enter_context(
+                contextlib.closing(Journal(options.resume, source_of)))
+            met = try_area(area, mutants, equivalents, journal, source_of) and met
     return 0 if met else 1
 
 
@@ -148,12 +159,12 @@ def alone_in(folder):
         yield
 
 
-def try_area(area, mutants, equivalents, source_of):
+def try_area(area, mutants, equivalents, journal, source_of):
     report, started = Report(len(mutants)), time.monotonic()
     say(f"{area.name}: {len(mutants)} mutants, {area.jobs} at a time")
     try:
         with alone_in(area.work), area.trial() as trial:
-            try_all(trial, mutants, equivalents, report, source_of, area.jobs)
+            try_all(trial, mutants, equivalents, journal, report, source_of, area.jobs)
     finally:
         # Also of what an interrupted run has found.
         if report.results:

@@ -18,6 +18,8 @@ import processes
 import reach
 from mutant import Failed, Mutant, numbered
 
+FINDERS = ("cpp.py", "mutant.py", "operators.py", "swaps.py")
+
 # No time is spent on what a mutant is not asked for.
 LEAN = ["-O1", "-g0", "-w"]
 
@@ -90,11 +92,11 @@ class NativeArea:
         return found
 
     def _digest(self, unit):
-        """Of what the mutants depend on: the unit's words, its own files and this tool."""
+        """Of what the mutants depend on: the unit's words, its own files and their finders."""
         own = sorted(file for file, units in self._users.items() if unit in units)
         digest = hashlib.sha256(shlex.join(unit.command).encode())
         for path in [*(self.root / file for file in own),
-                     *sorted(pathlib.Path(__file__).parent.glob("*.py"))]:
+                     *(pathlib.Path(__file__).with_name(name) for name in FINDERS)]:
             digest.update(path.read_bytes())
         return digest.hexdigest()
 
@@ -174,7 +176,7 @@ class Workshop:
             units = self.area.users(mutant.file)
             if not all(self.compile(unit, LEAN) for unit in units):
                 return None
-            return self.link(units, [])
+            return self.link(units, ["-Wl,--strip-debug"])
         finally:
             path.write_bytes(original)
 

@@ -50,7 +50,7 @@ def returned(expression, kind):
         if NAMED.match(bare):
             return [f"({expression}) + 1"]  # it may be 0
         return [] if NUMBER.match(bare) else ["0"]
-    return [] if bare == "{}" else ["{}"]
+    return [] if bare in ("{}", "nullptr") else ["{}"]
 
 
 def keeping_lines(text, becomes):

@@ -15,6 +15,7 @@ CONTROL = {Kind.IF_STMT, Kind.FOR_STMT, Kind.WHILE_STMT, Kind.DO_STMT, Kind.SWIT
            Kind.CXX_FOR_RANGE_STMT, Kind.COMPOUND_STMT, Kind.CXX_TRY_STMT}
 LABELS = {Kind.CASE_STMT, Kind.DEFAULT_STMT, Kind.LABEL_STMT}
 NAME = re.compile(r"[A-Za-z_]\w*")
+PLAIN = re.compile(r"^[^(){}=]*[\w>&*\s]\s*;$")
 
 
 class Statement:
@@ -42,8 +43,14 @@ class Statement:
     def is_expression(self):
         return self.is_macro or self.cursor.kind.is_expression()
 
+    def is_plain_declaration(self):
+        """Of a variable that is made of nothing: what stands around it is not seen by it."""
+        return self.is_declaration() and PLAIN.search(self.text) is not None
+
     def has_effect(self):
         """A call, or a way out."""
+        if self.is_plain_declaration():
+            return False
         return self.is_macro or any(c.kind in EFFECTS for c in self.cursor.walk_preorder())
 
     def names(self):

@@ -55,8 +55,7 @@ def parse(arguments):
     parser.add_argument("--batch", metavar="N", type=positive, default=10,
                         help="cycles between two checkpoints (default: 10)")
     parser.add_argument("--limit", metavar="SECONDS", type=positive, default=150,
-                        help="after which an action hangs (default: 150, as a player tries a server that"
-                             " has fallen silent for more than 90)")
+                        help="after which an action hangs (default: 150)")
     parser.add_argument("--plant", metavar="FAULT,...", type=plants,
                         help="faults of this command's own, to see it fail: " + ", ".join(PLANTS))
     return parser.parse_args(arguments)
