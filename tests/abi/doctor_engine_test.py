@@ -81,6 +81,14 @@ class DoctorEngineTest(unittest.TestCase):
         self.refused(text, "not an ELF library")
         self.refused(self.folder, "Is a directory")
 
+    def test_a_library_of_another_architecture_is_refused(self):
+        other = self.folder / "aarch64.so"
+        whole = bytearray(pathlib.Path(WHOLE).read_bytes())
+        whole[18:20] = (183).to_bytes(2, "little")  # e_machine
+        other.write_bytes(whole)
+        self.refused(other, "is for AArch64, while the product is for 32-bit ARM, "
+                            "and for x86-64 on a desk")
+
     def test_a_cut_library_is_refused(self):
         whole = pathlib.Path(WHOLE).read_bytes()
         for length in (20, 100, len(whole) // 2, len(whole) - 100):

@@ -6,6 +6,7 @@ import subprocess
 import sys
 
 from elftools.common.exceptions import ELFError
+from elftools.elf.descriptions import describe_e_machine
 from elftools.elf.elffile import ELFFile
 from elftools.elf.enums import ENUM_RELOC_TYPE_ARM, ENUM_RELOC_TYPE_x64
 from elftools.elf.relocation import RelocationSection
@@ -49,7 +50,8 @@ class Library:
         except ELFError:
             raise Refusal(f"{path}: not an ELF library") from None
         if machine not in ARCHITECTURES:
-            raise Refusal(f"{path}: neither for x86-64 nor for 32-bit ARM ({machine})")
+            raise Refusal(f"{path}: is for {describe_e_machine(machine)}, while the product "
+                          "is for 32-bit ARM, and for x86-64 on a desk")
         self.path = path
         self.architecture, reloc_types = ARCHITECTURES[machine]
         self.word = self.elf.elfclass // 8

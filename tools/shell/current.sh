@@ -8,7 +8,7 @@ readonly CURRENT_STAMP=$ORV_BUILD/player-is-current
 # What the player is made from.
 readonly PLAYER_SOURCES=(CMakeLists.txt apps cmake engine frameworks java platform tools)
 # What it is started with, besides the class archive.
-readonly PLAYER_PARTS=(lib/lib{mediaplayer_orv,orv_platform,orvtarn}.so java/{orv_player,picocli,gson}.jar)
+readonly PLAYER_PARTS=(lib/lib{mediaplayer_orv,orv_platform,orvtarn}.so java/{orv_player,picocli,gson,jna}.jar)
 
 # What decides which JDK is used, before one is chosen.
 JAVA_CHOICE="${JAVA_HOME:-}|$(command -v javac || true)"

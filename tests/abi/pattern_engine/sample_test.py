@@ -44,6 +44,9 @@ class SampleTest(unittest.TestCase):
             include = folder / "prefix/include"
             shutil.copytree(environment.SOURCE / "engine/include", include)
             shutil.copytree(environment.SOURCE / "platform/include", include, dirs_exist_ok=True)
+            (include / "stream").mkdir()
+            shutil.copy(environment.PRODUCT_SOURCE / "stream/IOrvStreamSource.h",
+                        include / "stream")
             (folder / "prefix/lib").mkdir()
             shutil.copy(PLATFORM, folder / "prefix/lib/liborv_platform.so")
             shutil.copytree(SAMPLE, folder / "sample")
