@@ -22,6 +22,13 @@ function(orv_install_manuals player)
     list(APPEND manuals ${folder}/man/orv-${command}.1)
   endforeach()
 
+  set(more_completion)
+  if(TARGET orv_trace)
+    orv_manual(orv-trace $<TARGET_FILE:orv_trace> "how long the native methods of a player took, from a log")
+    list(APPEND manuals ${folder}/man/orv-trace.1)
+    set(more_completion ${from}/trace-completion.bash)
+  endif()
+
   set(completion ${folder}/completion/orv)
   add_custom_command(OUTPUT ${completion}
     COMMAND ${CMAKE_COMMAND} -E make_directory ${folder}/completion/classes
@@ -30,8 +37,8 @@ function(orv_install_manuals player)
       ${from}/java/Completion.java
     COMMAND ${Java_JAVA_EXECUTABLE}
       -cp ${PROJECT_BINARY_DIR}/java/orv_player.jar:${folder}/completion/classes
-      com.quintora.orv.player.Completion ${completion}
-    DEPENDS ${player} ${PROJECT_BINARY_DIR}/java/orv_player.jar ${from}/java/Completion.java)
+      com.quintora.orv.player.Completion ${completion} ${more_completion}
+    DEPENDS ${player} ${PROJECT_BINARY_DIR}/java/orv_player.jar ${from}/java/Completion.java ${more_completion})
 
   add_custom_target(orv_manuals ALL DEPENDS ${manuals} ${completion})
   install(FILES ${manuals} DESTINATION ${CMAKE_INSTALL_MANDIR}/man1 COMPONENT player)

@@ -92,6 +92,13 @@ std::string useStream(JavaInputStream& stream) {
     return results.str();
 }
 
+std::string textOf(JNIEnv* env, jstring text) {
+    const char* chars = env->GetStringUTFChars(text, nullptr);
+    std::string copy = chars;
+    env->ReleaseStringUTFChars(text, chars);
+    return copy;
+}
+
 }  // namespace
 
 #define HALF_METHOD(type, name) \
@@ -101,6 +108,20 @@ HALF_METHOD(void, script)(JNIEnv*, jclass, jint tracks) {
     ScriptedEngine& engine = *ScriptedEngine::last();
     scriptTracks(engine, tracks);
     scriptPictures(engine);
+}
+
+HALF_METHOD(void, answer)(JNIEnv* env, jclass, jstring operation, jint result) {
+    ScriptedEngine::last()->answer(textOf(env, operation), {result});
+}
+
+HALF_METHOD(void, answerWhenMade)(JNIEnv* env, jclass, jstring operation, jint result) {
+    if (operation == nullptr) {
+        ScriptedEngine::whenMade(nullptr);
+        return;
+    }
+    ScriptedEngine::whenMade([name = textOf(env, operation), result](ScriptedEngine& engine) {
+        engine.answer(name, {result});
+    });
 }
 
 // Without an answer the service refuses, as it does with every engine.

@@ -2,7 +2,7 @@
 package com.quintora.mmp;
 
 /** The script of the engine in the native half that tests named after this class load. */
-final class ScriptedHalf {
+public final class ScriptedHalf {
     private ScriptedHalf() {}
 
     /** Lets the engine of the newest player answer with that many tracks of each kind. */
@@ -12,7 +12,13 @@ final class ScriptedHalf {
     static native void answerDivx(boolean answer);
 
     /** The calls that the engine of the newest player was given since, a line each. */
-    static native String takeCalls();
+    public static native String takeCalls();
+
+    /** Lets an operation of the newest player's engine have that result from now on. */
+    public static native void answer(String operation, int result);
+
+    /** The same of each engine that is made from now on; without an operation none. */
+    public static native void answerWhenMade(String operation, int result);
 
     /** How many engine players there are. */
     static native int livePlayers();

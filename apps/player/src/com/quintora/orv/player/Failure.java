@@ -29,7 +29,7 @@ public final class Failure extends Exception {
     }
 
     /** A file that cannot be written. */
-    static Failure writing(Path file, IOException cause) {
+    public static Failure writing(Path file, IOException cause) {
         String reason = cause.getMessage();
         if (cause instanceof NoSuchFileException) {
             reason = "its folder does not exist";

@@ -1,6 +1,7 @@
 // SPDX-License-Identifier: Apache-2.0
 package com.quintora.orv.player;
 
+import android.view.Surface;
 import com.quintora.mmp.desktop.DesktopSurfaceView;
 import com.quintora.mmp.desktop.FrameReader;
 import com.quintora.mmp.desktop.VideoFrame;
@@ -39,6 +40,11 @@ final class FramePump implements AutoCloseable {
         Thread watcher = new Thread(() -> countFramesOf(watched), "window frames");
         watcher.setDaemon(true);
         watcher.start();
+    }
+
+    /** What the player draws on. */
+    Surface surface() {
+        return view == null ? reader.getSurface() : view.getHolder().getSurface();
     }
 
     FrameCount count() {

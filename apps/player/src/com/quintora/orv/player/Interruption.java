@@ -9,13 +9,13 @@ public final class Interruption implements AutoCloseable {
     private final Thread hook;
     private volatile boolean happened;
 
-    /** The last words come after the session is closed. */
-    public Interruption(Session session, Runnable lastWords) {
+    /** The end releases what plays; the last words come after it. */
+    public Interruption(Runnable end, Runnable lastWords) {
         hook =
                 new Thread(
                         () -> {
                             happened = true;
-                            session.close();
+                            end.run();
                             lastWords.run();
                         },
                         "interruption");

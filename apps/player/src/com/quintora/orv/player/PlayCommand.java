@@ -2,8 +2,7 @@
 package com.quintora.orv.player;
 
 import com.quintora.mmp.TrickPlay;
-import com.quintora.orv.player.terminal.Terminal;
-import com.quintora.orv.player.terminal.TerminalScreen;
+import com.quintora.orv.player.playlist.Entry;
 import com.quintora.orv.player.window.PlayerWindow;
 import java.util.List;
 import java.util.concurrent.Callable;
@@ -34,14 +33,17 @@ final class PlayCommand implements Callable<Integer> {
     @Override
     public Integer call() throws Failure, InterruptedException {
         check();
-        if (options.source == null) {
-            options.source = Sample.path();
+        if (options.sources.isEmpty()) {
+            options.sources = List.of(Sample.path());
         }
-        return options.noWindow || !hasDisplay() ? playInTerminal() : PlayerWindow.play(options);
+        return options.noWindow || !hasDisplay()
+                ? new TerminalPlayer(options).play()
+                : PlayerWindow.play(options);
     }
 
     private void check() {
-        require(options.volume >= 0 && options.volume <= 100, "--volume is 0 to 100");
+        int volume = options.volume().orElse(100);
+        require(volume >= 0 && volume <= 100, "--volume is 0 to 100");
         double speed = Math.abs(options.speed);
         require(
                 speed >= PlayOptions.MIN_SPEED && speed <= TrickPlay.MAX_SPEED,
@@ -53,49 +55,16 @@ final class PlayCommand implements Callable<Integer> {
                 options.section == null || options.start == 0,
                 "--ab begins at the section's start; leave --start out");
         require(
-                options.pcm == null || options.source != null,
+                options.pcm == null || !options.sources.isEmpty(),
                 "--pcm describes a file of raw PCM; name the file");
-        require(!options.stream || !isUrl(options.source), "--stream reads a file, not a URL");
+        require(
+                !options.stream || options.sources.stream().noneMatch(Entry::isUrl),
+                "--stream reads a file, not a URL");
     }
 
     private void require(boolean met, String sentence) {
         if (!met) {
             throw new ParameterException(command.commandLine(), sentence);
-        }
-    }
-
-    private static boolean isUrl(String source) {
-        return source != null && source.contains("://");
-    }
-
-    private int playInTerminal() throws Failure, InterruptedException {
-        Terminal terminal = Terminal.standard();
-        try (Session session = new Session(options, image -> {});
-                Interruption interruption = new Interruption(session, terminal::close)) {
-            try {
-                playInTerminal(session, terminal);
-                return 0;
-            } catch (Failure | IllegalStateException e) {
-                if (interruption.happened()) {
-                    return Interruption.EXIT_STATUS;
-                }
-                throw e;
-            }
-        } finally {
-            terminal.restore();
-        }
-    }
-
-    private void playInTerminal(Session session, Terminal terminal)
-            throws Failure, InterruptedException {
-        session.open();
-        session.start();
-        new TerminalScreen(terminal).follow(session::snapshot, session.ended());
-        if (session.failure() != null) {
-            throw session.failure();
-        }
-        if (options.stats) {
-            terminal.line(session.report());
         }
     }
 

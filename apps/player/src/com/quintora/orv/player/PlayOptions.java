@@ -2,29 +2,44 @@
 package com.quintora.orv.player;
 
 import com.quintora.mmp.util.PcmMediaInfo;
+import com.quintora.orv.player.desktop.MediaControls;
+import com.quintora.orv.player.memory.Memory;
+import com.quintora.orv.player.playlist.Entry;
+import com.quintora.orv.player.playlist.EntryFinder;
+import com.quintora.orv.player.playlist.Playlist;
+import com.quintora.orv.player.playlist.Repeat;
 import java.nio.file.Path;
+import java.util.List;
+import java.util.Optional;
+import java.util.OptionalInt;
+import java.util.stream.Stream;
 import picocli.CommandLine;
 
 /** What and how to play. Track numbers count from 0, times are kept in milliseconds. */
-public final class PlayOptions {
+public final class PlayOptions implements Cloneable {
     /** The slowest speed, forward and backward. */
     static final double MIN_SPEED = 0.25;
 
-    String source;
+    List<String> sources = List.of();
+    String source; // Of one playback.
     String subtitle;
     Integer audioTrack;
     Integer subtitleTrack;
     double speed;
     int start;
     boolean loop;
+    boolean shuffle;
     Section section;
     boolean stream;
     PcmMediaInfo pcm;
-    int volume;
+    Integer volume;
     boolean noWindow;
+    boolean noMemory;
+    Path memoryFile;
     boolean noGpu;
     boolean gpu;
     boolean stats;
+    Path screenshotFolder;
 
     /** Those that these arguments of play give, which are not checked further. */
     public static PlayOptions of(String... words) {
@@ -35,16 +50,46 @@ public final class PlayOptions {
         return options;
     }
 
+    /**
+     * Those of one of the media. Where to begin, the section and the subtitle file are of the first
+     * alone.
+     *
+     * @param loops whether it begins again at its end
+     * @param volume 0 to 100
+     */
+    public PlayOptions forEntry(Entry entry, boolean isFirst, boolean loops, int volume) {
+        PlayOptions copy = copy();
+        copy.source = entry.source();
+        copy.loop = loops;
+        copy.volume = volume;
+        if (!isFirst) {
+            copy.start = 0;
+            copy.section = null;
+            copy.subtitle = null;
+        }
+        return copy;
+    }
+
+    private PlayOptions copy() {
+        try {
+            return (PlayOptions) clone();
+        } catch (CloneNotSupportedException e) {
+            throw new AssertionError(e);
+        }
+    }
+
     /** Describes the arguments whose values go here. */
     void addTo(Arguments arguments) {
         arguments.add(
-                Arguments.parameter(0, String.class, value -> source = value)
-                        .arity("0..1")
+                Arguments.parameter(0, String[].class, this::addSources)
+                        .index("0..*")
+                        .arity("0..*")
                         .required(false)
-                        .paramLabel("FILE|URL")
+                        .paramLabel("FILE|FOLDER|URL")
                         .description(
-                                "What to play, - for standard input; without it, a sample that is"
-                                        + " made on the spot.")
+                                "What to play: media, folders of them, playlists (M3U, PLS); - for"
+                                        + " standard input; without it, a sample that is made on"
+                                        + " the spot.")
                         .build());
         addChoices(arguments);
         addPace(arguments);
@@ -57,6 +102,7 @@ public final class PlayOptions {
                         .description("The file is raw PCM, as in 44100:2:s16le.")
                         .build());
         arguments.addFlag("--no-window", value -> noWindow = value, "Play in the terminal.");
+        addMemory(arguments);
         arguments.addFlag(
                 "--no-gpu",
                 value -> noGpu = value,
@@ -67,6 +113,35 @@ public final class PlayOptions {
                 "--stats",
                 value -> stats = value,
                 "Print afterwards how quickly and how smoothly it played.");
+        arguments.add(
+                Arguments.option(
+                                "--screenshot-folder", Path.class,
+                                value -> screenshotFolder = value)
+                        .paramLabel("DIR")
+                        .description(
+                                "Where the window's screenshots go; without it, the user's folder"
+                                        + " for pictures.")
+                        .build());
+    }
+
+    private void addMemory(Arguments arguments) {
+        arguments.addFlag(
+                "--no-memory",
+                value -> noMemory = value,
+                "Remember nothing: no volume, no place, no recent files.");
+        arguments.add(
+                Arguments.option("--memory", Path.class, value -> memoryFile = value)
+                        .paramLabel("FILE")
+                        .description(
+                                "Where the window remembers it, instead of orv/player.conf in the"
+                                        + " user's configuration folder.")
+                        .build());
+    }
+
+    // Those before an option come apart from those behind it.
+    private void addSources(String... words) {
+        sources = Stream.concat(sources.stream(), Stream.of(words)).toList();
+        source = sources.isEmpty() ? null : sources.get(0);
     }
 
     private void addChoices(Arguments arguments) {
@@ -88,10 +163,9 @@ public final class PlayOptions {
                         .description("Show subtitle track N, counted from 0; -1 for none.")
                         .build());
         arguments.add(
-                Arguments.option("--volume", int.class, value -> volume = value)
+                Arguments.option("--volume", Integer.class, value -> volume = value)
                         .paramLabel("PERCENT")
-                        .defaultValue("100")
-                        .description("0 to 100.")
+                        .description("0 to 100; 100 unless the window remembers another.")
                         .build());
     }
 
@@ -111,7 +185,10 @@ public final class PlayOptions {
                         .converters(Times::parseMillis)
                         .description("Begin there: seconds, or h:mm:ss.")
                         .build());
-        arguments.addFlag("--loop", value -> loop = value, "Begin again at the end.");
+        arguments.addFlag(
+                "--loop", value -> loop = value, "Begin again at the end, of the last of several.");
+        arguments.addFlag(
+                "--shuffle", value -> shuffle = value, "Play several in an order of chance.");
         arguments.add(
                 Arguments.option("--ab", Section.class, value -> section = value)
                         .paramLabel("A:B")
@@ -120,17 +197,46 @@ public final class PlayOptions {
                         .build());
     }
 
-    /** What stands in a window's title bar: the file's name, or the whole URL. */
-    public String title() {
-        if (StandardInput.isNamed(source)) {
-            return "standard input";
+    /** What is kept from one start of the window to the next. */
+    public Memory memory() {
+        if (noMemory) {
+            return Memory.none();
         }
-        return source.contains("://") ? source : String.valueOf(Path.of(source).getFileName());
+        return memoryFile == null ? Memory.ofUser() : Memory.in(memoryFile.toAbsolutePath());
     }
 
-    /** 0 to 100. */
-    public int volume() {
-        return volume;
+    /** The address of the desktop's message bus, if there is one. */
+    public Optional<String> bus() {
+        String named = System.getProperty("orv.bus");
+        return named == null ? MediaControls.busOfUser() : Optional.of(named);
+    }
+
+    /** Whether they say where to begin. */
+    public boolean nameAPlace() {
+        return start > 0 || section != null || speed < 0;
+    }
+
+    /** What was named to be played. */
+    public List<String> sources() {
+        return sources;
+    }
+
+    /**
+     * The media that they name. Blocks while folders and playlists are read.
+     *
+     * @throws Failure for those without media
+     */
+    public Playlist playlist() throws Failure {
+        Playlist list = new Playlist();
+        list.setRepeat(loop ? Repeat.ALL : Repeat.OFF);
+        list.setShuffled(shuffle);
+        list.set(EntryFinder.find(sources));
+        return list;
+    }
+
+    /** 0 to 100, if it was asked for. */
+    public OptionalInt volume() {
+        return volume == null ? OptionalInt.empty() : OptionalInt.of(volume);
     }
 
     /** When the graphics processor draws the pictures; the last word is --no-gpu's. */
@@ -139,6 +245,11 @@ public final class PlayOptions {
             return GpuUse.NEVER;
         }
         return gpu ? GpuUse.ALWAYS : GpuUse.USUAL;
+    }
+
+    /** Where the pictures of this media go that the user keeps. */
+    public Screenshots screenshots() {
+        return new Screenshots(screenshotFolder, source);
     }
 
     public boolean reportsStats() {

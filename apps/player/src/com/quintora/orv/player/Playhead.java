@@ -15,6 +15,11 @@ final class Playhead {
     private static final Set<PlayerState> RESTING =
             EnumSet.of(PlayerState.PREPARED, PlayerState.PAUSED, PlayerState.COMPLETED);
 
+    /** What happens while the frames are hidden. */
+    interface Hidden<T> {
+        T run() throws Failure;
+    }
+
     private final OrvMediaPlayer player;
     private final FramePump frames;
     private final Object moves = new Object();
@@ -82,6 +87,19 @@ final class Playhead {
                     rest();
                     player.trickPlay().stepAndWait(count);
                 });
+    }
+
+    /** Runs what makes the player draw what is not to be seen; blocks. */
+    <T> T keepPicture(Hidden<T> task) throws Failure {
+        synchronized (moves) {
+            frames.hide(true);
+            try {
+                return task.run();
+            } finally {
+                frames.count().expectJump();
+                frames.hide(false);
+            }
+        }
     }
 
     private synchronized void rest() {

@@ -42,7 +42,8 @@ public final class Rehearsal {
         run("play", "--help");
         run("play", "--no-window", "--stats", media);
         if (PlayCommand.hasDisplay()) {
-            PlayerWindow.rehearse(PlayOptions.of(media));
+            String memory = makeMemory(folder.resolve("rehearsal.conf"), media).toString();
+            PlayerWindow.rehearse(PlayOptions.of("--memory", memory, media));
         }
         System.exit(0);
     }
@@ -68,6 +69,11 @@ public final class Rehearsal {
         var sound = new AudioInputStream(silence, format, SAMPLE_RATE / format.getFrameSize());
         AudioSystem.write(sound, AudioFileFormat.Type.WAVE, path.toFile());
         return path;
+    }
+
+    private static Path makeMemory(Path path, String media) throws IOException {
+        String text = "volume = 100\nwindow = 40 30 640x480\nrecent.01.source = " + media + "\n";
+        return Files.writeString(path, text);
     }
 
     private static void write(OutputStream out, String text) throws IOException {

@@ -4,7 +4,7 @@ package com.quintora.orv.player;
 import picocli.CommandLine.TypeConversionException;
 
 /** A section to repeat, in milliseconds: written A-B or, with plain seconds, A:B. */
-record Section(int from, int to) {
+public record Section(int from, int to) {
     static Section parse(String text) {
         int cut = text.indexOf('-') > 0 ? text.indexOf('-') : text.indexOf(':');
         boolean isOfSeconds = text.indexOf('-') < 0;

@@ -8,10 +8,14 @@ import com.quintora.mmp.MediaPlayer;
 import com.quintora.mmp.OrvMediaPlayer;
 import com.quintora.mmp.PlayerListener;
 import com.quintora.mmp.PlayerRole;
+import com.quintora.mmp.SubtitleTrack;
 import com.quintora.mmp.Track;
 import com.quintora.mmp.VideoTrack;
 import com.quintora.mmp.desktop.DesktopSurfaceView;
 import com.quintora.mmp.desktop.VideoFrame;
+import com.quintora.orv.player.playlist.Entry;
+import java.awt.image.BufferedImage;
+import com.quintora.orv.player.subtitles.SubtitleLook;
 import java.io.IOException;
 import java.nio.file.AccessDeniedException;
 import java.nio.file.Files;
@@ -19,7 +23,9 @@ import java.nio.file.NoSuchFileException;
 import java.nio.file.Path;
 import java.util.List;
 import java.util.Locale;
+import java.util.Optional;
 import java.util.concurrent.CountDownLatch;
+import java.util.function.BiConsumer;
 import java.util.function.Consumer;
 
 /**
@@ -33,6 +39,9 @@ public final class Session implements AutoCloseable {
     private final Playhead playhead;
     private final CountDownLatch ended = new CountDownLatch(1);
     private final Stopwatch stopwatch = new Stopwatch();
+    private volatile SectionRepeater repeater; // Of the section that the options name.
+    private final Facts facts;
+    private SubtitleLook look = SubtitleLook.USUAL;
     private volatile double frameRate;
     private volatile boolean isOnView;
     private volatile Failure failure;
@@ -42,6 +51,7 @@ public final class Session implements AutoCloseable {
         this.options = options;
         frames = new FramePump(screen);
         playhead = new Playhead(player, frames);
+        facts = new Facts(options.source, player);
         player.addListener(new Ending());
     }
 
@@ -116,7 +126,8 @@ public final class Session implements AutoCloseable {
 
     public void start() {
         if (options.section != null) {
-            new SectionRepeater(player, options.section).start();
+            repeater = new SectionRepeater(player, options.section);
+            repeater.start();
         }
         frames.count().expectJump();
         stopwatch.start(player.getCurrentPosition());
@@ -159,6 +170,107 @@ public final class Session implements AutoCloseable {
         }
     }
 
+    /**
+     * The picture that shows, at the video's own size; what is seen stays as it is meanwhile.
+     * Blocks.
+     *
+     * @param withSubtitles whether those that show are in it
+     */
+    public Still still(boolean withSubtitles) throws Failure {
+        if (player.getVideoWidth() == 0) {
+            throw new Failure("the media has no picture to keep");
+        }
+        Size size = ShownPicture.sizeOf(player);
+        Optional<SubtitleTrack> hidden =
+                withSubtitles ? Optional.empty() : player.tracks().currentSubtitle();
+        return playhead.keepPicture(
+                () -> {
+                    hidden.ifPresent(
+                            track -> player.tracks().selectNoneAndWait(Track.Kind.SUBTITLE));
+                    try {
+                        return FrameGrabber.take(player, size, frames.surface());
+                    } finally {
+                        hidden.ifPresent(player.tracks()::selectAndWait);
+                    }
+                });
+    }
+
+    /** The section that the options have it repeat. */
+    public Optional<Section> section() {
+        return Optional.ofNullable(options.section);
+    }
+
+    /**
+     * Begins a section to repeat at the present position; the one before ends.
+     *
+     * @return that position, in milliseconds
+     */
+    public int repeatFromHere() throws Failure {
+        endRepeater();
+        int position = player.getCurrentPosition();
+        if (!player.trickPlay().repeatFromHere()) {
+            throw new Failure("no section of this media can be repeated");
+        }
+        return position;
+    }
+
+    /**
+     * Ends the section at the present position: it repeats from now on.
+     *
+     * @return that position, in milliseconds
+     */
+    public int repeatUntilHere() throws Failure {
+        int position = player.getCurrentPosition();
+        if (!player.trickPlay().repeatUntilHere()) {
+            throw new Failure("a section ends after its beginning, which is to be marked first");
+        }
+        return position;
+    }
+
+    public void repeatNothing() {
+        endRepeater();
+        player.trickPlay().repeatOff();
+    }
+
+    private void endRepeater() {
+        if (repeater != null) {
+            repeater.interrupt();
+        }
+    }
+
+    /**
+     * Makes small pictures of its media beside it, once it is open, from when they are asked for.
+     * Empty for media without a picture or an end, and for what is no file.
+     *
+     * @param onPicture is called with each picture and the part that it is of, on a thread of their
+     *     own
+     */
+    public Optional<Previews> previews(BiConsumer<Integer, BufferedImage> onPicture) {
+        boolean isPossible =
+                player.getVideoWidth() > 0
+                        && player.getDuration() > 0
+                        && player.trickPlay().canSeekAt(1)
+                        && isFile();
+        return isPossible
+                ? Optional.of(
+                        new Previews(
+                                options.source,
+                                player.getDuration(),
+                                ShownPicture.sizeOf(player),
+                                onPicture))
+                : Optional.empty();
+    }
+
+    private boolean isFile() {
+        boolean isPath = !options.stream && options.pcm == null && !Entry.isUrl(options.source);
+        return isPath && Files.isRegularFile(Path.of(options.source));
+    }
+
+    /** Where pictures of its media go that the user keeps. */
+    public Screenshots screenshots() {
+        return options.screenshots();
+    }
+
     public void setSpeed(double speed) throws Failure {
         try {
             // At other speeds frames are left out on purpose.
@@ -168,6 +280,11 @@ public final class Session implements AutoCloseable {
         } catch (IllegalArgumentException e) {
             throw new Failure(e.getMessage(), e);
         }
+    }
+
+    /** Whether the media begins again at its end, which is none then. */
+    public void setLooping(boolean loops) {
+        player.setLooping(loops);
     }
 
     /** From 0 to 1. */
@@ -211,6 +328,12 @@ public final class Session implements AutoCloseable {
         }
     }
 
+    /** Shows subtitles in that way from the next picture on. */
+    public synchronized void showSubtitlesAs(SubtitleLook wanted) {
+        wanted.changesFrom(look).ifPresent(player.subtitles()::setStyle);
+        look = wanted;
+    }
+
     public Snapshot snapshot() {
         return new Snapshot(
                 player.getCurrentPosition(),
@@ -220,6 +343,16 @@ public final class Session implements AutoCloseable {
                 player.getBufferedPercent(),
                 frames.count().shown(),
                 frames.count().dropped());
+    }
+
+    /** All that is known of the media and its playback; the drawing is in words. Blocks. */
+    public List<Fact> facts(String drawing) {
+        return facts.read(snapshot(), drawing);
+    }
+
+    /** Unlocks media that parents locked; whether that was the PIN. */
+    public boolean unlock(int pin) {
+        return player.engine().unlock(pin);
     }
 
     /** Reaches zero when the media has come to its end or has failed. */
@@ -297,10 +430,11 @@ public final class Session implements AutoCloseable {
 
     private void applyOptions() throws Failure {
         if (options.loop) {
-            player.setLooping(true);
+            setLooping(true);
         }
-        if (options.volume != 100) {
-            setVolume(options.volume / 100.0);
+        int volume = options.volume().orElse(100);
+        if (volume != 100) {
+            setVolume(volume / 100.0);
         }
         if (options.audioTrack != null) {
             selectAudio(options.audioTrack);

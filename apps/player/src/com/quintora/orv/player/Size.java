@@ -1,6 +1,7 @@
 // SPDX-License-Identifier: Apache-2.0
 package com.quintora.orv.player;
 
+import com.quintora.mmp.Pictures;
 import java.util.regex.Matcher;
 import java.util.regex.Pattern;
 import picocli.CommandLine.TypeConversionException;
@@ -19,5 +20,16 @@ record Size(int width, int height) {
             throw new TypeConversionException("a picture of " + text + " has no pixels");
         }
         return size;
+    }
+
+    /** Of the same shape, as near as whole pixels come. */
+    Size withHeight(int rows) {
+        int columns = (int) Math.round((double) rows * width / height);
+        return new Size(Math.max(1, Math.min(Pictures.MAX_THUMBNAIL_WIDTH, columns)), rows);
+    }
+
+    @Override
+    public String toString() {
+        return width + "x" + height;
     }
 }

@@ -7,6 +7,7 @@ import static org.junit.jupiter.api.Assertions.assertTrue;
 
 import com.quintora.mmp.util.PcmMediaInfo;
 import com.quintora.mmp.util.PcmMediaInfo.AudioPcmInfo;
+import java.util.List;
 import org.junit.jupiter.api.Test;
 import org.junit.jupiter.params.ParameterizedTest;
 import org.junit.jupiter.params.provider.CsvSource;
@@ -39,6 +40,15 @@ class ArgumentsTest {
     })
     void clocksShowHoursFromAnHourOn(long millis, String clock) {
         assertEquals(clock, Times.clock(millis));
+    }
+
+    @Test
+    void mediaAreNamedBetweenOptions() {
+        PlayOptions options =
+                PlayOptions.of("a.mkv", "b.mkv", "--loop", "c.mkv", "--volume", "7", "d.mkv");
+        assertEquals(List.of("a.mkv", "b.mkv", "c.mkv", "d.mkv"), options.sources());
+        assertEquals("a.mkv", options.source);
+        assertEquals(List.of(), PlayOptions.of("--loop").sources());
     }
 
     @Test

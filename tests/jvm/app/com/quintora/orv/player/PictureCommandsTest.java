@@ -19,6 +19,7 @@ import org.junit.jupiter.params.provider.CsvSource;
 class PictureCommandsTest {
     // Two scalers and two decoders' rounding lie between the pictures that are compared.
     private static final double ALIKE_DB = 28;
+    private static final double EQUAL_DB = 50;
 
     @TempDir Path folder;
 
@@ -32,8 +33,8 @@ class PictureCommandsTest {
         BufferedImage drawn = ImageIO.read(out.toFile());
         assertEquals(320, drawn.getWidth());
         assertEquals(180, drawn.getHeight());
-        assertTrue(psnr(frame("video.mp4", "4"), drawn) > ALIKE_DB);
-        assertTrue(psnr(frame("video.mp4", "8"), drawn) < ALIKE_DB);
+        assertTrue(Psnr.of(frame("video.mp4", "4"), drawn) > ALIKE_DB);
+        assertTrue(Psnr.of(frame("video.mp4", "8"), drawn) < ALIKE_DB);
     }
 
     @Test
@@ -43,7 +44,7 @@ class PictureCommandsTest {
                 Cli.run("thumbnail", Media.path("video.mp4"), "--at", "5.4", "--size", "320x180",
                         out.toString());
         assertEquals(0, thumbnail.status(), thumbnail.err());
-        assertTrue(psnr(frame("video.mp4", "5.4"), ImageIO.read(out.toFile())) > ALIKE_DB);
+        assertTrue(Psnr.of(frame("video.mp4", "5.4"), ImageIO.read(out.toFile())) > ALIKE_DB);
     }
 
     /** In formats without an index, also past the last key frame; 11 ms are the sound's alone. */
@@ -60,7 +61,7 @@ class PictureCommandsTest {
                         out.toString());
         assertEquals(0, thumbnail.status(), thumbnail.err());
         BufferedImage drawn = ImageIO.read(out.toFile());
-        assertTrue(psnr(decoded(media, frame), drawn) > ALIKE_DB);
+        assertTrue(Psnr.of(decoded(media, frame), drawn) > ALIKE_DB);
     }
 
     @ParameterizedTest
@@ -83,14 +84,56 @@ class PictureCommandsTest {
         assertEquals("320x180", drawn.getWidth() + "x" + drawn.getHeight());
     }
 
+    /** As libavcodec decodes it, pixel by pixel. */
+    @Test
+    void thePictureInTheVideosOwnSizeIsTheFrame() throws Exception {
+        Path out = folder.resolve("out.png");
+        Cli thumbnail =
+                Cli.run("thumbnail", Media.path("hd709.mp4"), "--at", "0.5", "--size", "full",
+                        out.toString());
+        assertEquals(0, thumbnail.status(), thumbnail.err());
+        BufferedImage drawn = ImageIO.read(out.toFile());
+        assertEquals("1280x720", drawn.getWidth() + "x" + drawn.getHeight());
+        assertTrue(Psnr.of(hdFrame("1280x720"), drawn) > EQUAL_DB);
+    }
+
+    @ParameterizedTest
+    @CsvSource({"640x360", "1280x256", "300x700"})
+    void aPictureOfMoreRowsIsTheFrameInThatShape(String size) throws Exception {
+        Path out = folder.resolve("out.png");
+        Cli thumbnail =
+                Cli.run("thumbnail", Media.path("hd709.mp4"), "--at", "0.5", "--size", size,
+                        out.toString());
+        assertEquals(0, thumbnail.status(), thumbnail.err());
+        BufferedImage drawn = ImageIO.read(out.toFile());
+        assertEquals(size, drawn.getWidth() + "x" + drawn.getHeight());
+        assertTrue(Psnr.of(hdFrame(size), drawn) > ALIKE_DB);
+    }
+
+    @ParameterizedTest
+    @CsvSource({
+        "lying90.mp4, 90x160", "lying180.mp4, 160x90", "wide-pixels.mkv, 120x90",
+        "anamorphic.mkv, 192x108"
+    })
+    void inFullSizeItHasTheShapeOfTheDisplay(String media, String size) throws Exception {
+        Path out = folder.resolve("out.png");
+        Cli thumbnail =
+                Cli.run("thumbnail", Media.path(media), "--size", "full", out.toString());
+        assertEquals(0, thumbnail.status(), thumbnail.err());
+        BufferedImage drawn = ImageIO.read(out.toFile());
+        assertEquals(size, drawn.getWidth() + "x" + drawn.getHeight());
+    }
+
     @Test
     void whatCannotBeDrawnIsRefusedInASentence() throws Exception {
         String media = Media.path("video.mp4");
         String out = folder.resolve("out.png").toString();
-        assertRefused(2, "at most 255 rows, not 256",
+        assertRefused(1, "at most as large as the video, which has 320x180",
                 Cli.run("thumbnail", media, "--size", "320x256", out));
-        assertRefused(2, "at most 8192 columns, not 8193",
+        assertRefused(1, "at most as large as the video",
                 Cli.run("thumbnail", media, "--size", "8193x10", out));
+        assertRefused(2, "'huge' is not a size",
+                Cli.run("thumbnail", media, "--size", "huge", out));
         assertRefused(2, "a PNG file", Cli.run("thumbnail", media, folder + "/out.jpg"));
         assertRefused(1, "ends at 0:10", Cli.run("thumbnail", media, "--at", "60", out));
         assertRefused(1, "there is no video", Cli.run("thumbnail", Media.path("tone.mp3"), out));
@@ -128,6 +171,17 @@ class PictureCommandsTest {
         return ImageIO.read(file.toFile());
     }
 
+    /** That of 0.5 s. */
+    private BufferedImage hdFrame(String size) throws Exception {
+        Path file = folder.resolve("hd.png");
+        Media.run("ffmpeg", "-nostdin", "-v", "error", "-y", "-i", Media.path("hd709.mp4"),
+                "-vf",
+                "select=gte(t\\,0.479),scale=in_color_matrix=bt709,format=rgb24,"
+                        + "scale=" + size + ":flags=area",
+                "-frames:v", "1", file.toString());
+        return ImageIO.read(file.toFile());
+    }
+
     /** Without a seek of ffmpeg's, which goes wrong in formats without an index. */
     private BufferedImage decoded(String media, String at) throws Exception {
         Path file = folder.resolve("decoded.png");
@@ -136,19 +190,5 @@ class PictureCommandsTest {
                 "-vf", "select=gte(t\\," + at + "-0.001),scale=320:180",
                 "-frames:v", "1", file.toString());
         return ImageIO.read(file.toFile());
-    }
-
-    private static double psnr(BufferedImage one, BufferedImage other) {
-        double squares = 0;
-        for (int y = 0; y < one.getHeight(); y++) {
-            for (int x = 0; x < one.getWidth(); x++) {
-                for (int shift = 0; shift < 24; shift += 8) {
-                    int difference =
-                            (one.getRGB(x, y) >> shift & 255) - (other.getRGB(x, y) >> shift & 255);
-                    squares += difference * difference;
-                }
-            }
-        }
-        return 10 * Math.log10(255.0 * 255 * 3 * one.getWidth() * one.getHeight() / squares);
     }
 }

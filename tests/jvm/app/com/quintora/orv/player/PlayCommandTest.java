@@ -138,7 +138,6 @@ class PlayCommandTest {
     void whatIsWrongWithArgumentsIsSaidInPlainWords() {
         assertUsage("'x' is not a whole number", "--audio-track", "x", "some.mkv");
         assertUsage("'x' is not a number", "--speed", "x", "some.mkv");
-        assertUsage("orv: too many arguments: b c", "a", "b", "c");
         assertUsage("orv: Unknown option: '--sped'", "--sped");
     }
 
@@ -165,9 +164,7 @@ class PlayCommandTest {
     }
 
     @ParameterizedTest
-    @CsvSource({
-        "/none.mkv, /none.mkv: no such file", "/, /: is a directory", "'', the path is empty"
-    })
+    @CsvSource({"/none.mkv, /none.mkv: no such file", "'', the path is empty"})
     void whatIsNoStreamIsOneSentence(String source, String sentence) {
         Cli run = Cli.run("play", "--no-window", "--stream", source);
         assertEquals(1, run.status());
@@ -176,7 +173,7 @@ class PlayCommandTest {
 
     @Test
     void mediaThatIsDamagedOrMissingIsOneSentence() throws Exception {
-        for (String source : new String[] {"/none.mkv", Media.path("noise.bin"), "/"}) {
+        for (String source : new String[] {"/none.mkv", Media.path("noise.bin")}) {
             Cli run = Cli.run("play", "--no-window", source);
             assertEquals(1, run.status());
             assertEquals(1, run.errLines().size(), run.err());

@@ -20,8 +20,6 @@ final class ChoiceMenu {
     /** A choice: what it says, whether it holds now, what it does. */
     record Choice(String text, boolean chosen, Runnable action) {}
 
-    private static final int TICK = 16;
-
     private ChoiceMenu() {}
 
     static void open(Component above, String title, List<Choice> choices) {
@@ -49,40 +47,23 @@ final class ChoiceMenu {
     }
 
     private static final class Item extends JMenuItem {
-        private final Choice choice;
+        private final boolean isChosen;
 
         Item(Choice choice) {
-            this.choice = choice;
-            // The media's own words are never markup.
-            putClientProperty("html.disable", true);
-            setText(choice.text);
-            setFont(Theme.BODY);
-            setBorder(null);
+            super(choice.text);
+            MenuRow.prepare(this);
+            isChosen = choice.chosen;
             addActionListener(event -> choice.action.run());
         }
 
         @Override
         public Dimension getPreferredSize() {
-            int text = getFontMetrics(getFont()).stringWidth(getText());
-            return new Dimension(Math.max(200, text + 14 + TICK + 10 + 18), 30);
+            return MenuRow.size(this, "");
         }
 
         @Override
         protected void paintComponent(Graphics graphics) {
-            var g = Theme.smooth(graphics);
-            g.setColor(isArmed() ? Theme.HOVER : Theme.RAISED);
-            g.fillRect(0, 0, getWidth(), getHeight());
-            if (choice.chosen) {
-                Glyph.CHECK.paint(g, 14, (getHeight() - TICK) / 2.0, TICK, Theme.ACCENT);
-            }
-            g.setFont(getFont());
-            g.setColor(Theme.TEXT);
-            var metrics = g.getFontMetrics();
-            g.drawString(
-                    getText(),
-                    14 + TICK + 10,
-                    (getHeight() - metrics.getHeight()) / 2 + metrics.getAscent());
-            g.dispose();
+            MenuRow.paint(graphics, this, isArmed(), isChosen, "");
         }
     }
 }

@@ -5,6 +5,8 @@ import com.quintora.orv.player.Snapshot;
 import com.quintora.orv.player.Times;
 import java.awt.BorderLayout;
 import java.awt.Component;
+import java.awt.event.MouseAdapter;
+import java.awt.event.MouseEvent;
 import javax.swing.BorderFactory;
 import javax.swing.Box;
 import javax.swing.JLabel;
@@ -19,8 +21,12 @@ final class ControlBar extends JPanel {
 
     private final JLabel elapsed = label(Times.clock(0));
     private final JLabel total = label(Times.length(0));
+    private Snapshot shown;
+    private boolean remaining;
     private final SeekBar seekBar;
     private final FlatButton play;
+    private final FlatButton previous;
+    private final FlatButton next;
     private final FlatButton back;
     private final FlatButton forward;
     private final FlatButton mute;
@@ -28,6 +34,8 @@ final class ControlBar extends JPanel {
     private final FlatButton speed;
     private final FlatButton audio;
     private final FlatButton subtitles;
+    private final FlatButton list;
+    private final FlatButton menu;
     private final FlatButton help;
     private final FlatButton fullScreen;
 
@@ -35,6 +43,8 @@ final class ControlBar extends JPanel {
         super(new BorderLayout(0, 4));
         seekBar = new SeekBar(controls::seekTo, step -> controls.skip(step * SKIP_MS));
         play = new FlatButton(Glyph.PLAY, "Play (Space)", controls::togglePlaying);
+        previous = new FlatButton(Glyph.PREVIOUS, "Previous one (P)", controls::previous);
+        next = new FlatButton(Glyph.NEXT, "Next one (N)", controls::next);
         back =
                 new FlatButton(
                         Glyph.BACK, "Back 10 seconds (Left)", () -> controls.skip(-SKIP_MS));
@@ -63,9 +73,19 @@ final class ControlBar extends JPanel {
         fullScreen =
                 new FlatButton(
                         Glyph.FULL_SCREEN, "Full screen (F)", controls::toggleFullScreen);
+        list = new FlatButton(Glyph.LIST, "Playlist (L)", controls::toggleList);
+        menu = new FlatButton(Glyph.MENU, "Menu (F10)", controls::openMenu);
         help = new FlatButton(null, "Keyboard shortcuts (H)", controls::toggleHelp);
         help.setText("?");
         speed.setText(Speeds.label(1));
+        total.setToolTipText("Length");
+        total.addMouseListener(
+                new MouseAdapter() {
+                    @Override
+                    public void mousePressed(MouseEvent event) {
+                        toggleRemaining();
+                    }
+                });
         setBackground(Theme.PANEL);
         setBorder(BorderFactory.createEmptyBorder(8, 14, 10, 14));
         add(timeRow(), BorderLayout.NORTH);
@@ -80,6 +100,14 @@ final class ControlBar extends JPanel {
         return subtitles;
     }
 
+    Component listButton() {
+        return list;
+    }
+
+    Component menuButton() {
+        return menu;
+    }
+
     Component speedButton() {
         return speed;
     }
@@ -90,12 +118,32 @@ final class ControlBar extends JPanel {
 
     void show(Snapshot now) {
         elapsed.setText(Times.clock(now.positionMs()));
-        total.setText(Times.length(now.durationMs()));
+        shown = now;
+        showTotal();
         seekBar.showPosition(now.positionMs(), now.durationMs(), now.bufferedPercent());
         play.show(
                 now.playing() ? Glyph.PAUSE : Glyph.PLAY,
                 now.playing() ? "Pause (Space)" : "Play (Space)");
         speed.setText(Speeds.label(now.speed()));
+    }
+
+    private void showTotal() {
+        int length = shown == null ? 0 : shown.durationMs();
+        total.setText(
+                remaining && length > 0
+                        ? "−" + Times.clock(length - shown.positionMs())
+                        : Times.length(length));
+    }
+
+    /** Whether the time that remains stands where the length would. */
+    boolean showsRemaining() {
+        return remaining;
+    }
+
+    void toggleRemaining() {
+        remaining = !remaining;
+        total.setToolTipText(remaining ? "Time that remains" : "Length");
+        showTotal();
     }
 
     void showVolume(double level, boolean muted) {
@@ -112,10 +160,24 @@ final class ControlBar extends JPanel {
 
     /** Leaves only what works without media. */
     void showNothingToPlay() {
-        for (Component control : new Component[] {play, back, forward, seekBar, speed}) {
-            control.setEnabled(false);
-        }
+        setUsable(false);
         showTracks(0, 0);
+    }
+
+    void showSomethingToPlay() {
+        setUsable(true);
+    }
+
+    private void setUsable(boolean isUsable) {
+        for (Component control : new Component[] {play, back, forward, seekBar, speed}) {
+            control.setEnabled(isUsable);
+        }
+    }
+
+    /** Whether there is more than one to choose from. */
+    void showPlaces(boolean areSeveral) {
+        previous.setVisible(areSeveral);
+        next.setVisible(areSeveral);
     }
 
     void showFullScreen(boolean on) {
@@ -135,7 +197,9 @@ final class ControlBar extends JPanel {
 
     private Component buttonRow() {
         Box row = Box.createHorizontalBox();
+        row.add(previous);
         row.add(play);
+        row.add(next);
         row.add(back);
         row.add(forward);
         row.add(Box.createHorizontalStrut(Theme.GAP));
@@ -146,6 +210,8 @@ final class ControlBar extends JPanel {
         row.add(speed);
         row.add(audio);
         row.add(subtitles);
+        row.add(list);
+        row.add(menu);
         row.add(help);
         row.add(fullScreen);
         return row;

@@ -7,20 +7,26 @@ import java.awt.Container;
 import java.awt.Dimension;
 import javax.swing.JPanel;
 
-/** The picture and the bar: one above the other, or the bar over the whole picture. */
+/**
+ * The picture, the bar below it or over the whole of it, and beside the picture a panel while one
+ * is open.
+ */
 final class Deck extends JPanel {
     private final Component picture;
     private final Component bar;
+    private final Component side;
     private boolean overlaps;
     private boolean isApart;
 
-    Deck(Component picture, Component bar) {
+    Deck(Component picture, Component bar, Component side) {
         super(new Layout());
         this.picture = picture;
         this.bar = bar;
+        this.side = side;
         // The first is the uppermost.
         add(bar, BorderLayout.SOUTH);
         add(picture, BorderLayout.CENTER);
+        add(side, BorderLayout.EAST);
     }
 
     /** Whether the bar lies over the picture, which has all the room then. */
@@ -50,6 +56,11 @@ final class Deck extends JPanel {
                 return;
             }
             Dimension room = deck.getSize();
+            if (deck.side.isVisible()) {
+                int width = Math.min(room.width, deck.side.getPreferredSize().width);
+                deck.side.setBounds(room.width - width, 0, width, room.height);
+                room.width -= width;
+            }
             int height = Math.min(room.height, deck.bar.getPreferredSize().height);
             deck.picture.setBounds(0, 0, room.width, room.height);
             deck.bar.setBounds(0, room.height - height, room.width, height);

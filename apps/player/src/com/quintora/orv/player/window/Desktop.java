@@ -52,6 +52,7 @@ final class Desktop {
         try {
             Toolkit.getDefaultToolkit().getScreenSize();
             loadFonts();
+            Theme.dressDialogs();
             UIManager.getLookAndFeel();
             done.complete(null);
         } catch (RuntimeException | Error e) {

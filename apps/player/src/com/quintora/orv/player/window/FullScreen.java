@@ -4,6 +4,7 @@ package com.quintora.orv.player.window;
 import java.awt.AWTEvent;
 import java.awt.Cursor;
 import java.awt.Point;
+import java.awt.Rectangle;
 import java.awt.Toolkit;
 import java.awt.event.MouseEvent;
 import java.awt.image.BufferedImage;
@@ -30,6 +31,7 @@ final class FullScreen {
                             "none");
     private boolean on;
     private boolean playing;
+    private Rectangle windowed;
 
     FullScreen(JFrame frame, Deck deck, JComponent controls) {
         this.frame = frame;
@@ -40,17 +42,28 @@ final class FullScreen {
                 .addAWTEventListener(this::onMouse, AWTEvent.MOUSE_MOTION_EVENT_MASK);
     }
 
+    /** The window's place on the screen, also while it fills that. */
+    Rectangle windowedBounds() {
+        return on ? windowed : frame.getBounds();
+    }
+
     boolean isOn() {
         return on;
     }
 
     void set(boolean wanted) {
         on = wanted;
+        if (on) {
+            windowed = frame.getBounds();
+        }
         // A window can lose its frame only while it is not shown.
         frame.dispose();
         frame.setUndecorated(on);
         deck.setOverlapping(on);
         frame.getGraphicsConfiguration().getDevice().setFullScreenWindow(on ? frame : null);
+        if (!on) {
+            frame.setBounds(windowed);
+        }
         frame.setVisible(true);
         showControls();
     }

@@ -47,6 +47,24 @@ enum Glyph {
             }),
     FULL_SCREEN(g -> g.draw(corners(4, 9))),
     WINDOWED(g -> g.draw(corners(9, 4))),
+    MENU(g -> g.draw(lines(4, 6.5, 20, 6.5, 4, 12, 20, 12, 4, 17.5, 20, 17.5))),
+    SUBMENU(g -> g.draw(lines(9, 5, 16, 12, 16, 12, 9, 19))),
+    LIST(
+            g -> {
+                g.draw(lines(4, 6.5, 15, 6.5, 4, 12, 15, 12, 4, 17.5, 11, 17.5));
+                g.fill(polygon(15, 13, 22, 17.5, 15, 22));
+            }),
+    PREVIOUS(
+            g -> {
+                g.fill(polygon(19, 5, 8, 12, 19, 19));
+                g.draw(lines(5.5, 5.5, 5.5, 18.5));
+            }),
+    NEXT(
+            g -> {
+                g.fill(polygon(5, 5, 16, 12, 5, 19));
+                g.draw(lines(18.5, 5.5, 18.5, 18.5));
+            }),
+    CLOSE(g -> g.draw(lines(6, 6, 18, 18, 18, 6, 6, 18))),
     CHECK(g -> g.draw(lines(5, 13, 10, 18, 10, 18, 20, 7))),
     ALERT(
             g -> {

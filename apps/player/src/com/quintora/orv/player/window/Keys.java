@@ -1,104 +1,65 @@
 // SPDX-License-Identifier: Apache-2.0
 package com.quintora.orv.player.window;
 
+import java.awt.Component;
+import java.awt.KeyboardFocusManager;
 import java.awt.event.ActionEvent;
-import java.util.ArrayList;
+import java.awt.event.KeyEvent;
 import java.util.List;
+import java.util.function.BooleanSupplier;
 import javax.swing.AbstractAction;
 import javax.swing.JComponent;
 import javax.swing.KeyStroke;
+import javax.swing.text.JTextComponent;
 
 /** The window's keys. They rest while a menu is open, which has keys of its own. */
 final class Keys {
-    private final JComponent content;
-    private final Controls controls;
-    private final List<Help.Line> lines = new ArrayList<>();
-
-    private Keys(JComponent content, Controls controls) {
-        this.content = content;
-        this.controls = controls;
-    }
+    private Keys() {}
 
     /**
-     * Binds every key for the window in which that component is; gives what the help says of them.
-     * It must not be the root pane, where these bindings would hide those of an open menu.
+     * Binds the actions' keys for the window in which that component is. It must not be the root
+     * pane, where these bindings would hide those of an open menu.
      */
-    static List<Help.Line> bind(JComponent content, Controls controls, ControlBar bar) {
-        Keys keys = new Keys(content, controls);
-        keys.bindPlaying();
-        keys.bindSkips();
-        keys.bindSound();
-        keys.bindChoices(bar);
-        keys.bindWindow();
-        return keys.lines;
+    static void bind(JComponent content, List<ActionGroup> groups) {
+        for (ActionGroup group : groups) {
+            for (Action action : group.actions()) {
+                for (String key : action.keys()) {
+                    boolean isTyped = isTyped(KeyStroke.getKeyStroke(key));
+                    bind(
+                            content,
+                            JComponent.WHEN_IN_FOCUSED_WINDOW,
+                            key,
+                            () -> !ChoiceMenu.isOpen() && !(isTyped && isTyping()),
+                            action.run());
+                }
+            }
+        }
     }
 
-    private void bindPlaying() {
-        line("Space, K", "Play or pause");
-        on("SPACE", controls::togglePlaying);
-        on("K", controls::togglePlaying);
-        line("[  ]", "Slower, faster");
-        on("OPEN_BRACKET", () -> controls.changeSpeed(-1));
-        on("CLOSE_BRACKET", () -> controls.changeSpeed(1));
-        line(",  .", "Previous frame, next frame");
-        on("COMMA", () -> controls.step(-1));
-        on("PERIOD", () -> controls.step(1));
+    // What writes something in a field, or does something to its text.
+    private static boolean isTyped(KeyStroke key) {
+        int code = key.getKeyCode();
+        boolean isFunction = code >= KeyEvent.VK_F1 && code <= KeyEvent.VK_F12;
+        return code != KeyEvent.VK_ESCAPE && !isFunction;
     }
 
-    private void bindSkips() {
-        line("Left, Right", "10 seconds back, forward");
-        on("LEFT", () -> controls.skip(-10_000));
-        on("RIGHT", () -> controls.skip(10_000));
-        line("Shift+Left, Shift+Right", "1 second back, forward");
-        on("shift LEFT", () -> controls.skip(-1_000));
-        on("shift RIGHT", () -> controls.skip(1_000));
-        line("Page Up, Page Down", "1 minute back, forward");
-        on("PAGE_UP", () -> controls.skip(-60_000));
-        on("PAGE_DOWN", () -> controls.skip(60_000));
-        line("Home", "Go to the start");
-        on("HOME", () -> controls.seekTo(0));
-    }
-
-    private void bindSound() {
-        line("Up, Down", "Volume up, down");
-        on("UP", () -> controls.changeVolume(ControlBar.VOLUME_STEP));
-        on("DOWN", () -> controls.changeVolume(-ControlBar.VOLUME_STEP));
-        line("M", "Mute or unmute");
-        on("M", controls::toggleMuted);
-    }
-
-    private void bindChoices(ControlBar bar) {
-        line("A", "Audio track");
-        on("A", () -> controls.chooseAudio(bar.audioButton()));
-        line("S", "Subtitles");
-        on("S", () -> controls.chooseSubtitles(bar.subtitlesButton()));
-    }
-
-    private void bindWindow() {
-        line("F, F11", "Full screen");
-        on("F", controls::toggleFullScreen);
-        on("F11", controls::toggleFullScreen);
-        line("Escape", "Close this list, leave full screen");
-        on("ESCAPE", controls::leave);
-        line("H, ?, F1", "This list");
-        on("H", controls::toggleHelp);
-        on("typed ?", controls::toggleHelp);
-        on("F1", controls::toggleHelp);
-        line("Q", "Close the window");
-        on("Q", controls::quit);
-    }
-
-    /** What to say of the keys that follow. */
-    private void line(String keys, String meaning) {
-        lines.add(new Help.Line(keys, meaning));
-    }
-
-    private void on(String key, Runnable action) {
-        bind(content, JComponent.WHEN_IN_FOCUSED_WINDOW, key, action);
+    private static boolean isTyping() {
+        Component focused =
+                KeyboardFocusManager.getCurrentKeyboardFocusManager().getPermanentFocusOwner();
+        return focused instanceof JTextComponent text && text.isEditable();
     }
 
     /** While a component has the focus or, as the condition says, its window has. */
     static void bind(JComponent component, int condition, String key, Runnable action) {
+        bind(component, condition, key, () -> !ChoiceMenu.isOpen(), action);
+    }
+
+    private static void bind(
+            JComponent component,
+            int condition,
+            String key,
+            BooleanSupplier isEnabled,
+            Runnable action) {
         component.getInputMap(condition).put(KeyStroke.getKeyStroke(key), key);
         component.getActionMap()
                 .put(
@@ -111,7 +72,7 @@ final class Keys {
 
                             @Override
                             public boolean isEnabled() {
-                                return !ChoiceMenu.isOpen();
+                                return isEnabled.getAsBoolean();
                             }
                         });
     }

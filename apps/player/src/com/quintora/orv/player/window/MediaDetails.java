@@ -20,9 +20,9 @@ import javax.imageio.ImageIO;
 final class MediaDetails {
     private final OrvMediaPlayer player;
     private boolean hasVideo;
-    private int audioTracks;
-    private int subtitleTracks;
-    private List<SeekBar.Mark> chapters = List.of();
+    private volatile int audioTracks;
+    private volatile int subtitleTracks;
+    private Chapters chapters = Chapters.NONE;
     private String title = "";
     private String artist = "";
     private BufferedImage cover;
@@ -34,17 +34,19 @@ final class MediaDetails {
     /** Call once, when the media is prepared. */
     void read() {
         hasVideo = player.getVideoWidth() > 0;
-        audioTracks = player.tracks().audio().size();
-        subtitleTracks = player.tracks().subtitles().size();
-        chapters =
-                player.tracks().chapters().stream()
-                        .map(chapter -> new SeekBar.Mark(chapter.startMillis(), chapter.title()))
-                        .toList();
+        readTracks();
+        chapters = new Chapters(player.tracks().chapters());
         title = player.tracks().metadata().map(MediaMetadata::title).orElse("");
         artist = player.tracks().metadata().map(MediaMetadata::artist).orElse("");
         if (!hasVideo) {
             cover = player.pictures().embedded().map(MediaDetails::decode).orElse(null);
         }
+    }
+
+    /** Once more, when there may be others. */
+    void readTracks() {
+        audioTracks = player.tracks().audio().size();
+        subtitleTracks = player.tracks().subtitles().size();
     }
 
     boolean hasVideo() {
@@ -59,7 +61,7 @@ final class MediaDetails {
         return subtitleTracks;
     }
 
-    List<SeekBar.Mark> chapters() {
+    Chapters chapters() {
         return chapters;
     }
 

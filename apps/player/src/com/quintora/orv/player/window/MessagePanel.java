@@ -18,11 +18,13 @@ final class MessagePanel extends JPanel {
 
     private final JLabel title = new JLabel();
     private final JTextArea text = new JTextArea();
+    private final JPanel wayOn = new JPanel(new BorderLayout());
     private final JComponent sign = new Sign();
     private Glyph glyph = Glyph.ALERT;
     private Color color = Theme.ALERT;
 
-    MessagePanel() {
+    /** Offers to open something else, where that is the way on. */
+    MessagePanel(Runnable open) {
         super(new GridBagLayout());
         setBackground(Theme.STAGE);
         // The media's own words are never markup.
@@ -40,6 +42,12 @@ final class MessagePanel extends JPanel {
         words.setOpaque(false);
         words.add(title, BorderLayout.NORTH);
         words.add(text, BorderLayout.CENTER);
+        words.add(wayOn, BorderLayout.SOUTH);
+        FlatButton button = new FlatButton(null, "Open other files (O)", open);
+        button.setText("Open other files…");
+        button.setForeground(Theme.ACCENT);
+        wayOn.setOpaque(false);
+        wayOn.add(button, BorderLayout.WEST);
         JPanel card = new Card(new BorderLayout(20, 0));
         card.setBorder(BorderFactory.createEmptyBorder(24, 24, 24, 28));
         card.add(sign, BorderLayout.WEST);
@@ -47,7 +55,9 @@ final class MessagePanel extends JPanel {
         add(card);
     }
 
-    void tell(Glyph glyph, Color color, String title, String text) {
+    /** Offers a way on, too, or not. */
+    void tell(Glyph glyph, Color color, String title, String text, boolean offers) {
+        wayOn.setVisible(offers);
         this.glyph = glyph;
         this.color = color;
         this.title.setText(title);

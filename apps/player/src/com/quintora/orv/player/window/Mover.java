@@ -30,12 +30,12 @@ final class Mover {
     }
 
     private final Playback playback;
-    private final Consumer<Conductor.Command> later;
+    private final Consumer<Playing.Command> later;
     private final Consumer<String> notice;
     private final AtomicReference<Move> waiting = new AtomicReference<>();
 
     /** Moves run where later puts them, one at a time; notices come from any thread. */
-    Mover(Playback playback, Consumer<Conductor.Command> later, Consumer<String> notice) {
+    Mover(Playback playback, Consumer<Playing.Command> later, Consumer<String> notice) {
         this.playback = playback;
         this.later = later;
         this.notice = notice;

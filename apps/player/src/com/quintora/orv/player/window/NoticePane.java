@@ -1,6 +1,7 @@
 // SPDX-License-Identifier: Apache-2.0
 package com.quintora.orv.player.window;
 
+import com.quintora.orv.player.Ellipsis;
 import java.awt.CardLayout;
 import java.awt.Color;
 import java.awt.Component;
@@ -12,6 +13,7 @@ import javax.swing.Timer;
 /** Shows one of its components, and for a moment a few words on it. */
 final class NoticePane extends JPanel {
     private static final int NOTICE_MS = 1_200;
+    private static final int LONG_NOTICE_MS = 6_000;
 
     private final CardLayout cards = new CardLayout();
     private final Timer noticeEnd = new Timer(NOTICE_MS, event -> setNotice(""));
@@ -38,7 +40,17 @@ final class NoticePane extends JPanel {
 
     /** Writes a few words onto what is shown. */
     void tell(String words) {
+        tell(words, NOTICE_MS);
+    }
+
+    /** The same for long enough to be read, of what was not asked for. */
+    void tellLong(String words) {
+        tell(words, LONG_NOTICE_MS);
+    }
+
+    private void tell(String words, int millis) {
         setNotice(words);
+        noticeEnd.setInitialDelay(millis);
         noticeEnd.restart();
     }
 
@@ -89,10 +101,11 @@ final class NoticePane extends JPanel {
         }
     }
 
-    private void paintWords(Graphics graphics, String words) {
+    private void paintWords(Graphics graphics, String all) {
         Graphics2D g = Theme.smooth(graphics);
         g.setFont(Theme.BODY.deriveFont(16f));
         var metrics = g.getFontMetrics();
+        String words = Ellipsis.inMiddle(all, metrics, getWidth() - 68);
         int width = metrics.stringWidth(words) + 28;
         int height = metrics.getHeight() + 16;
         g.setColor(new Color(0, 0, 0, 170));

@@ -5,7 +5,7 @@ import com.quintora.orv.player.Failure;
 import com.quintora.orv.player.GpuUse;
 import com.quintora.orv.player.Interruption;
 import com.quintora.orv.player.PlayOptions;
-import com.quintora.orv.player.Session;
+import com.quintora.orv.player.playlist.Playlist;
 import java.awt.AWTError;
 import java.awt.EventQueue;
 import java.awt.HeadlessException;
@@ -28,38 +28,42 @@ public final class PlayerWindow {
      * @throws Failure when there can be no window
      */
     public static int play(PlayOptions options) throws Failure, InterruptedException {
+        Playlist list = options.playlist();
         PictureWay way = new PictureWay(options.gpuUse());
-        Stage stage = makeStage(options.title(), way);
-        try (Session session = new Session(options, stage::draw);
-                Interruption interruption = new Interruption(session, () -> {})) {
-            Conductor conductor = new Conductor(session, stage, options);
+        Stage stage = makeStage(list.currentEntry().name(), way);
+        Conductor conductor = new Conductor(stage, options, list);
+        try (Interruption interruption = new Interruption(conductor::end, () -> {})) {
             CompletableFuture<Void> closed = new CompletableFuture<>();
             EventQueue.invokeLater(() -> open(stage, conductor, closed));
             conductor.begin();
             await(closed);
-            conductor.end();
             if (options.reportsStats()) {
-                System.out.println(session.report());
+                System.out.println(conductor.playing().session().report());
                 System.out.println(way.describe());
             }
-            Failure failure = conductor.failure();
-            return failure == null || interruption.happened() ? 0 : 1;
+            conductor.end();
+            return conductor.failure() == null || interruption.happened() ? 0 : 1;
+        } finally {
+            conductor.end();
         }
     }
 
     /** Plays to the end in a window that is never shown, and draws it where nobody looks. */
     public static void rehearse(PlayOptions options) throws Failure, InterruptedException {
-        Stage stage = makeStage(options.title(), new PictureWay(GpuUse.NEVER));
-        try (Session session = new Session(options, stage::draw)) {
-            Conductor conductor = new Conductor(session, stage, options);
+        Playlist list = options.playlist();
+        Stage stage = makeStage(list.currentEntry().name(), new PictureWay(GpuUse.NEVER));
+        Conductor conductor = new Conductor(stage, options, list);
+        try {
             EventQueue.invokeLater(() -> stage.build(conductor, () -> {}));
             conductor.begin();
-            session.ended().await();
+            conductor.playing().session().ended().await();
             EventQueue.invokeAndWait(stage::drawUnseen);
             conductor.end();
             EventQueue.invokeAndWait(stage::close);
         } catch (InvocationTargetException e) {
             throw noWindow("(" + e.getCause() + ")", e.getCause());
+        } finally {
+            conductor.end();
         }
     }
 

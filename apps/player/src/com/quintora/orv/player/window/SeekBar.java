@@ -1,21 +1,16 @@
 // SPDX-License-Identifier: Apache-2.0
 package com.quintora.orv.player.window;
 
-import com.quintora.orv.player.Times;
 import java.awt.Dimension;
 import java.awt.Graphics2D;
-import java.awt.event.MouseEvent;
-import java.util.List;
+import java.util.OptionalInt;
 import java.util.function.IntConsumer;
-import javax.swing.ToolTipManager;
 
 /** The place in the media, what is buffered, and the chapters' starts. */
 final class SeekBar extends LevelBar {
-    /** A mark on the bar. */
-    record Mark(int atMs, String title) {}
-
     private int durationMs;
-    private List<Mark> marks = List.of();
+    private Chapters chapters = Chapters.NONE;
+    private RepeatMarks section = RepeatMarks.NONE;
 
     SeekBar(IntConsumer onSeek, IntConsumer onStep) {
         this(new Target(onSeek), onStep);
@@ -26,7 +21,6 @@ final class SeekBar extends LevelBar {
         target.bar = this;
         getAccessibleContext().setAccessibleDescription("Seconds from the start");
         setMaximumSize(new Dimension(Integer.MAX_VALUE, 20));
-        ToolTipManager.sharedInstance().registerComponent(this);
     }
 
     /** In seconds. */
@@ -35,8 +29,13 @@ final class SeekBar extends LevelBar {
         return durationMs / 1000;
     }
 
-    void showMarks(List<Mark> marks) {
-        this.marks = List.copyOf(marks);
+    void showChapters(Chapters chapters) {
+        this.chapters = chapters;
+        repaint();
+    }
+
+    void showSection(RepeatMarks section) {
+        this.section = section;
         repaint();
     }
 
@@ -50,26 +49,49 @@ final class SeekBar extends LevelBar {
                 durationMs > 0 ? (double) positionMs / durationMs : 0, bufferedPercent / 100.0);
     }
 
-    @Override
-    public String getToolTipText(MouseEvent event) {
-        int at = (int) (levelAt(event.getX()) * durationMs);
-        String title = "";
-        for (Mark mark : marks) {
-            if (mark.atMs <= at) {
-                title = mark.title;
-            }
-        }
-        return durationMs == 0 ? null : Times.clock(at) + (title.isEmpty() ? "" : "  " + title);
+    /** The time at a column of the bar, in milliseconds; 0 while there is none. */
+    int timeAt(int x) {
+        return (int) Math.round(levelAt(x) * durationMs);
+    }
+
+    /** What the chapter of that time is called, or nothing. */
+    String chapterAt(int millis) {
+        OptionalInt chapter = chapters.at(millis);
+        return chapter.isPresent() ? chapters.name(chapter.getAsInt()) : "";
     }
 
     @Override
     void paintMarks(Graphics2D g) {
         g.setColor(Theme.PANEL);
-        for (Mark mark : marks) {
-            if (mark.atMs > 0 && mark.atMs < durationMs) {
-                g.fillRect((int) xOf((double) mark.atMs / durationMs) - 1, 0, 2, getHeight());
-            }
+        for (int i = 0; i < chapters.count(); i++) {
+            paintMark(g, chapters.start(i));
         }
+        paintSection(g);
+    }
+
+    private void paintSection(Graphics2D g) {
+        g.setColor(Theme.SECTION);
+        if (section.hasEnd()) {
+            int left = (int) xOfTime(section.from());
+            int width = Math.max(1, (int) xOfTime(section.to()) - left);
+            g.fillRect(left, getHeight() / 2 - 1, width, 2);
+        }
+        if (section.hasStart()) {
+            paintMark(g, section.from());
+        }
+        if (section.hasEnd()) {
+            paintMark(g, section.to());
+        }
+    }
+
+    private void paintMark(Graphics2D g, int atMs) {
+        if (atMs > 0 && atMs < durationMs) {
+            g.fillRect((int) xOfTime(atMs) - 1, 0, 2, getHeight());
+        }
+    }
+
+    private double xOfTime(int atMs) {
+        return xOf((double) atMs / Math.max(1, durationMs));
     }
 
     /** Turns the bar's level into milliseconds. */

@@ -3,10 +3,14 @@ package com.quintora.orv.player.window;
 
 import com.quintora.mmp.desktop.DesktopSurfaceView;
 import com.quintora.mmp.desktop.VideoFrame;
+import com.quintora.orv.player.Previews;
 import com.quintora.orv.player.Snapshot;
+import com.quintora.orv.player.playlist.Playlist;
 import java.awt.Color;
 import java.awt.Component;
 import java.awt.Dimension;
+import java.awt.EventQueue;
+import java.awt.Frame;
 import java.awt.Graphics;
 import java.awt.GraphicsEnvironment;
 import java.awt.Rectangle;
@@ -14,14 +18,19 @@ import java.awt.event.ComponentAdapter;
 import java.awt.event.ComponentEvent;
 import java.awt.event.MouseAdapter;
 import java.awt.event.MouseEvent;
+import java.awt.event.MouseWheelEvent;
 import java.awt.event.WindowAdapter;
 import java.awt.event.WindowEvent;
+import java.awt.image.BufferedImage;
 import java.awt.image.VolatileImage;
 import java.util.List;
 import java.util.Locale;
+import java.util.Map;
 import java.util.Optional;
 import java.util.concurrent.CompletableFuture;
 import java.util.concurrent.ExecutionException;
+import java.util.function.Consumer;
+import java.util.function.Supplier;
 import javax.swing.JFrame;
 import javax.swing.JPopupMenu;
 import javax.swing.LayoutFocusTraversalPolicy;
@@ -39,25 +48,35 @@ final class Stage {
     private static final int OPENING_MS = 400;
     private static final int LONG_SEEK_LOOKS = 5;
 
-    private final String name;
+    private volatile String name;
     private final VideoPane video = new VideoPane(this::requestFrames);
     private final NoticePane room = new NoticePane();
     private JFrame frame;
     private ControlBar bar;
+    private SeekPreview preview;
     private Deck deck;
     private final Help help = new Help();
     // Most media open so quickly that a word about it would only flicker.
     private final Timer opening = new Timer(OPENING_MS, event -> showOpening());
+    private final Clicks clicks = new Clicks(this::togglePlaying, this::toggleFullScreen);
     private FullScreen fullScreen;
     private MessagePanel message;
     private Conductor conductor;
+    private List<ActionGroup> actions;
+    private SideRoom side;
+    private ListPanel list; // Once it was opened.
+    private Drops drops;
     private Dimension videoSize;
+    private boolean isFitted;
+    private volatile Rectangle before;
+    private volatile Rectangle last;
     private boolean buffering;
     private int seekingLooks;
     private Runnable onClosed;
     private final PictureWay way;
     private final CompletableFuture<Optional<DesktopSurfaceView>> view = new CompletableFuture<>();
     private DesktopSurfaceView surface; // Once the graphics processor draws on it.
+    private volatile boolean isDropped;
     private String shown = VIDEO;
 
     /** The name stands in the title bar. */
@@ -66,15 +85,25 @@ final class Stage {
         this.way = way;
     }
 
+    /** Opens where the window was before, if that is remembered. To be called before it is open. */
+    void restore(Map<String, String> remembered) {
+        WindowPlace.in(remembered).ifPresent(place -> before = place);
+    }
+
+    /** Where the window is, or was when it was closed. Any thread. */
+    Optional<Rectangle> place() {
+        return Optional.ofNullable(last);
+    }
+
     void open(Conductor conductor, Runnable onClosed) {
         try {
             build(conductor, onClosed);
             frame.setVisible(true);
+            EventQueue.invokeLater(() -> frame.setIconImages(AppIcon.images()));
             view.complete(addView());
         } finally {
             view.complete(Optional.empty()); // Unless there is one.
         }
-        opening.setRepeats(false);
         opening.start();
     }
 
@@ -85,20 +114,32 @@ final class Stage {
         Theme.install();
         frame = new JFrame(name);
         bar = new ControlBar(conductor);
-        message = new MessagePanel();
+        preview = new SeekPreview(bar.seekBar());
+        message = new MessagePanel(conductor::chooseFiles);
         room.add(video, VIDEO);
         room.add(message, MESSAGE);
-        deck = new Deck(room, bar);
+        side = new SideRoom(room::requestFocusInWindow);
+        deck = new Deck(room, bar, side);
         frame.add(deck);
         frame.setGlassPane(help);
         fullScreen = new FullScreen(frame, deck, bar);
-        help.list(Keys.bind(deck, conductor, bar));
+        actions = WindowActions.of(conductor, bar);
+        Keys.bind(deck, actions);
+        help.list(actions);
+        opening.setRepeats(false);
         giveFocusToPicture();
         listen();
+        drops = new Drops(conductor);
+        drops.playOn(frame.getRootPane());
+        showList(conductor.list());
         room.setPreferredSize(new Dimension(854, 480));
         frame.setMinimumSize(new Dimension(480, 300));
         frame.pack();
         frame.setLocationRelativeTo(null);
+        if (before != null) {
+            isFitted = true;
+            frame.setBounds(before);
+        }
     }
 
     /** Paints a window that is not shown, as the screen would be painted. */
@@ -125,21 +166,26 @@ final class Stage {
     /** Waits for the window, if that is to have a view. Not for the window's thread. */
     Optional<DesktopSurfaceView> awaitView() throws InterruptedException {
         try {
-            return way.isTried() ? view.get() : Optional.empty();
+            return way.isTried() && !isDropped ? view.get() : Optional.empty();
         } catch (ExecutionException e) {
             return Optional.empty();
         }
     }
 
     /** The graphics processor draws on the view, whose window covers what is painted. */
-    void drawOn(DesktopSurfaceView drawn, Runnable onNewSurface) {
+    void drawOn(DesktopSurfaceView drawn) {
+        if (surface == drawn) {
+            return;
+        }
         surface = drawn;
         JPopupMenu.setDefaultLightWeightPopupEnabled(false);
         ToolTipManager.sharedInstance().setLightWeightPopupEnabled(false);
         deck.keepApart();
         room.writeOver(surface);
-        surface.addMouseListener(clicks());
-        surface.getHolder().addCallback(new NewSurfaces(onNewSurface));
+        surface.addMouseListener(clicks);
+        surface.addMouseListener(menuOpener());
+        surface.addMouseWheelListener(this::onWheel);
+        surface.getHolder().addCallback(new NewSurfaces(() -> conductor.drawOnNewSurfaceOf(drawn)));
         help.addComponentListener(
                 new ComponentAdapter() {
                     @Override
@@ -156,6 +202,8 @@ final class Stage {
 
     /** Nothing is drawn on the view that was tried. */
     void dropView(DesktopSurfaceView unused) {
+        surface = null;
+        isDropped = true;
         room.remove(unused);
     }
 
@@ -170,25 +218,40 @@ final class Stage {
         room.show(isCovered ? VIDEO : card);
     }
 
-    /** Called with each frame, on the frames' thread. */
-    void draw(VideoFrame frame) {
-        video.draw(frame.getPixels(), frame.getWidth(), frame.getHeight(), frame.getRowStride());
+    /** What is called with each frame, on the frames' thread. Any thread. */
+    Consumer<VideoFrame> screen() {
+        return video.screen();
+    }
+
+    /** Other media begins, which is called so: gives what is called with its frames. */
+    Consumer<VideoFrame> newScreen(String title) {
+        name = title;
+        frame.setTitle(title);
+        videoSize = null;
+        buffering = false;
+        room.keepTelling("");
+        bar.showSomethingToPlay();
+        bar.seekBar().showChapters(Chapters.NONE);
+        bar.seekBar().showSection(RepeatMarks.NONE);
+        preview.use(null);
+        opening.restart();
+        return video.begin();
     }
 
     private void showOpening() {
         tellInstead(Glyph.PLAY, Theme.ACCENT, name, "Opening…");
     }
 
-    void showMedia(MediaDetails details, double volume) {
+    void showMedia(MediaDetails details) {
         opening.stop();
         if (details.hasVideo()) {
             showPicture();
         } else {
             showCard(VIDEO);
         }
-        bar.showTracks(details.audioTracks(), details.subtitleTracks());
-        bar.seekBar().showMarks(details.chapters());
-        bar.showVolume(volume, false);
+        showTracks(details);
+        bar.seekBar().showChapters(details.chapters());
+        conductor.showVolume();
         if (!details.title().isEmpty()) {
             frame.setTitle(details.title());
         }
@@ -200,10 +263,14 @@ final class Stage {
         }
     }
 
+    void showTracks(MediaDetails details) {
+        bar.showTracks(details.audioTracks(), details.subtitleTracks());
+    }
+
     void showVideoSize(int width, int height) {
-        boolean first = videoSize == null;
         videoSize = new Dimension(width, height);
-        if (first && !fullScreen.isOn()) {
+        if (!isFitted && !fullScreen.isOn()) {
+            isFitted = true;
             fitWindow();
         }
         requestFrames();
@@ -226,6 +293,21 @@ final class Stage {
         fullScreen.showPlaying(now.playing());
     }
 
+    /** Where pictures of places come from, above the bar. */
+    void showPreviews(Previews previews) {
+        preview.use(previews);
+    }
+
+    /** Such a picture is there. */
+    void showPreview(int part, BufferedImage image) {
+        preview.show(part, image);
+    }
+
+    /** What is repeated. */
+    void showSection(RepeatMarks marks) {
+        bar.seekBar().showSection(marks);
+    }
+
     void showVolume(double level, boolean muted) {
         bar.showVolume(level, muted);
     }
@@ -234,12 +316,32 @@ final class Stage {
         opening.stop();
         room.keepTelling("");
         bar.showNothingToPlay();
-        tellInstead(Glyph.ALERT, Theme.ALERT, "This cannot be played", sentence);
+        message.tell(Glyph.ALERT, Theme.ALERT, "This cannot be played", sentence, true);
+        showCard(MESSAGE);
     }
 
     /** A few words on the picture, or on the message in its place. */
     void tell(String words) {
         room.tell(words);
+    }
+
+    /** The same for long enough to be read, of what was not asked for. */
+    void tellLong(String words) {
+        room.tellLong(words);
+    }
+
+    boolean fillsScreen() {
+        return fullScreen.isOn();
+    }
+
+    void raise() {
+        frame.setExtendedState(frame.getExtendedState() & ~Frame.ICONIFIED);
+        frame.toFront();
+        frame.requestFocus();
+    }
+
+    private void togglePlaying() {
+        conductor.togglePlaying();
     }
 
     void toggleFullScreen() {
@@ -251,13 +353,67 @@ final class Stage {
         help.setVisible(!help.isVisible());
     }
 
-    /** Closes the list of keys, or else leaves the full screen. */
+    /** Closes the list of keys, or else the panel, or else leaves the full screen. */
     void leave() {
         if (help.isVisible()) {
             help.setVisible(false);
+        } else if (side.isOpen()) {
+            side.close();
         } else if (fullScreen.isOn()) {
             toggleFullScreen();
         }
+    }
+
+    void toggleList() {
+        side.toggle("list", this::makeList);
+    }
+
+    private ListPanel makeList() {
+        list = new ListPanel(conductor);
+        drops.addOn(list);
+        list.show(conductor.list());
+        return list;
+    }
+
+    /** How the picture is drawn, in words. */
+    String describeDrawing() {
+        return way.describe();
+    }
+
+    /** Shows or hides the panel of that name, which is made when it is first asked for. */
+    void togglePanel(String name, Supplier<SidePanel> maker) {
+        side.toggle(name, maker);
+    }
+
+    /** The list has changed, or what plays of it. */
+    void showList(Playlist changed) {
+        if (list != null) {
+            list.show(changed);
+        }
+        bar.showPlaces(changed.entries().size() > 1);
+    }
+
+    void chooseFiles() {
+        later(new OpenDialog(frame, conductor)::chooseFiles);
+    }
+
+    void addSubtitleFile() {
+        later(new OpenDialog(frame, conductor)::chooseSubtitles);
+    }
+
+    void chooseAddress() {
+        later(new OpenDialog(frame, conductor)::chooseAddress);
+    }
+
+    // The letter of the key that asks for a dialog must not go into its field.
+    private static void later(Runnable dialog) {
+        EventQueue.invokeLater(dialog);
+    }
+
+    /** All that the window does, above the bar's button for it. */
+    void openMenu() {
+        fullScreen.showControls();
+        ActionMenu.openAbove(bar.menuButton(), actions);
     }
 
     /** Says so where there is nothing to choose. */
@@ -272,12 +428,14 @@ final class Stage {
 
     void close() {
         opening.stop();
+        clicks.stop();
+        last = fullScreen.windowedBounds();
         frame.dispose();
         onClosed.run();
     }
 
     private void tellInstead(Glyph glyph, Color color, String title, String text) {
-        message.tell(glyph, color, title, text);
+        message.tell(glyph, color, title, text, false);
         showCard(MESSAGE);
     }
 
@@ -341,24 +499,23 @@ final class Stage {
                         conductor.setWatched(true);
                     }
                 });
-        room.addMouseListener(clicks());
+        room.addMouseListener(clicks);
+        room.addMouseListener(menuOpener());
+        room.addMouseWheelListener(this::onWheel);
     }
 
-    private MouseAdapter clicks() {
+    private void onWheel(MouseWheelEvent event) {
+        conductor.changeVolume(-event.getPreciseWheelRotation() * ControlBar.VOLUME_STEP);
+    }
+
+    private MouseAdapter menuOpener() {
         return new MouseAdapter() {
             @Override
-            public void mouseClicked(MouseEvent event) {
-                if (SwingUtilities.isLeftMouseButton(event)) {
-                    onClick(event.getClickCount());
+            public void mousePressed(MouseEvent event) {
+                if (SwingUtilities.isRightMouseButton(event)) {
+                    ActionMenu.open(event.getComponent(), event.getX(), event.getY(), actions);
                 }
             }
         };
-    }
-
-    private void onClick(int clicks) {
-        conductor.togglePlaying();
-        if (clicks == 2) {
-            toggleFullScreen();
-        }
     }
 }

@@ -8,8 +8,10 @@ import java.awt.Font;
 import java.awt.Graphics;
 import java.awt.Graphics2D;
 import java.awt.RenderingHints;
+import java.util.List;
 import javax.swing.BorderFactory;
 import javax.swing.UIManager;
+import javax.swing.plaf.metal.MetalLookAndFeel;
 
 /** The window's colours, letters and measures (pixels). */
 final class Theme {
@@ -20,6 +22,7 @@ final class Theme {
     static final Color TRACK = new Color(0x3A404C);
     static final Color BUFFERED = new Color(0x5B6372);
     static final Color ACCENT = new Color(0x4C9BFF);
+    static final Color SECTION = new Color(0xFFC24B);
     static final Color TEXT = new Color(0xE9EBEF);
     static final Color MUTED = new Color(0x98A0AD);
     static final Color ALERT = new Color(0xFF6B5E);
@@ -33,6 +36,15 @@ final class Theme {
     static final int CORNER = 10;
 
     private Theme() {}
+
+    /** Gives dialogs the same look. Call before Swing is used first. */
+    static void dressDialogs() {
+        MetalLookAndFeel.setCurrentTheme(new DarkMetal());
+        UIManager.put("swing.boldMetal", false);
+        for (String gradient : List.of("Button", "ScrollBar", "ComboBox", "ToggleButton")) {
+            UIManager.put(gradient + ".gradient", null);
+        }
+    }
 
     /** Gives what Swing draws itself the same look. Call before the first component is made. */
     static void install() {

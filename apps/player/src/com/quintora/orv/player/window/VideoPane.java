@@ -1,6 +1,7 @@
 // SPDX-License-Identifier: Apache-2.0
 package com.quintora.orv.player.window;
 
+import com.quintora.mmp.desktop.VideoFrame;
 import java.awt.Dimension;
 import java.awt.EventQueue;
 import java.awt.Graphics;
@@ -11,6 +12,7 @@ import java.awt.geom.Rectangle2D;
 import java.awt.image.BufferedImage;
 import java.lang.reflect.InvocationTargetException;
 import java.nio.ByteBuffer;
+import java.util.function.Consumer;
 import javax.swing.JPanel;
 
 /**
@@ -23,6 +25,8 @@ final class VideoPane extends JPanel {
     // One of them is shown; on the window's thread.
     private Frame frame;
     private BufferedImage still;
+    // Frames of before must not come back: their memory is no longer theirs.
+    private volatile int content;
     private Dimension room = new Dimension();
     private long paintings;
     private long scalings;
@@ -45,15 +49,49 @@ final class VideoPane extends JPanel {
      * @param stride bytes from row to row
      */
     void draw(ByteBuffer pixels, int width, int height, int stride) {
-        Frame next = new Frame(pixels, width, height, stride);
+        draw(new Frame(pixels, width, height, stride), content);
+    }
+
+    private void draw(Frame next, int its) {
         try {
-            EventQueue.invokeAndWait(() -> show(next, null));
+            EventQueue.invokeAndWait(
+                    () -> {
+                        if (its == content) {
+                            show(next, null);
+                        }
+                    });
         } catch (InterruptedException e) {
             Thread.currentThread().interrupt(); // The window is closing.
         } catch (InvocationTargetException e) {
             Thread thread = Thread.currentThread();
             thread.getUncaughtExceptionHandler().uncaughtException(thread, e.getCause());
         }
+    }
+
+    /**
+     * Forgets what is shown; on the window's thread.
+     *
+     * @return what shows frames from now on, until this is called again: called on any thread but
+     *     the window's, and returns when the frame is painted or left out
+     */
+    Consumer<VideoFrame> begin() {
+        content++;
+        show(null, null);
+        repaint();
+        return screen();
+    }
+
+    /** The same for what is shown at present. */
+    Consumer<VideoFrame> screen() {
+        int its = content;
+        return frame ->
+                draw(
+                        new Frame(
+                                frame.getPixels(),
+                                frame.getWidth(),
+                                frame.getHeight(),
+                                frame.getRowStride()),
+                        its);
     }
 
     /** Shows a still picture, which must not change any more; on the window's thread. */

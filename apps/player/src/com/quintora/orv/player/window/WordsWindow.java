@@ -1,6 +1,7 @@
 // SPDX-License-Identifier: Apache-2.0
 package com.quintora.orv.player.window;
 
+import com.quintora.orv.player.Ellipsis;
 import java.awt.Component;
 import java.awt.Point;
 import java.awt.Window;
@@ -52,7 +53,8 @@ final class WordsWindow {
             window.setFocusableWindowState(false);
             window.add(label);
         }
-        label.setText(words);
+        int room = picture.getWidth() - 2 * PLACE - 28;
+        label.setText(Ellipsis.inMiddle(words, label.getFontMetrics(label.getFont()), room));
         window.pack();
         place();
         window.setVisible(true);

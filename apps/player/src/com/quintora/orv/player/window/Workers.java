@@ -17,8 +17,12 @@ import java.util.concurrent.TimeUnit;
 final class Workers {
     private static final int POLL_MS = 80;
 
+    // The longest wait for files at the end.
+    private static final int FILES_MS = 10_000;
+
     private final ExecutorService slow = Executors.newSingleThreadExecutor(threads("player"));
     private final ExecutorService quick = Executors.newSingleThreadExecutor(threads("controls"));
+    private final ExecutorService files = Executors.newSingleThreadExecutor(threads("files"));
     private final ScheduledExecutorService poller =
             Executors.newSingleThreadScheduledExecutor(threads("poller"));
     private final CountDownLatch ready = new CountDownLatch(1);
@@ -37,6 +41,11 @@ final class Workers {
         execute(quick, task);
     }
 
+    /** Runs, in turn, what the end waits for, such as writing a file. */
+    void completely(Runnable task) {
+        execute(files, task);
+    }
+
     /** There is something to control; runs this again and again from now on. */
     void begin(Runnable poll) {
         ready.countDown();
@@ -53,6 +62,12 @@ final class Workers {
 
     void end() {
         List.of(slow, quick, poller).forEach(ExecutorService::shutdownNow);
+        files.shutdown();
+        try {
+            files.awaitTermination(FILES_MS, TimeUnit.MILLISECONDS);
+        } catch (InterruptedException e) {
+            Thread.currentThread().interrupt();
+        }
     }
 
     private void awaitReady() {

@@ -41,7 +41,7 @@ class BrokenWindowTest {
     @Test
     void itEndsThePlaybackInASentence() throws Exception {
         UIManager.put("RootPaneUI", TornCanvas.class.getName());
-        PlayOptions options = PlayOptions.of(Media.path("short.mp4"));
+        PlayOptions options = PlayOptions.of("--no-memory", Media.path("short.mp4"));
         FutureTask<Integer> playing = new FutureTask<>(() -> PlayerWindow.play(options));
         new Thread(playing, "main").start();
         var thrown =

@@ -24,22 +24,21 @@ class ConductorWindowTest {
 
     @BeforeEach
     void open() throws Exception {
-        PlayOptions options = PlayOptions.of(Media.path("short.mp4"));
-        session = new Session(options, stage::draw);
-        conductor = new Conductor(session, stage, options);
+        PlayOptions options = PlayOptions.of("--no-memory", Media.path("short.mp4"));
+        conductor = new Conductor(stage, options, options.playlist());
+        session = conductor.playing().session();
         SwingUtilities.invokeAndWait(() -> stage.open(conductor, () -> {}));
     }
 
     @AfterEach
     void close() throws Exception {
         conductor.end();
-        session.close();
         SwingUtilities.invokeAndWait(stage::close);
     }
 
     @Test
     void whatTheEngineRefusesIsAFailure() throws Exception {
-        conductor.failOn(() -> {
+        conductor.playing().failOn(() -> {
             throw new IllegalStateException("the engine refused start()");
         });
         assertEquals("the engine refused start()", conductor.failure().getMessage());
@@ -48,7 +47,7 @@ class ConductorWindowTest {
 
     @Test
     void noExceptionIsLost() {
-        conductor.failOn(() -> {
+        conductor.playing().failOn(() -> {
             throw new UnsupportedOperationException("later");
         });
         assertEquals(
@@ -59,7 +58,7 @@ class ConductorWindowTest {
     @Test
     void theFirstFailureIsTheOneThatIsTold() {
         for (String words : new String[] {"first", "second"}) {
-            conductor.failOn(() -> {
+            conductor.playing().failOn(() -> {
                 throw new IllegalStateException(words);
             });
         }
@@ -69,7 +68,7 @@ class ConductorWindowTest {
     @Test
     void whatFailsAsTheWindowClosesIsNoFailure() {
         session.close();
-        conductor.failOn(() -> session.player().start());
+        conductor.playing().failOn(() -> session.player().start());
         assertNull(conductor.failure());
     }
 

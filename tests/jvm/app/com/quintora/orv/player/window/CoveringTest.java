@@ -15,7 +15,7 @@ class CoveringTest {
     private final JPanel picture = new JPanel();
     private final NoticePane room = new NoticePane();
     private final JPanel bar = new JPanel();
-    private final Deck deck = new Deck(room, bar);
+    private final Deck deck = new Deck(room, bar, new JPanel());
     private final JRootPane root = new JRootPane();
 
     CoveringTest() {

@@ -27,8 +27,14 @@ class DeckWindowTest {
             paintings.incrementAndGet();
         }
     };
-    private final Deck deck = new Deck(picture, bar);
+    private final Deck deck = new Deck(picture, bar, hidden());
     private JFrame frame;
+
+    private static JPanel hidden() {
+        JPanel side = new JPanel();
+        side.setVisible(false);
+        return side;
+    }
 
     @BeforeEach
     void open() throws Exception {

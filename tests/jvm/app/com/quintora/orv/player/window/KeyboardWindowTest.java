@@ -2,6 +2,8 @@
 package com.quintora.orv.player.window;
 
 import static org.junit.jupiter.api.Assertions.assertEquals;
+import static org.junit.jupiter.api.Assertions.assertFalse;
+import static org.junit.jupiter.api.Assertions.assertNotNull;
 import static org.junit.jupiter.api.Assertions.assertTrue;
 
 import java.awt.Component;
@@ -16,6 +18,7 @@ import javax.accessibility.AccessibleContext;
 import javax.accessibility.AccessibleRole;
 import javax.swing.JComponent;
 import javax.swing.JFrame;
+import javax.swing.KeyStroke;
 import javax.swing.SwingUtilities;
 import org.junit.jupiter.api.AfterEach;
 import org.junit.jupiter.api.BeforeEach;
@@ -26,7 +29,7 @@ class KeyboardWindowTest {
     private final List<String> calls = new ArrayList<>();
     private JFrame frame;
     private ControlBar bar;
-    private List<Help.Line> help;
+    private List<ActionGroup> actions;
 
     @BeforeEach
     void open() throws Exception {
@@ -43,7 +46,8 @@ class KeyboardWindowTest {
             frame = new JFrame();
             bar = new ControlBar(controls);
             frame.add(bar);
-            help = Keys.bind(bar, controls, bar);
+            actions = WindowActions.of(controls, bar);
+            Keys.bind(bar, actions);
             bar.seekBar().showPosition(30_000, 60_000, 100);
             frame.pack();
             frame.setVisible(true);
@@ -122,13 +126,26 @@ class KeyboardWindowTest {
     }
 
     @Test
-    void theListNamesEveryKey() {
-        int names =
-                help.stream()
-                        .mapToInt(line -> line.keys().split("(?<=[\\w?]), |  ").length)
-                        .sum();
-        var keys = bar.getInputMap(JComponent.WHEN_IN_FOCUSED_WINDOW).keys();
-        assertEquals(keys.length, names, () -> help + " for " + Arrays.toString(keys));
+    void noTwoActionsHaveTheSameKey() {
+        List<String> keys =
+                actions.stream()
+                        .flatMap(group -> group.actions().stream())
+                        .flatMap(action -> action.keys().stream())
+                        .toList();
+        var bound = bar.getInputMap(JComponent.WHEN_IN_FOCUSED_WINDOW).keys();
+        assertEquals(keys.size(), bound.length, () -> keys + " for " + Arrays.toString(bound));
+    }
+
+    @Test
+    void everyKeyIsReadable() {
+        for (ActionGroup group : actions) {
+            for (Action action : group.actions()) {
+                action.keys().forEach(key -> assertNotNull(KeyStroke.getKeyStroke(key), key));
+                assertFalse(action.keyNames().contains("_"), action.keyNames());
+            }
+        }
+        assertEquals("Shift+Page Up", KeyNames.of("shift PAGE_UP"));
+        assertEquals("?", KeyNames.of("typed ?"));
     }
 
     private static void type(Component component, int code) throws Exception {

@@ -50,7 +50,7 @@ class MoverTest {
     }
 
     private final Film film = new Film();
-    private final Queue<Conductor.Command> tasks = new ArrayDeque<>();
+    private final Queue<Playing.Command> tasks = new ArrayDeque<>();
     private final List<String> notices = new ArrayList<>();
     private final Mover mover = new Mover(film, tasks::add, notices::add);
 

@@ -14,6 +14,7 @@ import java.awt.Frame;
 import java.awt.Point;
 import java.awt.Rectangle;
 import java.awt.Robot;
+import java.awt.event.InputEvent;
 import java.awt.event.KeyEvent;
 import java.awt.image.BufferedImage;
 import java.util.concurrent.Callable;
@@ -25,17 +26,22 @@ import javax.swing.JFrame;
 import javax.swing.JLabel;
 import javax.swing.KeyStroke;
 import javax.swing.SwingUtilities;
+import javax.swing.text.JTextComponent;
 import org.junit.jupiter.api.AfterEach;
 
 /** A window, on a display, that plays real media; its test ends by closing it. */
 abstract class WindowFixture {
     FutureTask<Integer> playing;
     JFrame frame;
+    private Robot robot;
 
     @AfterEach
     void closeWindow() throws Exception {
         if (onWindow(ChoiceMenu::isOpen)) {
             press("ESCAPE");
+        }
+        if (onWindow(() -> frame.getMostRecentFocusOwner() instanceof JTextComponent)) {
+            press("ESCAPE"); // A field takes the letters.
         }
         if (!playing.isDone()) {
             press("Q");
@@ -52,13 +58,22 @@ abstract class WindowFixture {
     final void openSource(String source, String... options) throws Exception {
         PlayOptions parsed =
                 PlayOptions.of(
-                        Stream.of(usualOptions(), options, new String[] {source})
+                        Stream.of(memoryOptions(), usualOptions(), options, new String[] {source})
                                 .flatMap(Stream::of)
                                 .toArray(String[]::new));
         playing = new FutureTask<>(() -> PlayerWindow.play(parsed));
         new Thread(playing, "main").start();
         Wait.until("the window is open", () -> openFrame() != null);
         frame = openFrame();
+    }
+
+    private String[] memoryOptions() {
+        return remembers() ? new String[0] : new String[] {"--no-memory"};
+    }
+
+    /** Whether the window may keep things; where, the test says by an option. */
+    boolean remembers() {
+        return false;
     }
 
     /** Options that every player of the test gets. */
@@ -68,7 +83,10 @@ abstract class WindowFixture {
 
     private static JFrame openFrame() {
         for (Frame candidate : Frame.getFrames()) {
-            if (candidate instanceof JFrame window && window.isShowing()) {
+            // One that is still being made is listed, and says that it shows.
+            if (candidate instanceof JFrame window
+                    && window.isDisplayable()
+                    && window.isShowing()) {
                 return window;
             }
         }
@@ -93,6 +111,38 @@ abstract class WindowFixture {
     private Component keyboardTarget() {
         Component focused = frame.getMostRecentFocusOwner();
         return ChoiceMenu.isOpen() || focused == null ? frame.getRootPane() : focused;
+    }
+
+    /** Moves the pointer to a place of a component, from 0 to 1 across and down. */
+    final void pointAt(Component component, double across, double down) throws Exception {
+        Point place = onWindow(component::getLocationOnScreen);
+        robot().mouseMove(
+                place.x + (int) Math.round((component.getWidth() - 1) * across),
+                place.y + (int) Math.round((component.getHeight() - 1) * down));
+    }
+
+    /** Clicks into the middle of a component. */
+    final void click(Component component) throws Exception {
+        Wait.until("it can be clicked", () -> onWindow(component::isShowing));
+        onWindow(() -> {
+            if (component instanceof JComponent control) {
+                control.scrollRectToVisible(
+                        new Rectangle(control.getWidth(), control.getHeight()));
+            }
+            return null;
+        });
+        pointAt(component, 0.5, 0.5);
+        robot().mousePress(InputEvent.BUTTON1_DOWN_MASK);
+        robot().mouseRelease(InputEvent.BUTTON1_DOWN_MASK);
+        robot().waitForIdle();
+    }
+
+    /** The mouse and the screen as they are. */
+    final Robot robot() throws Exception {
+        if (robot == null) {
+            robot = new Robot();
+        }
+        return robot;
     }
 
     final void awaitPicture() throws Exception {

@@ -105,6 +105,26 @@ class LibraryCheckTest {
     }
 
     @Test
+    void theArchitectureIsCheckedBeforeTheVersion() throws Exception {
+        String refusal = refusal(
+                withNote(ElfFile.NOTE_OWNER, "0.9.1"), new Machine("linux", "armhf"), "1.0.0");
+        assertTrue(refusal.contains(" is built for x86_64, "), refusal);
+    }
+
+    @Test
+    void aNoteWithANegativeOrTooLargeSizeHasNoVersion() throws Exception {
+        for (int field : new int[] {120, 124}) {
+            for (int size : new int[] {-1, Integer.MIN_VALUE, 1000, Integer.MAX_VALUE}) {
+                Path file = withNote(ElfFile.NOTE_OWNER, "1.0.0");
+                byte[] bytes = Files.readAllBytes(file);
+                ByteBuffer.wrap(bytes).order(ByteOrder.LITTLE_ENDIAN).putInt(field, size);
+                assertNull(ElfFile.read(Files.write(file, bytes).toString()).version(),
+                        "with " + size + " at " + field);
+            }
+        }
+    }
+
+    @Test
     void whatIsNoLibraryIsRefusedInASentence() throws Exception {
         Path text = Files.writeString(folder.resolve("libtext.so"), "version 1\n".repeat(20));
         assertEquals("The native library cannot be used: " + text
