@@ -58,7 +58,7 @@ for pattern in "${patterns[@]}"; do
 done
 
 # What is written for a desktop and for readers of manuals names the command.
-grep -qx 'Exec=orv play %u' "$folder/usr/share/applications/com.quintora.orv.player.desktop" || fail "desktop entry"
+grep -qx 'Exec=orv play %U' "$folder/usr/share/applications/com.quintora.orv.player.desktop" || fail "desktop entry"
 [ -x "$folder/usr/bin/orv" ] || fail "no command"
 
 status=0

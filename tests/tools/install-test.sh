@@ -85,6 +85,8 @@ expect "info" "duration +0:03\.000" orv info "$film"
 expect "play" "3\.0 s of 3\.0 s.*" orv play --no-window --speed 32 "$film"
 orv thumbnail "$film" "$folder/a.png" || fail "thumbnail: status $?"
 [ "$(head -c 4 "$folder/a.png" | tail -c 3)" = PNG ] || fail "thumbnail: no picture"
+printf '11-22 10:00:01.000 1 1 I OrvMediaClient-JNI: OrvMediaClient_start(): %s\n' Enter Leave >"$folder/a log"
+expect "trace" "start +1 .*" orv trace "$folder/a log"
 expect "its version" "orv ${version//./\\.}" orv --version
 expect "its help" "Usage: orv COMMAND.*" orv
 status=0

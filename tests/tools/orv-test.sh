@@ -46,6 +46,10 @@ expect "another command" 2 "there is no command 'nonsense'" "$root/orv" nonsense
 expect "a path as a command" 2 "there is no command" "$root/orv" ../shell/common
 expect "an option first" 2 "options come after one" "$root/orv" --json info
 expect "another target" 2 "not 'mips'" "$root/orv" test --target mips
+expect "short tests without a sanitizer" 2 "--short goes with --sanitize alone." "$root/orv" test --short
+expect "a filter of the thread sanitizer" 2 "--sanitize thread takes no --filter" \
+    "$root/orv" test --sanitize thread --filter x
+expect "a sanitizer for a release" 2 "without --target and --release" "$root/orv" test --sanitize --target armhf
 expect "a target without a name" 2 "lacks its value" "$root/orv" test --target
 expect "another option of bench" 2 "bench does not know '--fast'" "$root/orv" bench --fast
 expect "another option of counts" 2 "counts does not know '--all'" "$root/orv" counts --all
@@ -57,6 +61,19 @@ expect "the trace of no native method" 1 "no native method with 'nonsense'" \
     "$root/tools/inspect/traces.py" "$root/tests/contract/traces" nonsense
 expect "traces from no folder" 1 "no traces in" "$root/tools/inspect/traces.py" "$folder/none"
 expect "rows of bench without a pattern" 2 "lacks its value" "$root/orv" bench --rows
+expect "engine-test without a library" 2 "Usage: ./orv engine-test LIB" "$root/orv" engine-test
+expect "help of engine-test" 0 "Usage: ./orv engine-test LIB" "$root/orv" engine-test --help
+expect "another option of engine-test" 2 "engine-test does not know '--fast'" \
+    "$root/orv" engine-test x.so --fast
+expect "two libraries" 2 "takes one library, not 'x.so' and 'y.so'" "$root/orv" engine-test x.so y.so
+expect "engine-test with options alone" 2 "lacks the engine's library" \
+    "$root/orv" engine-test --jobs 2
+expect "an address without a value" 2 "--address of engine-test lacks its value" \
+    "$root/orv" engine-test x.so --address
+expect "a limit of no seconds" 2 "--limit of engine-test is a whole number from 1 on, not '0'" \
+    "$root/orv" engine-test x.so --limit=0
+ORV_NO_INSTALL=1 expect "an engine that is not there" 2 "none.so: there is no such file; give" \
+    "$root/orv" engine-test "$folder/none.so"
 expect "another doctor" 2 "doctor does not know '--spell'" "$root/orv" doctor --spell x
 ORV_NO_INSTALL=1 expect "a tree that is not there" 2 "none: there is no such folder" \
     "$root/orv" doctor --tree "$folder/none"
