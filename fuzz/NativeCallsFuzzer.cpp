@@ -37,7 +37,7 @@ constexpr int kMostTracks = 8;
 enum Absence { kThrows, kStaysQuiet };
 
 struct Row {
-    const char* name;  // of the native function, behind the prefix
+    const char* name;  // of the native function, without its prefix
     const char* javaName;
     const char* signature;
     Absence absence;
@@ -104,7 +104,7 @@ struct Player {
     bool refuses = false;  // the engine answers other than with success
 };
 
-// Behind the prefix.
+// Without the prefix.
 #define NAME_OF(function) (&#function[sizeof("OrvMediaClient")])
 
 class Calls {
@@ -188,8 +188,10 @@ private:
         player->engine->albumArt = std::vector<uint8_t>(static_cast<size_t>(count));
     }
 
-    // Java sets a player up in its constructor: once.
+    // Java sets a player up in its constructor: once. It makes no call to a class whose
+    // initialization failed.
     bool isAllowed(const Row& row) const {
+        if (strcmp(row.name, "init") == 0) return failing == 0;
         return strcmp(row.name, "setup") != 0 || !player->wasSetUp;
     }
 
