@@ -138,13 +138,16 @@ void OpenMedia::onEnd() {
 }
 
 // mpv stands at the end of a section that was repeated until just now, which is like the
-// end of the media to it: a seek has it play what follows.
+// end of the media to it: a seek has it play what follows. Where that seek itself led to
+// no later end, another would not either.
 bool OpenMedia::goesOn() {
     const double position = mMpv.getDouble("time-pos").value_or(mWentOnFrom);
     const double ahead = mMpv.getDouble("demuxer-cache-duration").value_or(0);
-    if (!endsEarly() || ahead < kAhead || position == mWentOnFrom) return false;
-    if (mState.phase() != Phase::Started) return false;
+    if (!endsEarly() || ahead < kAhead || mState.phase() != Phase::Started) return false;
+    const uint64_t seeks = mState.read([](const PlayerState::Values& v) { return v.seeks; });
+    if (position <= mWentOnFrom && seeks <= mSeeksBefore + 1) return false;
     mWentOnFrom = position;
+    mSeeksBefore = seeks;
     return mMpv.seek(position, "absolute+exact") >= 0;
 }
 

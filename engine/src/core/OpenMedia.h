@@ -92,7 +92,8 @@ private:
     FailureCause mCause;
     // An end that waits for the log lines about its cause.
     bool mEndReached = false;
-    double mWentOnFrom = -1;  // the position, seconds
+    double mWentOnFrom = -1;    // the position, seconds
+    uint64_t mSeeksBefore = 0;  // that
     std::atomic<bool> mLooksForEnd{false};
     std::optional<android::status_t> mLoadFailed;
     uint64_t mFailedSession = 0;
