@@ -183,8 +183,14 @@ final class Session {
         }
     }
 
-    /** Plays on: the position changes, or the media end. */
+    /**
+     * Plays on: the position changes, or the media end. All that is left of damaged media may be
+     * one picture, which would be repeated at one position.
+     */
     void awaitMoving() throws InterruptedException {
+        if (!subject.expectation.isWell()) {
+            player.setLooping(false);
+        }
         int from = player.getCurrentPosition();
         while (player.getCurrentPosition() == from && player.getState() == PlayerState.STARTED) {
             Thread.sleep(POLL_MILLIS);
