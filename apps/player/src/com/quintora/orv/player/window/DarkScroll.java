@@ -61,6 +61,7 @@ final class DarkScroll extends JScrollPane {
         private static JButton none() {
             JButton button = new JButton();
             button.setPreferredSize(new Dimension());
+            button.setVisible(false); // Or Tab, and screen readers, would find it.
             return button;
         }
     }

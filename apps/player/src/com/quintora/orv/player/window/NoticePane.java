@@ -7,6 +7,8 @@ import java.awt.Color;
 import java.awt.Component;
 import java.awt.Graphics;
 import java.awt.Graphics2D;
+import javax.accessibility.AccessibleContext;
+import javax.accessibility.AccessibleRole;
 import javax.swing.JPanel;
 import javax.swing.Timer;
 
@@ -77,6 +79,21 @@ final class NoticePane extends JPanel {
 
     private String words() {
         return notice.isEmpty() ? lasting : notice;
+    }
+
+    /** Not any panel: something is drawn there. */
+    @Override
+    public AccessibleContext getAccessibleContext() {
+        if (accessibleContext == null) {
+            accessibleContext =
+                    new AccessibleJPanel() {
+                        @Override
+                        public AccessibleRole getAccessibleRole() {
+                            return AccessibleRole.CANVAS;
+                        }
+                    };
+        }
+        return accessibleContext;
     }
 
     boolean hasWords() {

@@ -469,6 +469,8 @@ final class Stage {
     private void giveFocusToPicture() {
         room.setFocusable(true);
         room.getAccessibleContext().setAccessibleName("Picture");
+        // Which has the focus while a menu is open.
+        frame.getRootPane().getAccessibleContext().setAccessibleName("Player");
         frame.setFocusTraversalPolicy(
                 new LayoutFocusTraversalPolicy() {
                     @Override
