@@ -2,6 +2,7 @@
 package com.quintora.orv.player.window;
 
 import com.quintora.mmp.Chapter;
+import com.quintora.orv.player.ReadingOrder;
 import com.quintora.orv.player.Times;
 import java.util.ArrayList;
 import java.util.List;
@@ -63,7 +64,10 @@ final class Chapters {
             boolean isNow = now.isPresent() && now.getAsInt() == i;
             choices.add(
                     new ChoiceMenu.Choice(
-                            Times.clock(start(i)) + "  " + name(i),
+                            ReadingOrder.ofSentence(
+                                    Times.clock(start(i))
+                                            + "  "
+                                            + ReadingOrder.ofName(name(i))),
                             isNow,
                             () -> goTo.accept(index)));
         }

@@ -6,6 +6,7 @@ import com.quintora.mmp.desktop.VideoFrame;
 import com.quintora.orv.player.Fact;
 import com.quintora.orv.player.Failure;
 import com.quintora.orv.player.PlayOptions;
+import com.quintora.orv.player.ReadingOrder;
 import com.quintora.orv.player.Session;
 import com.quintora.orv.player.Snapshot;
 import com.quintora.orv.player.Times;
@@ -360,7 +361,7 @@ final class Conductor implements Controls, Playing.Listener {
         failuresInARow++;
         OptionalInt next = list.next();
         if (next.isPresent() && failuresInARow < list.entries().size()) {
-            String name = list.currentEntry().name();
+            String name = ReadingOrder.ofName(list.currentEntry().name());
             play(next.getAsInt());
             stage.tellLong("“" + name + "” cannot be played: " + failure.getMessage());
         } else {

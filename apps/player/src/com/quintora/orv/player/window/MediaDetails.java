@@ -6,6 +6,7 @@ import com.quintora.mmp.MediaMetadata;
 import com.quintora.mmp.OrvMediaPlayer;
 import com.quintora.mmp.SubtitleTrack;
 import com.quintora.mmp.Track;
+import com.quintora.orv.player.ReadingOrder;
 import com.quintora.orv.player.TrackNames;
 import java.awt.image.BufferedImage;
 import java.io.ByteArrayInputStream;
@@ -103,7 +104,8 @@ final class MediaDetails {
 
     private static ChoiceMenu.Choice choice(
             String text, boolean chosen, int index, IntConsumer select) {
-        return new ChoiceMenu.Choice(text, chosen, () -> select.accept(index));
+        return new ChoiceMenu.Choice(
+                ReadingOrder.ofSentence(text), chosen, () -> select.accept(index));
     }
 
     private static boolean isAt(Optional<? extends Track> current, Track track) {

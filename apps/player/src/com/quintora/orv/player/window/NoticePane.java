@@ -2,6 +2,7 @@
 package com.quintora.orv.player.window;
 
 import com.quintora.orv.player.Ellipsis;
+import com.quintora.orv.player.ReadingOrder;
 import java.awt.CardLayout;
 import java.awt.Color;
 import java.awt.Component;
@@ -122,7 +123,8 @@ final class NoticePane extends JPanel {
         Graphics2D g = Theme.smooth(graphics);
         g.setFont(Theme.BODY.deriveFont(16f));
         var metrics = g.getFontMetrics();
-        String words = Ellipsis.inMiddle(all, metrics, getWidth() - 68);
+        String words =
+                Ellipsis.inMiddle(ReadingOrder.ofSentence(all), metrics, getWidth() - 68);
         int width = metrics.stringWidth(words) + 28;
         int height = metrics.getHeight() + 16;
         g.setColor(new Color(0, 0, 0, 170));

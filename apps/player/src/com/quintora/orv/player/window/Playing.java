@@ -11,6 +11,7 @@ import com.quintora.mmp.desktop.DesktopSurfaceView;
 import com.quintora.orv.player.Fact;
 import com.quintora.orv.player.Failure;
 import com.quintora.orv.player.Previews;
+import com.quintora.orv.player.ReadingOrder;
 import com.quintora.orv.player.Section;
 import com.quintora.orv.player.Session;
 import com.quintora.orv.player.Snapshot;
@@ -260,7 +261,7 @@ final class Playing {
 
     private void goToChapter(int index) throws Failure {
         int end = session.seekTo(details.chapters().start(index));
-        tell(details.chapters().name(index) + "  " + Times.clock(end));
+        tell(ReadingOrder.ofName(details.chapters().name(index)) + "  " + Times.clock(end));
     }
 
     void chooseChapter(Component above) {

@@ -4,6 +4,7 @@ package com.quintora.orv.player.window;
 import com.quintora.mmp.desktop.DesktopSurfaceView;
 import com.quintora.mmp.desktop.VideoFrame;
 import com.quintora.orv.player.Previews;
+import com.quintora.orv.player.ReadingOrder;
 import com.quintora.orv.player.Snapshot;
 import com.quintora.orv.player.playlist.Playlist;
 import java.awt.Color;
@@ -259,7 +260,7 @@ final class Stage {
             video.draw(details.cover());
         } else if (!details.hasVideo()) {
             String title = details.title().isEmpty() ? name : details.title();
-            tellInstead(Glyph.AUDIO, Theme.ACCENT, title, details.artist());
+            tellInstead(Glyph.AUDIO, Theme.ACCENT, title, ReadingOrder.ofName(details.artist()));
         }
     }
 

@@ -2,6 +2,7 @@
 package com.quintora.orv.player.window;
 
 import com.quintora.orv.player.Ellipsis;
+import com.quintora.orv.player.ReadingOrder;
 import java.awt.Component;
 import java.awt.Point;
 import java.awt.Window;
@@ -54,7 +55,11 @@ final class WordsWindow {
             window.add(label);
         }
         int room = picture.getWidth() - 2 * PLACE - 28;
-        label.setText(Ellipsis.inMiddle(words, label.getFontMetrics(label.getFont()), room));
+        label.setText(
+                Ellipsis.inMiddle(
+                        ReadingOrder.ofSentence(words),
+                        label.getFontMetrics(label.getFont()),
+                        room));
         window.pack();
         place();
         window.setVisible(true);
