@@ -16,7 +16,8 @@ import sys
 from pathlib import Path
 
 COMPLAINT = re.compile(r"WARNING in native method: (.*)|WARNING: (JNI local refs: .*)")
-FRAME = re.compile(r"\s+at ([\w.$/]+)\(")
+# Another frame is of a stack that another thread is writing.
+FRAME = re.compile(r"\s+at ([\w.$/]+)\([^)]*Native Method\)")
 NATIVE_THREAD = "a native thread"
 # How far from its first line a complaint's place can be when threads write at a time.
 REACH = 6

@@ -75,6 +75,21 @@ class CheckedJavaTest(unittest.TestCase):
         if COUNTS_REFERENCES:
             self.assertEqual(1, run(own, "keepReferences")[0])
 
+    def test_the_stack_of_another_thread_is_no_place(self):
+        written = (
+            "WARNING in native method: a mistake\n"
+            "\tat java.util.List.of(java.base@17/List.java:1)\n"
+            "\tat Torn.apart(java.desktop@17/Native Method)\n"
+        )
+        with tempfile.NamedTemporaryFile("w", suffix=".txt") as rules:
+            command = [CHECKER, rules.name, "printf", "%s", written]
+            done = subprocess.run(command, stdout=subprocess.PIPE, check=False, encoding="utf-8")
+        self.assertEqual(1, done.returncode)
+        self.assertIn(
+            "not expected of -Xcheck:jni: 1 times in Torn.apart: a mistake",
+            done.stdout.splitlines(),
+        )
+
     def test_the_status_of_java_is_kept(self):
         status, _ = check("noSuchMethod")
         self.assertEqual(1, status)
