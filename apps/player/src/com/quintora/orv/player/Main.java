@@ -62,6 +62,7 @@ public final class Main {
                 .registerConverter(int.class, Main::wholeNumber)
                 .registerConverter(Integer.class, Main::wholeNumber)
                 .registerConverter(double.class, Main::number)
+                .registerConverter(Double.class, Main::number)
                 .setParameterExceptionHandler(Main::sayUsage)
                 .setExecutionExceptionHandler(Main::tellFailure);
     }

@@ -44,6 +44,8 @@ final class PlayCommand implements Callable<Integer> {
     private void check() {
         int volume = options.volume().orElse(100);
         require(volume >= 0 && volume <= 100, "--volume is 0 to 100");
+        double scale = options.scale().orElse(1);
+        require(scale >= 1 && scale <= 4, "--scale is 1 to 4");
         double speed = Math.abs(options.speed);
         require(
                 speed >= PlayOptions.MIN_SPEED && speed <= TrickPlay.MAX_SPEED,

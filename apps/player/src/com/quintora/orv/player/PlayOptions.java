@@ -11,6 +11,7 @@ import com.quintora.orv.player.playlist.Repeat;
 import java.nio.file.Path;
 import java.util.List;
 import java.util.Optional;
+import java.util.OptionalDouble;
 import java.util.OptionalInt;
 import java.util.stream.Stream;
 import picocli.CommandLine;
@@ -38,6 +39,7 @@ public final class PlayOptions implements Cloneable {
     Path memoryFile;
     boolean noGpu;
     boolean gpu;
+    Double scale;
     boolean stats;
     Path screenshotFolder;
 
@@ -109,6 +111,13 @@ public final class PlayOptions implements Cloneable {
                 "Draw the window's pictures by software, not by the graphics processor.");
         arguments.addFlag(
                 "--gpu", value -> gpu = value, "Draw by OpenGL also where that is only software.");
+        arguments.add(
+                Arguments.option("--scale", Double.class, value -> scale = value)
+                        .paramLabel("FACTOR")
+                        .description(
+                                "How many times as large as usual the window's controls and letters"
+                                        + " are, 1 to 4; without it, as the desktop wishes.")
+                        .build());
         arguments.addFlag(
                 "--stats",
                 value -> stats = value,
@@ -237,6 +246,11 @@ public final class PlayOptions implements Cloneable {
     /** 0 to 100, if it was asked for. */
     public OptionalInt volume() {
         return volume == null ? OptionalInt.empty() : OptionalInt.of(volume);
+    }
+
+    /** How many times as large as usual the window's controls are, if it was asked for: 1 to 4. */
+    public OptionalDouble scale() {
+        return scale == null ? OptionalDouble.empty() : OptionalDouble.of(scale);
     }
 
     /** When the graphics processor draws the pictures; the last word is --no-gpu's. */

@@ -24,7 +24,7 @@ public final class Previews implements AutoCloseable {
     private static final int ROWS = 108;
     private static final int MOST_COLUMNS = 256;
 
-    // Some seven megabytes at most.
+    // Some seven megabytes at most; of larger ones there are fewer.
     private static final int MOST_KEPT = 64;
 
     // Of the whole length; a bar has not many more pixels.
@@ -35,6 +35,7 @@ public final class Previews implements AutoCloseable {
     private final String source;
     private final int durationMs;
     private final Size size;
+    private final int mostKept;
     private final BiConsumer<Integer, BufferedImage> onPicture;
     private final ReentrantLock lock = new ReentrantLock();
     private final Condition wished = lock.newCondition();
@@ -44,7 +45,7 @@ public final class Previews implements AutoCloseable {
             new LinkedHashMap<>(16, 0.75f, true) {
                 @Override
                 protected boolean removeEldestEntry(Map.Entry<Integer, BufferedImage> eldest) {
-                    return size() > MOST_KEPT;
+                    return size() > mostKept;
                 }
             };
     private int wish = NOTHING;
@@ -58,14 +59,18 @@ public final class Previews implements AutoCloseable {
             String source,
             int durationMs,
             Size video,
+            double scale,
             BiConsumer<Integer, BufferedImage> onPicture) {
         this.source = source;
         this.durationMs = durationMs;
         this.onPicture = onPicture;
-        int columns = video.withHeight(ROWS).width();
-        size = columns <= MOST_COLUMNS
-                ? new Size(columns, ROWS)
-                : new Size(MOST_COLUMNS, Math.max(1, ROWS * MOST_COLUMNS / columns));
+        int rows = (int) Math.round(ROWS * scale);
+        int mostColumns = (int) Math.round(MOST_COLUMNS * scale);
+        mostKept = (int) (MOST_KEPT / (scale * scale));
+        int columns = video.withHeight(rows).width();
+        size = columns <= mostColumns
+                ? new Size(columns, rows)
+                : new Size(mostColumns, Math.max(1, rows * mostColumns / columns));
     }
 
     /** Of which part of the media that time is; pictures are made of parts. */

@@ -242,10 +242,12 @@ public final class Session implements AutoCloseable {
      * Makes small pictures of its media beside it, once it is open, from when they are asked for.
      * Empty for media without a picture or an end, and for what is no file.
      *
+     * @param scale how many times as large as usual they are, 1 to 4
      * @param onPicture is called with each picture and the part that it is of, on a thread of their
      *     own
      */
-    public Optional<Previews> previews(BiConsumer<Integer, BufferedImage> onPicture) {
+    public Optional<Previews> previews(
+            double scale, BiConsumer<Integer, BufferedImage> onPicture) {
         boolean isPossible =
                 player.getVideoWidth() > 0
                         && player.getDuration() > 0
@@ -257,6 +259,7 @@ public final class Session implements AutoCloseable {
                                 options.source,
                                 player.getDuration(),
                                 ShownPicture.sizeOf(player),
+                                scale,
                                 onPicture))
                 : Optional.empty();
     }

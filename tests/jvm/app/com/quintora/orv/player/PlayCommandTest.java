@@ -116,6 +116,9 @@ class PlayCommandTest {
     @CsvSource({
         "--ab 1:2 --speed -1 some.mkv, --ab repeats a section forward; --speed is negative",
         "--ab 1:2 --start 1 some.mkv, --ab begins at the section's start; leave --start out",
+        "--scale 0.9 some.mkv, --scale is 1 to 4",
+        "--scale 4.1 some.mkv, --scale is 1 to 4",
+        "--scale NaN some.mkv, --scale is 1 to 4",
         "--pcm 44100:2:s16le, --pcm describes a file of raw PCM; name the file"
     })
     void whatDoesNotGoTogetherIsAQuestionOfUsage(String arguments, String sentence) {

@@ -5,7 +5,6 @@ import java.awt.Component;
 import java.awt.Dimension;
 import java.awt.Graphics;
 import java.util.List;
-import javax.swing.BorderFactory;
 import javax.swing.JMenu;
 import javax.swing.JMenuItem;
 import javax.swing.JPopupMenu;
@@ -28,7 +27,7 @@ final class ActionMenu {
     static void openAbove(Component button, List<ActionGroup> groups) {
         JPopupMenu menu = menuOf(groups);
         Dimension size = menu.getPreferredSize();
-        menu.show(button, button.getWidth() - size.width, -size.height - Theme.GAP);
+        menu.show(button, button.getWidth() - size.width, -size.height - Theme.gap());
         select(menu);
     }
 
@@ -41,7 +40,7 @@ final class ActionMenu {
 
     private static void dress(JPopupMenu menu) {
         menu.setBackground(Theme.RAISED);
-        menu.setBorder(BorderFactory.createEmptyBorder(6, 0, 6, 0));
+        menu.setBorder(Theme.border(6, 0, 6, 0));
     }
 
     // So that the arrow keys begin at the first row.

@@ -16,7 +16,7 @@ final class Card extends JPanel {
     protected void paintComponent(Graphics graphics) {
         var g = Theme.smooth(graphics);
         g.setColor(Theme.PANEL);
-        g.fillRoundRect(0, 0, getWidth(), getHeight(), 2 * Theme.CORNER, 2 * Theme.CORNER);
+        g.fillRoundRect(0, 0, getWidth(), getHeight(), 2 * Theme.corner(), 2 * Theme.corner());
         g.dispose();
     }
 }

@@ -23,7 +23,7 @@ final class ChoiceButton extends JToggleButton {
         this.color = color;
         setToolTipText(of + ": " + name);
         getAccessibleContext().setAccessibleName(of + ": " + name);
-        setFont(Theme.SMALL);
+        setFont(Theme.small());
         setOpaque(false);
         setContentAreaFilled(false);
         setBorderPainted(false);
@@ -37,8 +37,12 @@ final class ChoiceButton extends JToggleButton {
 
     @Override
     public Dimension getPreferredSize() {
-        int width = isSwatch() ? HEIGHT : getFontMetrics(getFont()).stringWidth(word) + 14;
-        return new Dimension(width, HEIGHT);
+        int height = Theme.px(HEIGHT);
+        int width =
+                isSwatch()
+                        ? height
+                        : getFontMetrics(getFont()).stringWidth(word) + Theme.px(14);
+        return new Dimension(width, height);
     }
 
     @Override
@@ -51,7 +55,7 @@ final class ChoiceButton extends JToggleButton {
         Graphics2D g = Theme.smooth(graphics);
         if (isSelected() || getModel().isRollover()) {
             g.setColor(isSelected() ? Theme.TRACK : Theme.HOVER);
-            g.fillRoundRect(0, 0, getWidth(), getHeight(), Theme.CORNER, Theme.CORNER);
+            g.fillRoundRect(0, 0, getWidth(), getHeight(), Theme.corner(), Theme.corner());
         }
         if (isSwatch()) {
             paintSwatch(g);
@@ -63,13 +67,14 @@ final class ChoiceButton extends JToggleButton {
     }
 
     private void paintSwatch(Graphics2D g) {
-        int left = (getWidth() - SWATCH) / 2;
-        int top = (getHeight() - SWATCH) / 2;
+        int size = Theme.px(SWATCH);
+        int left = (getWidth() - size) / 2;
+        int top = (getHeight() - size) / 2;
         g.setColor(color);
-        g.fillOval(left, top, SWATCH, SWATCH);
+        g.fillOval(left, top, size, size);
         g.setColor(isSelected() ? Theme.ACCENT : Theme.BUFFERED);
-        g.setStroke(new BasicStroke(isSelected() ? 2 : 1));
-        g.drawOval(left, top, SWATCH, SWATCH);
+        g.setStroke(new BasicStroke(Theme.px(isSelected() ? 2 : 1)));
+        g.drawOval(left, top, size, size);
     }
 
     private void paintWord(Graphics2D g) {

@@ -5,7 +5,6 @@ import java.awt.Component;
 import java.awt.Dimension;
 import java.awt.Graphics;
 import java.util.List;
-import javax.swing.BorderFactory;
 import javax.swing.JLabel;
 import javax.swing.JMenuItem;
 import javax.swing.JPopupMenu;
@@ -25,11 +24,11 @@ final class ChoiceMenu {
     static void open(Component above, String title, List<Choice> choices) {
         JPopupMenu menu = new JPopupMenu(title);
         menu.setBackground(Theme.RAISED);
-        menu.setBorder(BorderFactory.createEmptyBorder(6, 0, 6, 0));
+        menu.setBorder(Theme.border(6, 0, 6, 0));
         JLabel heading = new JLabel(title);
-        heading.setFont(Theme.SMALL);
+        heading.setFont(Theme.small());
         heading.setForeground(Theme.MUTED);
-        heading.setBorder(BorderFactory.createEmptyBorder(4, 14, 6, 14));
+        heading.setBorder(Theme.border(4, 14, 6, 14));
         menu.add(heading);
         JMenuItem present = null;
         for (Choice choice : choices) {
@@ -37,7 +36,7 @@ final class ChoiceMenu {
             present = present == null || choice.chosen ? item : present;
         }
         Dimension size = menu.getPreferredSize();
-        menu.show(above, above.getWidth() - size.width, -size.height - Theme.GAP);
+        menu.show(above, above.getWidth() - size.width, -size.height - Theme.gap());
         MenuSelectionManager.defaultManager()
                 .setSelectedPath(new MenuElement[] {menu, present});
     }

@@ -7,7 +7,6 @@ import java.awt.BorderLayout;
 import java.awt.Component;
 import java.awt.event.MouseAdapter;
 import java.awt.event.MouseEvent;
-import javax.swing.BorderFactory;
 import javax.swing.Box;
 import javax.swing.JLabel;
 import javax.swing.JPanel;
@@ -40,7 +39,7 @@ final class ControlBar extends JPanel {
     private final FlatButton fullScreen;
 
     ControlBar(Controls controls) {
-        super(new BorderLayout(0, 4));
+        super(new BorderLayout(0, Theme.px(4)));
         seekBar = new SeekBar(controls::seekTo, step -> controls.skip(step * SKIP_MS));
         play = new FlatButton(Glyph.PLAY, "Play (Space)", controls::togglePlaying);
         previous = new FlatButton(Glyph.PREVIOUS, "Previous one (P)", controls::previous);
@@ -87,7 +86,7 @@ final class ControlBar extends JPanel {
                     }
                 });
         setBackground(Theme.PANEL);
-        setBorder(BorderFactory.createEmptyBorder(8, 14, 10, 14));
+        setBorder(Theme.border(8, 14, 10, 14));
         add(timeRow(), BorderLayout.NORTH);
         add(buttonRow(), BorderLayout.CENTER);
     }
@@ -187,7 +186,7 @@ final class ControlBar extends JPanel {
     }
 
     private JPanel timeRow() {
-        JPanel row = new JPanel(new BorderLayout(Theme.GAP, 0));
+        JPanel row = new JPanel(new BorderLayout(Theme.gap(), 0));
         row.setOpaque(false);
         row.add(elapsed, BorderLayout.WEST);
         row.add(seekBar, BorderLayout.CENTER);
@@ -202,7 +201,7 @@ final class ControlBar extends JPanel {
         row.add(next);
         row.add(back);
         row.add(forward);
-        row.add(Box.createHorizontalStrut(Theme.GAP));
+        row.add(Box.createHorizontalStrut(Theme.gap()));
         row.add(mute);
         volume.setMaximumSize(volume.getPreferredSize());
         row.add(volume);
@@ -219,7 +218,7 @@ final class ControlBar extends JPanel {
 
     private static JLabel label(String text) {
         JLabel label = new JLabel(text);
-        label.setFont(Theme.SMALL);
+        label.setFont(Theme.small());
         label.setForeground(Theme.MUTED);
         return label;
     }

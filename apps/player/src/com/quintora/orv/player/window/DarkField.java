@@ -15,11 +15,11 @@ final class DarkField {
         field.setCaretColor(Theme.TEXT);
         field.setSelectionColor(Theme.TRACK);
         field.setSelectedTextColor(Theme.TEXT);
-        field.setFont(Theme.BODY);
+        field.setFont(Theme.body());
         field.setBorder(
                 BorderFactory.createCompoundBorder(
                         BorderFactory.createLineBorder(Theme.TRACK),
-                        BorderFactory.createEmptyBorder(4, 8, 4, 8)));
+                        Theme.border(4, 8, 4, 8)));
         field.setToolTipText(name);
         field.getAccessibleContext().setAccessibleName(name);
         return field;

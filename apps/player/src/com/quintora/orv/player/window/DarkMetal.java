@@ -10,7 +10,7 @@ import javax.swing.plaf.metal.DefaultMetalTheme;
 final class DarkMetal extends DefaultMetalTheme {
     private static final ColorUIResource TEXT = resource(Theme.TEXT);
     private static final ColorUIResource FIELD = resource(Theme.STAGE);
-    private static final FontUIResource FONT = new FontUIResource(Theme.BODY);
+    private final FontUIResource font = new FontUIResource(Theme.body());
 
     private static ColorUIResource resource(Color color) {
         return new ColorUIResource(color);
@@ -80,31 +80,31 @@ final class DarkMetal extends DefaultMetalTheme {
 
     @Override
     public FontUIResource getControlTextFont() {
-        return FONT;
+        return font;
     }
 
     @Override
     public FontUIResource getSystemTextFont() {
-        return FONT;
+        return font;
     }
 
     @Override
     public FontUIResource getUserTextFont() {
-        return FONT;
+        return font;
     }
 
     @Override
     public FontUIResource getMenuTextFont() {
-        return FONT;
+        return font;
     }
 
     @Override
     public FontUIResource getWindowTitleFont() {
-        return FONT;
+        return font;
     }
 
     @Override
     public FontUIResource getSubTextFont() {
-        return new FontUIResource(Theme.SMALL);
+        return new FontUIResource(Theme.small());
     }
 }

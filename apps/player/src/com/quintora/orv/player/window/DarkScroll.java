@@ -14,8 +14,7 @@ import javax.swing.plaf.basic.BasicScrollBarUI;
 
 /** Scrolls what it holds, with narrow bars in the window's look. */
 final class DarkScroll extends JScrollPane {
-    /** A bar's width in pixels. */
-    static final int BAR = 10;
+    private static final int BAR = 10;
 
     private static final int STEP = 20;
 
@@ -28,10 +27,15 @@ final class DarkScroll extends JScrollPane {
         dress(getHorizontalScrollBar());
     }
 
+    /** A bar's width in pixels. */
+    static int bar() {
+        return Theme.px(BAR);
+    }
+
     private static void dress(JScrollBar bar) {
         bar.setUI(new Thumb());
-        bar.setUnitIncrement(STEP);
-        bar.setPreferredSize(new Dimension(BAR, BAR));
+        bar.setUnitIncrement(Theme.px(STEP));
+        bar.setPreferredSize(new Dimension(bar(), bar()));
         bar.setOpaque(false);
     }
 
@@ -43,8 +47,11 @@ final class DarkScroll extends JScrollPane {
         protected void paintThumb(Graphics graphics, JComponent bar, Rectangle place) {
             var g = Theme.smooth(graphics);
             g.setColor(isDragging ? Theme.BUFFERED : Theme.TRACK);
+            int edge = Theme.px(2);
             g.fillRoundRect(
-                    place.x + 2, place.y + 2, place.width - 4, place.height - 4, BAR, BAR);
+                    place.x + edge, place.y + edge,
+                    place.width - 2 * edge, place.height - 2 * edge,
+                    bar(), bar());
             g.dispose();
         }
 

@@ -62,11 +62,11 @@ final class Desktop {
 
     // Found with the first text that is drawn.
     private static void loadFonts() {
-        var image = new BufferedImage(Theme.BUTTON, Theme.BUTTON, BufferedImage.TYPE_INT_RGB);
+        var image = new BufferedImage(Theme.button(), Theme.button(), BufferedImage.TYPE_INT_RGB);
         Graphics2D g = Theme.smooth(image.getGraphics());
-        for (Font font : List.of(Theme.BODY, Theme.SMALL, Theme.TITLE)) {
+        for (Font font : List.of(Theme.body(), Theme.small(), Theme.title())) {
             g.setFont(font);
-            g.drawString("0:00", 0, Theme.BUTTON);
+            g.drawString("0:00", 0, Theme.button());
         }
         g.dispose();
     }

@@ -21,7 +21,7 @@ final class FlatButton extends JButton {
         setOpaque(false);
         setContentAreaFilled(false);
         setBorderPainted(false);
-        setFont(Theme.BODY);
+        setFont(Theme.body());
         addActionListener(event -> action.run());
     }
 
@@ -40,8 +40,11 @@ final class FlatButton extends JButton {
 
     @Override
     public Dimension getPreferredSize() {
-        int text = getText().isEmpty() ? 0 : getFontMetrics(getFont()).stringWidth(getText()) + 16;
-        return new Dimension(Math.max(Theme.BUTTON, text), Theme.BUTTON);
+        int text =
+                getText().isEmpty()
+                        ? 0
+                        : getFontMetrics(getFont()).stringWidth(getText()) + Theme.px(16);
+        return new Dimension(Math.max(Theme.button(), text), Theme.button());
     }
 
     @Override
@@ -54,7 +57,7 @@ final class FlatButton extends JButton {
         Graphics2D g = Theme.smooth(graphics);
         if (isEnabled() && (getModel().isRollover() || getModel().isPressed())) {
             g.setColor(getModel().isPressed() ? Theme.TRACK : Theme.HOVER);
-            g.fillRoundRect(0, 0, getWidth(), getHeight(), Theme.CORNER, Theme.CORNER);
+            g.fillRoundRect(0, 0, getWidth(), getHeight(), Theme.corner(), Theme.corner());
         }
         paintContent(g);
         Theme.paintFocus(g, this);
@@ -64,12 +67,9 @@ final class FlatButton extends JButton {
     private void paintContent(Graphics2D g) {
         var color = isEnabled() ? Theme.TEXT : Theme.BUFFERED;
         if (getText().isEmpty()) {
+            int size = Theme.px(GLYPH_SIZE);
             glyph.paint(
-                    g,
-                    (getWidth() - GLYPH_SIZE) / 2.0,
-                    (getHeight() - GLYPH_SIZE) / 2.0,
-                    GLYPH_SIZE,
-                    color);
+                    g, (getWidth() - size) / 2.0, (getHeight() - size) / 2.0, size, color);
             return;
         }
         FontMetrics metrics = g.getFontMetrics(getFont());

@@ -14,7 +14,6 @@ import java.awt.event.MouseAdapter;
 import java.awt.event.MouseEvent;
 import java.util.ArrayList;
 import java.util.List;
-import javax.swing.BorderFactory;
 import javax.swing.Box;
 import javax.swing.BoxLayout;
 import javax.swing.JComponent;
@@ -85,7 +84,7 @@ final class Help extends JPanel {
     }
 
     private Dimension room() {
-        return new Dimension(getWidth() - 2 * MARGIN, getHeight() - 2 * MARGIN);
+        return new Dimension(getWidth() - 2 * Theme.px(MARGIN), getHeight() - 2 * Theme.px(MARGIN));
     }
 
     // In a small window not all of it is seen at a time.
@@ -95,14 +94,14 @@ final class Help extends JPanel {
         boolean isCut = isTooHigh(card);
         pane.setPreferredSize(
                 new Dimension(
-                        Math.min(size.width + (isCut ? DarkScroll.BAR : 0), room().width),
+                        Math.min(size.width + (isCut ? DarkScroll.bar() : 0), room().width),
                         Math.min(size.height, room().height)));
         return pane;
     }
 
     private JComponent cardOf(int columns) {
         JPanel card = new Card(new GridBagLayout());
-        card.setBorder(BorderFactory.createEmptyBorder(14, 22, 14, 8));
+        card.setBorder(Theme.border(14, 22, 14, 8));
         int column = 0;
         for (List<ActionGroup> part : spread(columns)) {
             JPanel list = new JPanel();
@@ -145,14 +144,14 @@ final class Help extends JPanel {
         JPanel list = new JPanel(new GridBagLayout());
         list.setOpaque(false);
         list.setAlignmentX(LEFT_ALIGNMENT);
-        list.setBorder(BorderFactory.createEmptyBorder(0, 0, 10, 0));
-        JLabel heading = label(group.name(), Theme.SMALL);
+        list.setBorder(Theme.border(0, 0, 10, 0));
+        JLabel heading = label(group.name(), Theme.small());
         heading.setForeground(Theme.ACCENT);
         list.add(heading, at(0, 0, 14));
         int row = 1;
         for (Action action : group.actions().stream().filter(Help::hasKeys).toList()) {
-            JLabel keys = label(action.keyNames(), Theme.BODY.deriveFont(Font.BOLD));
-            JLabel name = label(action.name(), Theme.BODY);
+            JLabel keys = label(action.keyNames(), Theme.body().deriveFont(Font.BOLD));
+            JLabel name = label(action.name(), Theme.body());
             keys.setLabelFor(name);
             list.add(keys, at(0, row, 14));
             list.add(name, at(1, row, 0));
@@ -176,7 +175,7 @@ final class Help extends JPanel {
         place.gridx = column;
         place.gridy = row;
         place.anchor = GridBagConstraints.NORTHWEST;
-        place.insets = new Insets(0, 0, 1, gap);
+        place.insets = new Insets(0, 0, Theme.px(1), Theme.px(gap));
         return place;
     }
 

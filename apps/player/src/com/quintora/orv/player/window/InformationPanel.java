@@ -6,7 +6,6 @@ import java.awt.BorderLayout;
 import java.awt.Dimension;
 import java.util.List;
 import java.util.stream.Collectors;
-import javax.swing.BorderFactory;
 import javax.swing.JTextArea;
 import javax.swing.Timer;
 
@@ -28,11 +27,11 @@ final class InformationPanel extends SidePanel {
         text.setLineWrap(true);
         text.setWrapStyleWord(true);
         text.setOpaque(false);
-        text.setFont(Theme.BODY);
+        text.setFont(Theme.body());
         text.setForeground(Theme.TEXT);
         text.setSelectionColor(Theme.TRACK);
         text.setSelectedTextColor(Theme.TEXT);
-        text.setBorder(BorderFactory.createEmptyBorder(0, 14, 8, 8));
+        text.setBorder(Theme.border(0, 14, 8, 8));
         text.getAccessibleContext().setAccessibleName("Information");
         add(new DarkScroll(text), BorderLayout.CENTER);
         timer.setInitialDelay(0);
@@ -40,7 +39,7 @@ final class InformationPanel extends SidePanel {
 
     @Override
     public Dimension getPreferredSize() {
-        return new Dimension(WIDTH, super.getPreferredSize().height);
+        return new Dimension(Theme.px(WIDTH), super.getPreferredSize().height);
     }
 
     @Override

@@ -3,7 +3,6 @@ package com.quintora.orv.player.window;
 
 import java.awt.Color;
 import java.awt.Cursor;
-import java.awt.Dimension;
 import java.awt.Graphics;
 import java.awt.Graphics2D;
 import java.awt.event.FocusEvent;
@@ -18,9 +17,13 @@ import javax.swing.SwingUtilities;
 
 /** A horizontal bar from 0 to 1 that the user sets: the volume, or the place in the media. */
 class LevelBar extends JComponent {
+    static final int HEIGHT = 20;
+
     private static final int THICKNESS = 4;
     private static final int KNOB = 12;
 
+    private final int thickness = Theme.px(THICKNESS);
+    private final int knob = Theme.px(KNOB);
     private final DoubleConsumer onSet;
     private double level;
     private double behind;
@@ -30,8 +33,8 @@ class LevelBar extends JComponent {
     /** The keys step by -1 or 1; what a step is, the listener decides. */
     LevelBar(String name, int width, DoubleConsumer onSet, IntConsumer onStep) {
         this.onSet = onSet;
-        setPreferredSize(new Dimension(width, 20));
-        setMinimumSize(new Dimension(40, 20));
+        setPreferredSize(Theme.size(width, HEIGHT));
+        setMinimumSize(Theme.size(40, HEIGHT));
         setCursor(Cursor.getPredefinedCursor(Cursor.HAND_CURSOR));
         getAccessibleContext().setAccessibleName(name);
         Mouse mouse = new Mouse();
@@ -102,11 +105,11 @@ class LevelBar extends JComponent {
     }
 
     final double levelAt(int x) {
-        return clamp((x - KNOB / 2.0) / Math.max(1, getWidth() - KNOB));
+        return clamp((x - knob / 2.0) / Math.max(1, getWidth() - knob));
     }
 
     final double xOf(double level) {
-        return KNOB / 2.0 + level * (getWidth() - KNOB);
+        return knob / 2.0 + level * (getWidth() - knob);
     }
 
     @Override
@@ -126,7 +129,7 @@ class LevelBar extends JComponent {
         paintMarks(g);
         if (isEnabled() && (hovered || dragged || isFocusOwner())) {
             g.setColor(Theme.TEXT);
-            g.fillOval(lengthOf(level), (getHeight() - KNOB) / 2, KNOB, KNOB);
+            g.fillOval(lengthOf(level), (getHeight() - knob) / 2, knob, knob);
         }
         Theme.paintFocus(g, this);
         g.dispose();
@@ -140,18 +143,18 @@ class LevelBar extends JComponent {
             return;
         }
         g.setColor(color);
-        int left = KNOB / 2 - THICKNESS / 2;
+        int left = knob / 2 - thickness / 2;
         g.fillRoundRect(
-                left, (getHeight() - THICKNESS) / 2, widthOf(end), THICKNESS, THICKNESS, THICKNESS);
+                left, (getHeight() - thickness) / 2, widthOf(end), thickness, thickness, thickness);
     }
 
     /** In pixels of the window; 0 for an empty bar. */
     private int widthOf(double end) {
-        return end <= 0 ? 0 : lengthOf(end) + THICKNESS;
+        return end <= 0 ? 0 : lengthOf(end) + thickness;
     }
 
     private int lengthOf(double level) {
-        return (int) Math.round(level * (getWidth() - KNOB));
+        return (int) Math.round(level * (getWidth() - knob));
     }
 
     private static double clamp(double value) {

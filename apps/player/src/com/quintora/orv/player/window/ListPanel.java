@@ -9,7 +9,6 @@ import java.awt.Dimension;
 import java.awt.Font;
 import java.awt.event.MouseAdapter;
 import java.awt.event.MouseEvent;
-import javax.swing.BorderFactory;
 import javax.swing.Box;
 import javax.swing.DefaultListCellRenderer;
 import javax.swing.DefaultListModel;
@@ -53,8 +52,8 @@ final class ListPanel extends SidePanel {
         list.setForeground(Theme.TEXT);
         list.setSelectionBackground(Theme.HOVER);
         list.setSelectionForeground(Theme.TEXT);
-        list.setFont(Theme.BODY);
-        list.setFixedCellHeight(28);
+        list.setFont(Theme.body());
+        list.setFixedCellHeight(Theme.px(28));
         list.setCellRenderer(new Row());
         list.setSelectionMode(ListSelectionModel.SINGLE_SELECTION);
         list.getAccessibleContext().setAccessibleName("Playlist");
@@ -73,7 +72,7 @@ final class ListPanel extends SidePanel {
 
     private JComponent buttons() {
         Box row = Box.createHorizontalBox();
-        row.setBorder(BorderFactory.createEmptyBorder(4, 8, 4, 8));
+        row.setBorder(Theme.border(4, 8, 4, 8));
         row.add(button("Open…", "Open files (O)", controls::chooseFiles));
         row.add(Box.createHorizontalGlue());
         row.add(shuffle);
@@ -83,7 +82,7 @@ final class ListPanel extends SidePanel {
 
     @Override
     public Dimension getPreferredSize() {
-        return new Dimension(WIDTH, super.getPreferredSize().height);
+        return new Dimension(Theme.px(WIDTH), super.getPreferredSize().height);
     }
 
     @Override
@@ -133,9 +132,9 @@ final class ListPanel extends SidePanel {
                     super.getListCellRendererComponent(
                             list, ((Entry) value).name(), index, isSelected, false);
             boolean isCurrent = index == current;
-            setBorder(BorderFactory.createEmptyBorder(0, 14, 0, 8));
+            setBorder(Theme.border(0, 14, 0, 8));
             setForeground(isCurrent ? Theme.ACCENT : Theme.TEXT);
-            setFont(isCurrent ? Theme.BODY.deriveFont(Font.BOLD) : Theme.BODY);
+            setFont(isCurrent ? Theme.body().deriveFont(Font.BOLD) : Theme.body());
             setToolTipText(((Entry) value).source());
             return row;
         }

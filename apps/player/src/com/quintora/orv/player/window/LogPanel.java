@@ -10,7 +10,6 @@ import java.awt.Toolkit;
 import java.awt.datatransfer.StringSelection;
 import java.util.List;
 import java.util.Locale;
-import javax.swing.BorderFactory;
 import javax.swing.Box;
 import javax.swing.JComponent;
 import javax.swing.JPanel;
@@ -40,7 +39,7 @@ final class LogPanel extends SidePanel {
         this.controls = controls;
         least = new Stepper("Least priority", "More lines", "Fewer lines", this::step);
         text.setEditable(false);
-        text.setFont(new Font(Font.MONOSPACED, Font.PLAIN, 11));
+        text.setFont(new Font(Font.MONOSPACED, Font.PLAIN, Theme.px(11)));
         text.setBackground(Theme.STAGE);
         text.setForeground(Theme.TEXT);
         text.setCaretColor(Theme.TEXT);
@@ -53,9 +52,9 @@ final class LogPanel extends SidePanel {
     }
 
     private JComponent filters() {
-        JPanel row = new JPanel(new BorderLayout(Theme.GAP, 0));
+        JPanel row = new JPanel(new BorderLayout(Theme.gap(), 0));
         row.setOpaque(false);
-        row.setBorder(BorderFactory.createEmptyBorder(0, 14, 6, 8));
+        row.setBorder(Theme.border(0, 14, 6, 8));
         row.add(part, BorderLayout.CENTER);
         row.add(least, BorderLayout.EAST);
         return row;
@@ -63,7 +62,7 @@ final class LogPanel extends SidePanel {
 
     private JComponent buttons() {
         Box row = Box.createHorizontalBox();
-        row.setBorder(BorderFactory.createEmptyBorder(4, 8, 4, 8));
+        row.setBorder(Theme.border(4, 8, 4, 8));
         row.add(button("Copy", "Copy the lines shown", this::copy));
         row.add(button("Clear", "Clear the log", this::clear));
         return row;
@@ -77,7 +76,7 @@ final class LogPanel extends SidePanel {
 
     @Override
     public Dimension getPreferredSize() {
-        return new Dimension(WIDTH, super.getPreferredSize().height);
+        return new Dimension(Theme.px(WIDTH), super.getPreferredSize().height);
     }
 
     @Override

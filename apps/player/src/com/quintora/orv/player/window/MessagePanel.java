@@ -6,7 +6,6 @@ import java.awt.Color;
 import java.awt.Dimension;
 import java.awt.Graphics;
 import java.awt.GridBagLayout;
-import javax.swing.BorderFactory;
 import javax.swing.JComponent;
 import javax.swing.JLabel;
 import javax.swing.JPanel;
@@ -15,6 +14,7 @@ import javax.swing.JTextArea;
 /** What the window says in place of a picture: why it cannot play, or what it waits for. */
 final class MessagePanel extends JPanel {
     private static final int TEXT_WIDTH = 420;
+    private static final int SIGN = 44;
 
     private final JLabel title = new JLabel();
     private final JTextArea text = new JTextArea();
@@ -29,16 +29,16 @@ final class MessagePanel extends JPanel {
         setBackground(Theme.STAGE);
         // The media's own words are never markup.
         title.putClientProperty("html.disable", true);
-        title.setFont(Theme.TITLE);
+        title.setFont(Theme.title());
         title.setForeground(Theme.TEXT);
-        text.setFont(Theme.BODY.deriveFont(14f));
+        text.setFont(Theme.body(14));
         text.setForeground(Theme.MUTED);
         text.setOpaque(false);
         text.setEditable(false);
         text.setFocusable(false);
         text.setLineWrap(true);
         text.setWrapStyleWord(true);
-        JPanel words = new JPanel(new BorderLayout(0, Theme.GAP));
+        JPanel words = new JPanel(new BorderLayout(0, Theme.gap()));
         words.setOpaque(false);
         words.add(title, BorderLayout.NORTH);
         words.add(text, BorderLayout.CENTER);
@@ -48,8 +48,8 @@ final class MessagePanel extends JPanel {
         button.setForeground(Theme.ACCENT);
         wayOn.setOpaque(false);
         wayOn.add(button, BorderLayout.WEST);
-        JPanel card = new Card(new BorderLayout(20, 0));
-        card.setBorder(BorderFactory.createEmptyBorder(24, 24, 24, 28));
+        JPanel card = new Card(new BorderLayout(Theme.px(20), 0));
+        card.setBorder(Theme.border(24, 24, 24, 28));
         card.add(sign, BorderLayout.WEST);
         card.add(words, BorderLayout.CENTER);
         add(card);
@@ -62,28 +62,29 @@ final class MessagePanel extends JPanel {
         this.color = color;
         this.title.setText(title);
         // Whole addresses are cut off at the end.
+        int width = Theme.px(TEXT_WIDTH);
         this.title.setPreferredSize(null);
         Dimension whole = this.title.getPreferredSize();
         this.title.setPreferredSize(
-                new Dimension(Math.min(whole.width, TEXT_WIDTH), whole.height));
+                new Dimension(Math.min(whole.width, width), whole.height));
         this.text.setText(text);
         // A text area knows its height only once its width is set.
-        this.text.setSize(TEXT_WIDTH, Short.MAX_VALUE);
+        this.text.setSize(width, Short.MAX_VALUE);
         this.text.setPreferredSize(
-                new Dimension(TEXT_WIDTH, this.text.getUI().getPreferredSize(this.text).height));
+                new Dimension(width, this.text.getUI().getPreferredSize(this.text).height));
         revalidate();
         repaint();
     }
 
     private final class Sign extends JComponent {
         Sign() {
-            setPreferredSize(new Dimension(44, 44));
+            setPreferredSize(Theme.size(SIGN, SIGN));
         }
 
         @Override
         protected void paintComponent(Graphics graphics) {
             var g = Theme.smooth(graphics);
-            glyph.paint(g, 0, 0, 44, color);
+            glyph.paint(g, 0, 0, Theme.px(SIGN), color);
             g.dispose();
         }
     }

@@ -17,6 +17,7 @@ import javax.swing.Timer;
 final class NoticePane extends JPanel {
     private static final int NOTICE_MS = 1_200;
     private static final int LONG_NOTICE_MS = 6_000;
+    private static final int PLACE = 20;
 
     private final CardLayout cards = new CardLayout();
     private final Timer noticeEnd = new Timer(NOTICE_MS, event -> setNotice(""));
@@ -121,16 +122,19 @@ final class NoticePane extends JPanel {
 
     private void paintWords(Graphics graphics, String all) {
         Graphics2D g = Theme.smooth(graphics);
-        g.setFont(Theme.BODY.deriveFont(16f));
+        g.setFont(Theme.body(16));
         var metrics = g.getFontMetrics();
-        String words =
-                Ellipsis.inMiddle(ReadingOrder.ofSentence(all), metrics, getWidth() - 68);
-        int width = metrics.stringWidth(words) + 28;
-        int height = metrics.getHeight() + 16;
+        int place = Theme.px(PLACE);
+        int left = Theme.px(14);
+        int top = Theme.px(8);
+        int room = getWidth() - 2 * (place + left);
+        String words = Ellipsis.inMiddle(ReadingOrder.ofSentence(all), metrics, room);
+        int width = metrics.stringWidth(words) + 2 * left;
+        int height = metrics.getHeight() + 2 * top;
         g.setColor(new Color(0, 0, 0, 170));
-        g.fillRoundRect(20, 20, width, height, Theme.CORNER * 2, Theme.CORNER * 2);
+        g.fillRoundRect(place, place, width, height, Theme.corner() * 2, Theme.corner() * 2);
         g.setColor(Theme.TEXT);
-        g.drawString(words, 34, 28 + metrics.getAscent());
+        g.drawString(words, place + left, place + top + metrics.getAscent());
         g.dispose();
     }
 }

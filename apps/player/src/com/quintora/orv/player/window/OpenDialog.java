@@ -2,6 +2,7 @@
 package com.quintora.orv.player.window;
 
 import java.awt.Component;
+import java.awt.Dimension;
 import java.io.File;
 import java.util.Arrays;
 import java.util.List;
@@ -10,6 +11,10 @@ import javax.swing.JOptionPane;
 
 /** Asks what to play. */
 final class OpenDialog {
+    // What Java gives it at least.
+    private static final int WIDTH = 500;
+    private static final int HEIGHT = 326;
+
     // Where the last one was, for as long as the program runs.
     private static File folder;
 
@@ -23,7 +28,7 @@ final class OpenDialog {
 
     /** Asks for files, folders of media or playlists. */
     void chooseFiles() {
-        JFileChooser chooser = new JFileChooser(folder);
+        JFileChooser chooser = newChooser();
         chooser.setDialogTitle("Open files, folders or playlists");
         chooser.setFileSelectionMode(JFileChooser.FILES_AND_DIRECTORIES);
         chooser.setMultiSelectionEnabled(true);
@@ -35,9 +40,21 @@ final class OpenDialog {
         }
     }
 
+    // Its least size is in pixels, which do not grow with its letters.
+    private static JFileChooser newChooser() {
+        JFileChooser chooser = new JFileChooser(folder);
+        Dimension wanted = chooser.getPreferredSize();
+        Dimension least = Theme.size(WIDTH, HEIGHT);
+        chooser.setPreferredSize(
+                new Dimension(
+                        Math.max(wanted.width, least.width),
+                        Math.max(wanted.height, least.height)));
+        return chooser;
+    }
+
     /** Asks for a file of subtitles for what plays. */
     void chooseSubtitles() {
-        JFileChooser chooser = new JFileChooser(folder);
+        JFileChooser chooser = newChooser();
         chooser.setDialogTitle("Add a subtitle file");
         chooser.setApproveButtonText("Add");
         if (chooser.showOpenDialog(above) == JFileChooser.APPROVE_OPTION) {

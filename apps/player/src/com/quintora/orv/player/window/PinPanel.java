@@ -3,7 +3,6 @@ package com.quintora.orv.player.window;
 
 import java.awt.BorderLayout;
 import java.awt.Dimension;
-import javax.swing.BorderFactory;
 import javax.swing.JLabel;
 import javax.swing.JPanel;
 import javax.swing.JPasswordField;
@@ -25,14 +24,14 @@ final class PinPanel extends SidePanel {
         pin.addActionListener(event -> unlock());
         FlatButton button = new FlatButton(null, "Unlock (Enter)", this::unlock);
         button.setText("Unlock");
-        JPanel row = new JPanel(new BorderLayout(Theme.GAP, 0));
+        JPanel row = new JPanel(new BorderLayout(Theme.gap(), 0));
         row.setOpaque(false);
         row.add(pin, BorderLayout.CENTER);
         row.add(button, BorderLayout.EAST);
-        answer.setFont(Theme.SMALL);
-        JPanel form = new JPanel(new BorderLayout(0, Theme.GAP));
+        answer.setFont(Theme.small());
+        JPanel form = new JPanel(new BorderLayout(0, Theme.gap()));
         form.setOpaque(false);
-        form.setBorder(BorderFactory.createEmptyBorder(0, 14, 8, 8));
+        form.setBorder(Theme.border(0, 14, 8, 8));
         form.add(row, BorderLayout.NORTH);
         form.add(answer, BorderLayout.CENTER);
         add(form, BorderLayout.NORTH);
@@ -40,7 +39,7 @@ final class PinPanel extends SidePanel {
 
     @Override
     public Dimension getPreferredSize() {
-        return new Dimension(WIDTH, super.getPreferredSize().height);
+        return new Dimension(Theme.px(WIDTH), super.getPreferredSize().height);
     }
 
     @Override

@@ -30,7 +30,7 @@ public final class PlayerWindow {
     public static int play(PlayOptions options) throws Failure, InterruptedException {
         Playlist list = options.playlist();
         PictureWay way = new PictureWay(options.gpuUse());
-        Stage stage = makeStage(list.currentEntry().name(), way);
+        Stage stage = makeStage(list.currentEntry().name(), way, options);
         Conductor conductor = new Conductor(stage, options, list);
         try (Interruption interruption = new Interruption(conductor::end, () -> {})) {
             CompletableFuture<Void> closed = new CompletableFuture<>();
@@ -51,7 +51,8 @@ public final class PlayerWindow {
     /** Plays to the end in a window that is never shown, and draws it where nobody looks. */
     public static void rehearse(PlayOptions options) throws Failure, InterruptedException {
         Playlist list = options.playlist();
-        Stage stage = makeStage(list.currentEntry().name(), new PictureWay(GpuUse.NEVER));
+        PictureWay way = new PictureWay(GpuUse.NEVER);
+        Stage stage = makeStage(list.currentEntry().name(), way, options);
         Conductor conductor = new Conductor(stage, options, list);
         try {
             EventQueue.invokeLater(() -> stage.build(conductor, () -> {}));
@@ -67,9 +68,11 @@ public final class PlayerWindow {
         }
     }
 
-    private static Stage makeStage(String title, PictureWay way) throws Failure {
+    private static Stage makeStage(String title, PictureWay way, PlayOptions options)
+            throws Failure {
         try {
             Desktop.await();
+            Theme.scale(options.scale().orElseGet(ScaleFactor::ofDesktop));
             return new Stage(title, way);
         } catch (AWTError | HeadlessException e) {
             throw noWindow("on display " + System.getenv("DISPLAY"), e);

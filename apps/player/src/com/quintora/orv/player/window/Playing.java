@@ -110,7 +110,8 @@ final class Playing {
     }
 
     private void beginPreviews() {
-        session.previews((part, image) -> show(() -> stage.showPreview(part, image)))
+        session.previews(
+                        Theme.scale(), (part, image) -> show(() -> stage.showPreview(part, image)))
                 .ifPresent(
                         made -> {
                             previews = made;

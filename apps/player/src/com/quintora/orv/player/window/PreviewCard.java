@@ -14,6 +14,7 @@ final class PreviewCard extends JPanel {
     private static final int EDGE = 4;
     private static final int MOST_WORDS = 260;
 
+    private final int edge = Theme.px(EDGE);
     private Dimension room = new Dimension();
     private BufferedImage picture;
     private String time = "";
@@ -43,12 +44,12 @@ final class PreviewCard extends JPanel {
 
     @Override
     public Dimension getPreferredSize() {
-        FontMetrics metrics = getFontMetrics(Theme.SMALL);
+        FontMetrics metrics = getFontMetrics(Theme.small());
         int words = Math.max(metrics.stringWidth(time), metrics.stringWidth(chapter));
         int lines = chapter.isEmpty() ? 1 : 2;
-        int width = room.width > 0 ? room.width : Math.min(MOST_WORDS, words) + 2 * EDGE;
+        int width = room.width > 0 ? room.width : Math.min(Theme.px(MOST_WORDS), words) + 2 * edge;
         return new Dimension(
-                width + 2 * EDGE, room.height + lines * metrics.getHeight() + 3 * EDGE);
+                width + 2 * edge, room.height + lines * metrics.getHeight() + 3 * edge);
     }
 
     @Override
@@ -57,13 +58,13 @@ final class PreviewCard extends JPanel {
         g.setColor(Theme.RAISED);
         g.fillRect(0, 0, getWidth(), getHeight());
         g.setColor(Theme.STAGE);
-        g.fillRect(EDGE, EDGE, room.width, room.height);
+        g.fillRect(edge, edge, room.width, room.height);
         if (picture != null) {
-            g.drawImage(picture, EDGE, EDGE, null);
+            g.drawImage(picture, edge, edge, null);
         }
-        g.setFont(Theme.SMALL);
+        g.setFont(Theme.small());
         g.setColor(Theme.TEXT);
-        int line = room.height + 2 * EDGE + g.getFontMetrics().getAscent();
+        int line = room.height + 2 * edge + g.getFontMetrics().getAscent();
         paintWords(g, time, line);
         g.setColor(Theme.MUTED);
         paintWords(g, chapter, line + g.getFontMetrics().getHeight());
@@ -72,7 +73,7 @@ final class PreviewCard extends JPanel {
 
     private void paintWords(Graphics2D g, String words, int baseline) {
         FontMetrics metrics = g.getFontMetrics();
-        String shown = Ellipsis.atEnd(words, metrics, getWidth() - 2 * EDGE);
+        String shown = Ellipsis.atEnd(words, metrics, getWidth() - 2 * edge);
         g.drawString(shown, (getWidth() - metrics.stringWidth(shown)) / 2, baseline);
     }
 }

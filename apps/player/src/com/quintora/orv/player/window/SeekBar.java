@@ -20,7 +20,7 @@ final class SeekBar extends LevelBar {
         super("Position", 200, target::seek, onStep);
         target.bar = this;
         getAccessibleContext().setAccessibleDescription("Seconds from the start");
-        setMaximumSize(new Dimension(Integer.MAX_VALUE, 20));
+        setMaximumSize(new Dimension(Integer.MAX_VALUE, Theme.px(HEIGHT)));
     }
 
     /** In seconds. */
@@ -74,7 +74,7 @@ final class SeekBar extends LevelBar {
         if (section.hasEnd()) {
             int left = (int) xOfTime(section.from());
             int width = Math.max(1, (int) xOfTime(section.to()) - left);
-            g.fillRect(left, getHeight() / 2 - 1, width, 2);
+            g.fillRect(left, getHeight() / 2 - Theme.px(1), width, Theme.px(2));
         }
         if (section.hasStart()) {
             paintMark(g, section.from());
@@ -86,7 +86,7 @@ final class SeekBar extends LevelBar {
 
     private void paintMark(Graphics2D g, int atMs) {
         if (atMs > 0 && atMs < durationMs) {
-            g.fillRect((int) xOfTime(atMs) - 1, 0, 2, getHeight());
+            g.fillRect((int) xOfTime(atMs) - Theme.px(1), 0, Theme.px(2), getHeight());
         }
     }
 

@@ -113,7 +113,7 @@ final class SeekPreview extends MouseAdapter {
         int last = owner.x + owner.width - window.getWidth();
         return new Point(
                 Math.max(owner.x, Math.min(middle, last)),
-                corner.y - window.getHeight() - Theme.GAP);
+                corner.y - window.getHeight() - Theme.gap());
     }
 
     private void hide() {

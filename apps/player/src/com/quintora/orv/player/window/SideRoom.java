@@ -5,7 +5,6 @@ import java.awt.BorderLayout;
 import java.util.HashMap;
 import java.util.Map;
 import java.util.function.Supplier;
-import javax.swing.BorderFactory;
 import javax.swing.JLabel;
 import javax.swing.JPanel;
 
@@ -22,11 +21,11 @@ final class SideRoom extends JPanel {
         this.onLeft = onLeft;
         setBackground(Theme.PANEL);
         setVisible(false);
-        heading.setFont(Theme.BODY.deriveFont(java.awt.Font.BOLD));
+        heading.setFont(Theme.body().deriveFont(java.awt.Font.BOLD));
         heading.setForeground(Theme.TEXT);
         JPanel top = new JPanel(new BorderLayout());
         top.setOpaque(false);
-        top.setBorder(BorderFactory.createEmptyBorder(6, 14, 4, 6));
+        top.setBorder(Theme.border(6, 14, 4, 6));
         top.add(heading, BorderLayout.CENTER);
         top.add(new FlatButton(Glyph.CLOSE, "Close (Escape)", this::close), BorderLayout.EAST);
         add(top, BorderLayout.NORTH);

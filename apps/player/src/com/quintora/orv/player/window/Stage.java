@@ -133,8 +133,8 @@ final class Stage {
         drops = new Drops(conductor);
         drops.playOn(frame.getRootPane());
         showList(conductor.list());
-        room.setPreferredSize(new Dimension(854, 480));
-        frame.setMinimumSize(new Dimension(480, 300));
+        room.setPreferredSize(withinScreen(854, 480, LARGEST_PART_OF_SCREEN));
+        frame.setMinimumSize(withinScreen(480, 300, 1));
         frame.pack();
         frame.setLocationRelativeTo(null);
         if (before != null) {
@@ -440,10 +440,22 @@ final class Stage {
         showCard(MESSAGE);
     }
 
+    /** That size in the present scale, as far as a part of the screen has room for more of it. */
+    private static Dimension withinScreen(int width, int height, double part) {
+        Rectangle screen = roomOnScreen();
+        Dimension wanted = Theme.size(width, height);
+        return new Dimension(
+                Math.max(width, Math.min(wanted.width, (int) (screen.width * part))),
+                Math.max(height, Math.min(wanted.height, (int) (screen.height * part))));
+    }
+
+    private static Rectangle roomOnScreen() {
+        return GraphicsEnvironment.getLocalGraphicsEnvironment().getMaximumWindowBounds();
+    }
+
     /** As large as the video, within a part of the screen. */
     private void fitWindow() {
-        Rectangle screen =
-                GraphicsEnvironment.getLocalGraphicsEnvironment().getMaximumWindowBounds();
+        Rectangle screen = roomOnScreen();
         int mostWidth = (int) (screen.width * LARGEST_PART_OF_SCREEN);
         int mostHeight =
                 (int) (screen.height * LARGEST_PART_OF_SCREEN) - bar.getPreferredSize().height;

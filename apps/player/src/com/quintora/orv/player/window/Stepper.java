@@ -20,9 +20,9 @@ final class Stepper extends Box {
         super(BoxLayout.X_AXIS);
         this.name = name;
         getAccessibleContext().setAccessibleName(name);
-        value.setFont(Theme.BODY);
+        value.setFont(Theme.body());
         value.setForeground(Theme.TEXT);
-        Dimension size = new Dimension(VALUE_WIDTH, Theme.BUTTON);
+        Dimension size = new Dimension(Theme.px(VALUE_WIDTH), Theme.button());
         value.setPreferredSize(size);
         value.setMaximumSize(size);
         add(button("−", down, () -> step.accept(-1)));

@@ -9,7 +9,6 @@ import java.awt.Dimension;
 import java.awt.GridBagConstraints;
 import java.awt.GridBagLayout;
 import java.awt.Insets;
-import javax.swing.BorderFactory;
 import javax.swing.JComponent;
 import javax.swing.JLabel;
 import javax.swing.JPanel;
@@ -118,7 +117,7 @@ final class SubtitlePanel extends SidePanel {
 
     private void arrange() {
         rows.setOpaque(false);
-        rows.setBorder(BorderFactory.createEmptyBorder(0, 14, 8, 8));
+        rows.setBorder(Theme.border(0, 14, 8, 8));
         addRow("Track", track);
         addRow("From a file", button("Add…", "Add a subtitle file", controls::addSubtitleFile));
         addRow("Delay", delay);
@@ -139,7 +138,7 @@ final class SubtitlePanel extends SidePanel {
 
     private void addRow(String name, JComponent control) {
         JLabel label = new JLabel(name);
-        label.setFont(Theme.BODY);
+        label.setFont(Theme.body());
         label.setForeground(Theme.MUTED);
         label.setLabelFor(control);
         int row = rows.getComponentCount() / 2;
@@ -154,7 +153,7 @@ final class SubtitlePanel extends SidePanel {
         place.gridx = column;
         place.gridy = row;
         place.anchor = anchor;
-        place.insets = new Insets(2, 0, 2, 4);
+        place.insets = new Insets(Theme.px(2), 0, Theme.px(2), Theme.px(4));
         return place;
     }
 
@@ -175,7 +174,7 @@ final class SubtitlePanel extends SidePanel {
 
     @Override
     public Dimension getPreferredSize() {
-        return new Dimension(WIDTH, super.getPreferredSize().height);
+        return new Dimension(Theme.px(WIDTH), super.getPreferredSize().height);
     }
 
     @Override

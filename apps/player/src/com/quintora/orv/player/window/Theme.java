@@ -4,6 +4,7 @@ package com.quintora.orv.player.window;
 import java.awt.BasicStroke;
 import java.awt.Color;
 import java.awt.Component;
+import java.awt.Dimension;
 import java.awt.Font;
 import java.awt.Graphics;
 import java.awt.Graphics2D;
@@ -11,9 +12,11 @@ import java.awt.RenderingHints;
 import java.util.List;
 import javax.swing.BorderFactory;
 import javax.swing.UIManager;
+import javax.swing.UnsupportedLookAndFeelException;
+import javax.swing.border.Border;
 import javax.swing.plaf.metal.MetalLookAndFeel;
 
-/** The window's colours, letters and measures (pixels). */
+/** The window's colours, and its letters and measures (pixels) in the scale that was asked for. */
 final class Theme {
     static final Color STAGE = new Color(0x0B0C0E);
     static final Color PANEL = new Color(0x17191E);
@@ -27,18 +30,78 @@ final class Theme {
     static final Color MUTED = new Color(0x98A0AD);
     static final Color ALERT = new Color(0xFF6B5E);
 
-    static final Font BODY = new Font(Font.SANS_SERIF, Font.PLAIN, 13);
-    static final Font SMALL = BODY.deriveFont(12f);
-    static final Font TITLE = BODY.deriveFont(Font.BOLD, 20f);
+    private static final Font LETTERS = new Font(Font.SANS_SERIF, Font.PLAIN, 13);
 
-    static final int GAP = 8;
-    static final int BUTTON = 36;
-    static final int CORNER = 10;
+    private static final List<String> DIALOG_ICONS =
+            List.of(
+                    "FileChooser.upFolderIcon", "FileChooser.homeFolderIcon",
+                    "FileChooser.newFolderIcon", "FileChooser.listViewIcon",
+                    "FileChooser.detailsViewIcon", "FileView.directoryIcon",
+                    "FileView.fileIcon", "FileView.computerIcon", "FileView.hardDriveIcon",
+                    "FileView.floppyDriveIcon");
+
+    private static volatile double factor = 1;
+    private static volatile double dressed; // The factor of dialogs.
 
     private Theme() {}
 
-    /** Gives dialogs the same look. Call before Swing is used first. */
+    /**
+     * How many times as large as usual all is that is made from now on: from 1 to 4.
+     */
+    static void scale(double wanted) {
+        factor = wanted;
+    }
+
+    static double scale() {
+        return factor;
+    }
+
+    /** A measure in the pixels of the present scale. */
+    static int px(int usual) {
+        return (int) Math.round(usual * factor);
+    }
+
+    static Dimension size(int width, int height) {
+        return new Dimension(px(width), px(height));
+    }
+
+    /** Room round a component, before scaling. */
+    static Border border(int top, int left, int bottom, int right) {
+        return BorderFactory.createEmptyBorder(px(top), px(left), px(bottom), px(right));
+    }
+
+    static Font body() {
+        return body(13);
+    }
+
+    static Font small() {
+        return body(12);
+    }
+
+    static Font title() {
+        return body(20).deriveFont(Font.BOLD);
+    }
+
+    /** The usual letters in another size, before scaling. */
+    static Font body(float size) {
+        return LETTERS.deriveFont((float) (size * factor));
+    }
+
+    static int gap() {
+        return px(8);
+    }
+
+    static int button() {
+        return px(36);
+    }
+
+    static int corner() {
+        return px(10);
+    }
+
+    /** Gives dialogs the same look. Call before Swing is used first, and in each other scale. */
     static void dressDialogs() {
+        dressed = factor;
         MetalLookAndFeel.setCurrentTheme(new DarkMetal());
         UIManager.put("swing.boldMetal", false);
         for (String gradient : List.of("Button", "ScrollBar", "ComboBox", "ToggleButton")) {
@@ -48,19 +111,38 @@ final class Theme {
 
     /** Gives what Swing draws itself the same look. Call before the first component is made. */
     static void install() {
+        if (dressed != factor) {
+            dressDialogs();
+            redress();
+        }
         UIManager.put("ToolTip.background", RAISED);
         UIManager.put("ToolTip.foreground", TEXT);
-        UIManager.put("ToolTip.font", SMALL);
-        UIManager.put("ToolTip.border", BorderFactory.createEmptyBorder(4, 8, 4, 8));
+        UIManager.put("ToolTip.font", small());
+        UIManager.put("ToolTip.border", border(4, 8, 4, 8));
+    }
+
+    private static void redress() {
+        try {
+            UIManager.setLookAndFeel(new MetalLookAndFeel());
+        } catch (UnsupportedLookAndFeelException e) {
+            throw new AssertionError(e); // It is Java's own, everywhere.
+        }
+        LargerIcon.putInPlaceOf(DIALOG_ICONS, factor);
     }
 
     /** A ring just inside a component, while the keyboard is at it. */
     static void paintFocus(Graphics2D g, Component component) {
         if (component.isFocusOwner()) {
             g.setColor(ACCENT);
-            g.setStroke(new BasicStroke(2));
+            g.setStroke(new BasicStroke(px(2)));
+            int half = px(2) / 2;
             g.drawRoundRect(
-                    1, 1, component.getWidth() - 2, component.getHeight() - 2, CORNER, CORNER);
+                    half,
+                    half,
+                    component.getWidth() - 2 * half,
+                    component.getHeight() - 2 * half,
+                    corner(),
+                    corner());
         }
     }
 

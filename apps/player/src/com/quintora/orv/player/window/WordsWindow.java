@@ -8,7 +8,6 @@ import java.awt.Point;
 import java.awt.Window;
 import java.awt.event.HierarchyBoundsAdapter;
 import java.awt.event.HierarchyEvent;
-import javax.swing.BorderFactory;
 import javax.swing.JLabel;
 import javax.swing.JWindow;
 import javax.swing.SwingUtilities;
@@ -23,11 +22,11 @@ final class WordsWindow {
 
     WordsWindow(Component picture) {
         this.picture = picture;
-        label.setFont(Theme.BODY.deriveFont(16f));
+        label.setFont(Theme.body(16));
         label.setForeground(Theme.TEXT);
         label.setBackground(Theme.PANEL);
         label.setOpaque(true);
-        label.setBorder(BorderFactory.createEmptyBorder(8, 14, 8, 14));
+        label.setBorder(Theme.border(8, 14, 8, 14));
         label.putClientProperty("html.disable", true);
         picture.addHierarchyBoundsListener(
                 new HierarchyBoundsAdapter() {
@@ -54,7 +53,7 @@ final class WordsWindow {
             window.setFocusableWindowState(false);
             window.add(label);
         }
-        int room = picture.getWidth() - 2 * PLACE - 28;
+        int room = picture.getWidth() - 2 * Theme.px(PLACE) - 2 * Theme.px(14);
         label.setText(
                 Ellipsis.inMiddle(
                         ReadingOrder.ofSentence(words),
@@ -67,7 +66,7 @@ final class WordsWindow {
 
     private void place() {
         Point corner = picture.getLocationOnScreen();
-        window.setLocation(corner.x + PLACE, corner.y + PLACE);
+        window.setLocation(corner.x + Theme.px(PLACE), corner.y + Theme.px(PLACE));
     }
 
     private Window owner() {

@@ -18,7 +18,7 @@ final class Letters {
     static BufferedImage drawn(String words) {
         var image = new BufferedImage(400, 40, BufferedImage.TYPE_INT_RGB);
         Graphics2D g = Theme.smooth(image.getGraphics());
-        g.setFont(Theme.BODY);
+        g.setFont(Theme.body());
         g.drawString(words, 10, 25);
         g.dispose();
         return cropped(image);

@@ -13,7 +13,7 @@ class LettersTest {
     @ParameterizedTest
     @ValueSource(strings = {"Ελληνικά Русский", "电影", "電影", "映画ひカ", "영화", "فيلم", "क्षत्रिय"})
     void everyScriptHasLetters(String title) {
-        assertEquals(ALL_OF_IT, Theme.TITLE.canDisplayUpTo(title));
-        assertEquals(ALL_OF_IT, Theme.SMALL.canDisplayUpTo(title));
+        assertEquals(ALL_OF_IT, Theme.title().canDisplayUpTo(title));
+        assertEquals(ALL_OF_IT, Theme.small().canDisplayUpTo(title));
     }
 }

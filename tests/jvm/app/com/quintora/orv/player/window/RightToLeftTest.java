@@ -16,7 +16,7 @@ class RightToLeftTest {
 
     @Test
     void whatIsShortenedAtItsEndKeepsItsFirstLetters() {
-        FontMetrics metrics = new JLabel().getFontMetrics(Theme.BODY);
+        FontMetrics metrics = new JLabel().getFontMetrics(Theme.body());
         String shown = Ellipsis.atEnd(NAME, metrics, metrics.stringWidth(NAME) / 2);
         String kept = shown.substring(0, shown.length() - 1);
         assertTrue(NAME.startsWith(kept) && kept.length() > 3, shown);
