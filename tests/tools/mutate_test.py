@@ -280,6 +280,37 @@ class JavaTest(Folder):
         self.assertEqual([m.text for m in found if m.operator == "remove-statement"], [
             "a = b + 2;", "notifyAll();", "b--;", 'System.out.println("a" + b);'])
 
+    def test_constants_stay_that_other_classes_have_compiled_in(self):
+        found = self.find("""\
+            class Small {
+                public static final int GIVEN = 1;
+                static final String TEXT = "a".length() > 2 ? "b" : "c";
+                static final long COMPUTED = System.nanoTime() + 3;
+                private static final int OWN = 4;
+                static int variable = 0;
+                interface Named {
+                    int VALUE = 0;
+                    int[] VALUES = {0};
+                }
+                static final int SUM = GIVEN + 1;
+            }
+            """)
+        self.assertEqual([(m.line, m.operator, m.text, m.becomes) for m in found], [
+            (3, "negate-condition", '"a".length() > 2', '!("a".length() > 2)'),
+            (3, "relational", ">", ">="),
+            (3, "constant", "2", "(2 + 1)"), (3, "constant", "2", "(2 - 1)"),
+            (4, "arithmetic", "+", "-"),
+            (4, "constant", "3", "(3 + 1)"), (4, "constant", "3", "(3 - 1)"),
+            (5, "constant", "4", "(4 + 1)"), (5, "constant", "4", "(4 - 1)"),
+            (6, "constant", "0", "1"), (9, "constant", "0", "1")])
+
+    def test_java_runs_by_itself_and_unchecked(self):
+        test = ["/t/checked_java.py", "/t/expected.txt", "/jdk/bin/java", "-Xcheck:jni", "-ea",
+                "-cp", "/a.jar", "Launcher", "--details=tree", "--select-class=a.FirstTest"]
+        self.assertEqual(jvm.command_of(test, "/classes", ["a.FirstTest", "b.OtherTest"]), [
+            *jvm.QUICK, "-Xmx1g", "-ea", "-cp", "/classes:/a.jar", "Launcher", "--details=none",
+            "--select-class=a.FirstTest", "--select-class=b.OtherTest"])
+
     def test_a_constructor_assigns_in_any_order_what_nobody_sees_yet(self):
         found = self.find("""\
             class Small {

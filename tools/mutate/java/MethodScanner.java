@@ -47,6 +47,11 @@ abstract class MethodScanner extends TreeScanner<Void, Void> {
         return methods.peek();
     }
 
+    /** Whether a variable that is met here is one, which is static and final unsaid. */
+    final boolean isFieldOfInterface() {
+        return methods.isEmpty() && classes.peek().getKind() == Tree.Kind.INTERFACE;
+    }
+
     final String returnType() {
         Tree type = methods.isEmpty() ? null : methods.peek().getReturnType();
         return type == null ? "void" : type.toString();

@@ -15,20 +15,25 @@ import com.sun.source.tree.ForLoopTree;
 import com.sun.source.tree.IfTree;
 import com.sun.source.tree.LambdaExpressionTree;
 import com.sun.source.tree.LiteralTree;
+import com.sun.source.tree.PrimitiveTypeTree;
 import com.sun.source.tree.ReturnTree;
 import com.sun.source.tree.StatementTree;
 import com.sun.source.tree.SwitchTree;
 import com.sun.source.tree.SynchronizedTree;
 import com.sun.source.tree.Tree;
 import com.sun.source.tree.UnaryTree;
+import com.sun.source.tree.VariableTree;
 import com.sun.source.tree.WhileLoopTree;
 import java.util.ArrayDeque;
 import java.util.ArrayList;
 import java.util.Deque;
+import java.util.EnumSet;
 import java.util.List;
+import java.util.Set;
 import java.util.function.Supplier;
 import java.util.regex.Matcher;
 import java.util.regex.Pattern;
+import javax.lang.model.element.Modifier;
 
 /** Collects the changes of one source. */
 final class MutantScanner extends MethodScanner {
@@ -51,6 +56,23 @@ final class MutantScanner extends MethodScanner {
     @Override
     public Void visitAnnotation(AnnotationTree tree, Void none) {
         return null;
+    }
+
+    // Whoever uses a constant has it compiled in: a change in its own class alone is none.
+    @Override
+    public Void visitVariable(VariableTree tree, Void none) {
+        boolean isInlined = isConstant(tree) && tree.getInitializer() != null
+                && !Swap.hasEffect(tree.getInitializer());
+        return isInlined ? null : super.visitVariable(tree, none);
+    }
+
+    private boolean isConstant(VariableTree tree) {
+        Set<Modifier> modifiers = tree.getModifiers().getFlags();
+        boolean isSimple = tree.getType() instanceof PrimitiveTypeTree
+                || "String".equals(String.valueOf(tree.getType()));
+        boolean isFixed = isFieldOfInterface()
+                || modifiers.containsAll(EnumSet.of(Modifier.STATIC, Modifier.FINAL));
+        return isSimple && isFixed && !modifiers.contains(Modifier.PRIVATE);
     }
 
     @Override

@@ -122,7 +122,7 @@ final class Swap {
     }
 
     /** A call, or a way out. */
-    private static boolean hasEffect(Tree tree) {
+    static boolean hasEffect(Tree tree) {
         boolean[] found = {false};
         new TreeScanner<Void, Void>() {
             @Override
