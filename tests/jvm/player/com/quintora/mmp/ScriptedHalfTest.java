@@ -105,9 +105,19 @@ class ScriptedHalfTest {
         ScriptedHalf.takeCalls();
         DivxLastMemoryFilePosition left = new DivxLastMemoryFilePosition();
         assertTrue(player.divx().setLastMemory(left));
+        assertTrue(player.divx().setTitle(1, 2, 3));
         assertTrue(player.divx().setChapter(1, 2, 3, 4));
-        assertEquals("setDivxLastMemoryFilePosition()\nsetDivxChapInfo(1, 2, 3, 4)\n",
-                ScriptedHalf.takeCalls());
+        assertTrue(player.divx().setPlaylist(5, 6, 7, 8));
+        assertTrue(player.divx().pressButton(1, 2));
+        assertTrue(player.divx().setFilePosition(3, 4));
+        assertEquals("""
+                setDivxLastMemoryFilePosition()
+                setDivxTitleInfo(1, 2, 3)
+                setDivxChapInfo(1, 2, 3, 4)
+                setDivxPlayListInfo(5, 6, 7, 8)
+                setDivxBtnInfo(1, 2)
+                setDivxFilePosition(3, 4)
+                """, ScriptedHalf.takeCalls());
     }
 
     @Test

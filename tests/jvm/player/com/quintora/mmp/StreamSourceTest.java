@@ -47,6 +47,26 @@ class StreamSourceTest extends PlayerFixture {
     }
 
     @Test
+    void aDescriptionFillsEveryFieldThatTheNativeHalfReads() {
+        player.mStreamCurPos = 9;
+        player.mDataSourceType = 9;
+        NativeCalls natives = new NativeCalls(player);
+        natives.describeStream(7, true, false, 1234);
+        assertFields(7, true, false, 1234);
+        natives.describeStream(0, false, true, 0);
+        assertFields(0, false, true, 0);
+    }
+
+    private void assertFields(long size, boolean seekable, boolean mayStall, long millis) {
+        assertEquals(size, player.mStreamSize);
+        assertEquals(seekable, player.mStreamSeekable);
+        assertEquals(mayStall, player.mStallingSupport);
+        assertEquals(millis, player.mStreamDuration);
+        assertEquals(0, player.mStreamCurPos, "at its start");
+        assertEquals(0, player.mDataSourceType);
+    }
+
+    @Test
     void aStreamIsSought() throws Exception {
         prepare(source("video.mp4"));
         player.seekToAndWait(6000);

@@ -6,13 +6,16 @@ import static org.junit.jupiter.api.Assertions.assertSame;
 import static org.junit.jupiter.api.Assertions.assertThrows;
 import static org.junit.jupiter.api.Assertions.assertTrue;
 
+import com.quintora.SubtitleAttr;
 import com.quintora.mmp.MediaError;
 import com.quintora.mmp.MediaException;
 import com.quintora.mmp.PlayerState;
 import com.quintora.mmp.SubtitleTrack;
 import com.quintora.mmp.TrackFlags;
 import com.quintora.mmp.Wait;
+import com.quintora.mmp.util.PcmMediaInfo;
 import java.io.IOException;
+import java.lang.Thread.State;
 import java.util.ArrayList;
 import java.util.List;
 import java.util.concurrent.CompletableFuture;
@@ -42,6 +45,81 @@ class UnitsTest {
         assertEquals(PlayerState.RELEASED, units.states.state());
         assertTrue(natives.calls.containsAll(List.of("setDataSource", "prepare", "start")));
         assertEquals(1, natives.count("release"));
+    }
+
+    @Test
+    void aSourceIsForAPlayerThatHasNone() throws Exception {
+        units.sources.set("film.mkv");
+        assertThrows(IllegalStateException.class, () -> units.sources.set("other.mkv"));
+        assertEquals(List.of("setDataSource[film.mkv]"), natives.lines);
+        assertEquals("film.mkv", units.source.name());
+    }
+
+    @Test
+    void aSourceThatTheEngineRefusesLeavesNoName() throws Exception {
+        natives.answer("setDataSource", () -> {
+            throw new IOException("gone");
+        });
+        assertThrows(IOException.class, () -> units.sources.set("film.mkv"));
+        assertEquals("", units.source.name());
+        assertEquals(PlayerState.IDLE, units.states.state());
+    }
+
+    @Test
+    void aSourceHasItsNameBeforeAnybodyCanPrepareIt() throws Exception {
+        CountDownLatch mayMove = new CountDownLatch(1);
+        natives.answer("setDataSource", () -> {
+            mayMove.await();
+            return null;
+        });
+        Thread opening = new Thread(() -> {
+            try {
+                units.sources.set("film.mkv");
+            } catch (IOException e) {
+                throw new AssertionError(e);
+            }
+        });
+        opening.start();
+        Wait.until("the engine opens it", () -> natives.count("setDataSource") == 1);
+        synchronized (units.states) { // no state can change
+            mayMove.countDown();
+            Wait.until("its state is to change", () -> opening.getState() == State.BLOCKED);
+            assertEquals("film.mkv", units.source.name());
+        }
+        opening.join();
+        assertEquals(PlayerState.INITIALIZED, units.states.state());
+    }
+
+    @Test
+    void aPcmFormatIsHandedOverBeforeItsFlagAndInIdleAlone() throws Exception {
+        PcmMediaInfo format = PcmMediaInfo.of(44_100, 2, 16);
+        PcmMediaInfo bad = PcmMediaInfo.of(44_100, 9, 16);
+        assertThrows(IllegalArgumentException.class, () -> units.sources.setPcmFormat(bad));
+        assertEquals(List.of(), natives.lines);
+        units.sources.setPcmFormat(format);
+        assertEquals(List.of("setPcmMediaInfo[" + format + "]", "setPcmFlag[]"), natives.lines);
+        units.sources.set("film.pcm");
+        natives.lines.clear();
+        assertThrows(IllegalStateException.class, () -> units.sources.setPcmFormat(format));
+        assertThrows(IllegalArgumentException.class, () -> units.sources.setPcmFormat(bad),
+                "what is wrong in every state counts first");
+        assertEquals(List.of(), natives.lines);
+    }
+
+    @Test
+    void aStyleIsCheckedBeforeItIsHandedOver() {
+        SubtitleAttr bad = new SubtitleAttr();
+        bad.mMask = SubtitleAttr.FLAG_SUBTITLE_TEXT_COLOR;
+        assertThrows(IllegalArgumentException.class, () -> units.subtitles.setStyle(bad));
+        assertEquals(List.of(), natives.lines);
+        SubtitleAttr good = SubtitleAttr.builder().delay(5).build();
+        units.subtitles.setStyle(good);
+        assertEquals(List.of("setSubtitleAttr[" + good + "]"), natives.lines);
+        natives.answer("setSubtitleAttr", () -> {
+            throw new IllegalStateException("busy");
+        });
+        assertEquals("the engine refused setStyle(): busy", assertThrows(
+                IllegalStateException.class, () -> units.subtitles.setStyle(good)).getMessage());
     }
 
     @Test

@@ -54,6 +54,43 @@ class EventQueueTest {
     }
 
     @Test
+    void aFlushHandsOverOnceUntilTheExecutorBegins() {
+        List<Runnable> tasks = new CopyOnWriteArrayList<>();
+        EventQueue queue = new EventQueue(tasks::add, any -> true);
+        queue.flush();
+        assertEquals(0, tasks.size(), "of nothing");
+        queue.add(0, () -> {
+            queue.add(0, () -> ran.add("inner"));
+            queue.flush();
+            ran.add("outer");
+        });
+        queue.flush();
+        queue.flush();
+        assertEquals(1, tasks.size());
+        tasks.get(0).run();
+        assertEquals(List.of("outer", "inner"), ran);
+        assertEquals(1, tasks.size(), "an event's own flush");
+        queue.clear();
+    }
+
+    @Test
+    void aFlushWaitsWhileAnotherThreadChangesTheQueue() throws Exception {
+        AtomicInteger handedOver = new AtomicInteger();
+        EventQueue queue = new EventQueue(task -> handedOver.incrementAndGet(), any -> true);
+        queue.add(0, () -> ran.add("never"));
+        Thread flushing = new Thread(queue::flush);
+        synchronized (queue) {
+            flushing.start();
+            Wait.until("it waits or has ended",
+                    () -> flushing.getState() == Thread.State.BLOCKED || !flushing.isAlive());
+            assertEquals(0, handedOver.get());
+        }
+        flushing.join();
+        assertEquals(1, handedOver.get());
+        queue.clear();
+    }
+
+    @Test
     void eventsOfAnEndedEpochAreDropped() {
         EventQueue queue = new EventQueue(Runnable::run, e -> e == epoch.get());
         queue.add(0, () -> {
