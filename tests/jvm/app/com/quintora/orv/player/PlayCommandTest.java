@@ -141,6 +141,7 @@ class PlayCommandTest {
     void whatIsWrongWithArgumentsIsSaidInPlainWords() {
         assertUsage("'x' is not a whole number", "--audio-track", "x", "some.mkv");
         assertUsage("'x' is not a number", "--speed", "x", "some.mkv");
+        assertUsage("'x' is not a number", "--scale", "x", "some.mkv");
         assertUsage("orv: Unknown option: '--sped'", "--sped");
     }
 

@@ -35,7 +35,9 @@ final class MenuRow {
     }
 
     private static int widthOfKeys(AbstractButton row, String keys) {
-        return keys.isEmpty() ? 0 : Theme.px(KEYS_GAP) + row.getFontMetrics(Theme.small()).stringWidth(keys);
+        return keys.isEmpty()
+                ? 0
+                : Theme.px(KEYS_GAP) + row.getFontMetrics(Theme.small()).stringWidth(keys);
     }
 
     static void paint(

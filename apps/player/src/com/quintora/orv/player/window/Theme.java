@@ -45,9 +45,7 @@ final class Theme {
 
     private Theme() {}
 
-    /**
-     * How many times as large as usual all is that is made from now on: from 1 to 4.
-     */
+    /** How many times as large as usual all is that is made from now on: from 1 to 4. */
     static void scale(double wanted) {
         factor = wanted;
     }

@@ -77,14 +77,16 @@ class RightToLeftWindowTest extends WindowFixture {
         Wait.until("it is said", () -> notice() != null && notice().contains("cannot be played"));
         String said = notice().substring(0, notice().indexOf(':') + 1);
         onWindow(() -> {
-            Letters.assertSame(notice(Letters.AS_THEY_STAND + "“!םולש” cannot be played:"), notice(said));
+            Letters.assertSame(
+                    notice(Letters.AS_THEY_STAND + "“!םולש” cannot be played:"), notice(said));
             return null;
         });
     }
 
     @Test
     void anArtistStandsInTheirOrder() throws Exception {
-        openSource(titled("tone.mp3", "tone.mp3", "artist=שלום abc עולם!"), "--no-gpu", "--loop");
+        openSource(
+                titled("tone.mp3", "tone.mp3", "artist=שלום abc עולם!"), "--no-gpu", "--loop");
         Wait.until("the artist is there", () -> artist() != null);
         JTextArea text = artist();
         onWindow(() -> {
