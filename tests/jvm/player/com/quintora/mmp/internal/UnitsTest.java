@@ -7,10 +7,13 @@ import static org.junit.jupiter.api.Assertions.assertThrows;
 import static org.junit.jupiter.api.Assertions.assertTrue;
 
 import com.quintora.SubtitleAttr;
+import com.quintora.mmp.ColorMode;
 import com.quintora.mmp.MediaError;
 import com.quintora.mmp.MediaException;
+import com.quintora.mmp.Pictures;
 import com.quintora.mmp.PlayerState;
 import com.quintora.mmp.SubtitleTrack;
+import com.quintora.mmp.Track;
 import com.quintora.mmp.TrackFlags;
 import com.quintora.mmp.Wait;
 import com.quintora.mmp.util.PcmMediaInfo;
@@ -18,6 +21,7 @@ import java.io.IOException;
 import java.lang.Thread.State;
 import java.util.ArrayList;
 import java.util.List;
+import java.util.Optional;
 import java.util.concurrent.CompletableFuture;
 import java.util.concurrent.CompletionException;
 import java.util.concurrent.CountDownLatch;
@@ -28,6 +32,8 @@ import org.junit.jupiter.api.Test;
 
 /** The units of a player, without a native library. */
 class UnitsTest {
+    private static final int SELECTED = 1 << 3; // of a track's flags
+
     private final ScriptedNatives natives = new ScriptedNatives();
     private final PlayerUnits units = natives.units();
 
@@ -207,6 +213,38 @@ class UnitsTest {
                 IllegalStateException.class, () -> units.tracks.selectAndWait(track));
         assertEquals("the engine cannot play subtitle track 0", thrown.getMessage());
         assertEquals(new SubtitleTrack(0, 1, "", "eng", "Captions", new TrackFlags(0)), track);
+    }
+
+    @Test
+    void aThumbnailHasAtLeastOnePixelAndAtMostItsLimits() {
+        int widest = Pictures.MAX_THUMBNAIL_WIDTH;
+        int highest = Pictures.MAX_THUMBNAIL_HEIGHT;
+        for (int[] size : new int[][] {{1, 1}, {widest, highest}}) {
+            natives.lines.clear();
+            assertEquals(Optional.empty(),
+                    units.pictures.thumbnailAndWait(size[0], size[1], ColorMode.ABGR8888));
+            assertEquals(1, natives.lines.size(), size[0] + " x " + size[1]);
+        }
+        for (int[] size : new int[][] {{0, 1}, {1, 0}, {widest + 1, 1}, {1, highest + 1}}) {
+            assertThrows(IllegalArgumentException.class,
+                    () -> units.pictures.thumbnailAndWait(size[0], size[1], ColorMode.ABGR8888));
+        }
+    }
+
+    @Test
+    void aVideoTrackIsDeselectedByItsIndex() throws Exception {
+        prepare();
+        AtomicInteger flags = new AtomicInteger(SELECTED);
+        natives.answer("getAllVideoTrackInfo", () -> {
+            units.tables.addVideo(0, 0, 16, 9, 25_000, 0, flags.get());
+            return 1;
+        });
+        natives.answer("deselectTrack", () -> {
+            flags.set(0);
+            return null;
+        });
+        units.tracks.selectNoneAndWait(Track.Kind.VIDEO);
+        assertTrue(natives.lines.contains("deselectTrack[0]"), natives.lines.toString());
     }
 
     @Test

@@ -55,7 +55,12 @@ class FailuresTest {
             + " byte ranges; download it first",
         "http://h/x | FFFFFBAC | http://h/x: is empty",
         "http://h/x | FFFFF69F | http://h/x: the server asks for a login (HTTP status 401)",
+        "http://h/x | FFFFF69D | http://h/x: the server does not allow access (HTTP status 403)",
         "http://h/x | FFFFF69C | http://h/x: the server has no such media (HTTP status 404)",
+        "http://h/x | FFFFF699 | http://h/x: the server asks for a login (HTTP status 407)",
+        "http://h/x | FFFFF696 | http://h/x: the server no longer has the media (HTTP status 410)",
+        "http://h/x | FFFFF683 | http://h/x: the server refuses so many requests (HTTP status"
+            + " 429)",
         "http://h/x | FFFFF68E | http://h/x: the server refuses the request (HTTP status 418)",
         "http://h/x | FFFFF63C | http://h/x: the server failed (HTTP status 500)",
         "/x | FFFFFB4F | /x: is an MP4 file in which nothing can be played: it is empty, cut short"

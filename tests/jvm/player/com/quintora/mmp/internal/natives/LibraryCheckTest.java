@@ -14,6 +14,7 @@ import java.nio.charset.StandardCharsets;
 import java.nio.file.Files;
 import java.nio.file.Path;
 import java.util.Arrays;
+import java.util.List;
 import org.junit.jupiter.api.Test;
 import org.junit.jupiter.api.io.TempDir;
 
@@ -49,6 +50,21 @@ class LibraryCheckTest {
         file.putShort(18, (short) X86_64).putLong(32, 64).putShort(54, (short) 56);
         file.putShort(56, (short) 1);
         file.putInt(64, 4).putLong(64 + 8, 120).putLong(64 + 32, 136);
+        return withNote(file, owner, text);
+    }
+
+    /** One of 32 bits, of either byte order. */
+    private Path withNarrowNote(ByteOrder order, String text) throws Exception {
+        ByteBuffer file = ByteBuffer.allocate(256).order(order);
+        int endian = order == ByteOrder.BIG_ENDIAN ? 2 : 1;
+        file.put(new byte[] {0x7F, 'E', 'L', 'F', 1, (byte) endian, 1});
+        file.putShort(18, (short) ARM).putInt(28, 52).putShort(42, (short) 32);
+        file.putShort(44, (short) 1);
+        file.putInt(52, 4).putInt(52 + 4, 120).putInt(52 + 16, 136);
+        return withNote(file, ElfFile.NOTE_OWNER, text);
+    }
+
+    private Path withNote(ByteBuffer file, String owner, String text) throws Exception {
         byte[] name = (owner + "\0").getBytes(StandardCharsets.US_ASCII);
         byte[] version = (text + "\0").getBytes(StandardCharsets.US_ASCII);
         file.position(120);
@@ -105,6 +121,26 @@ class LibraryCheckTest {
     }
 
     @Test
+    void aLibraryOf32BitsHasItsVersionInEitherByteOrder() throws Exception {
+        for (ByteOrder order : List.of(ByteOrder.LITTLE_ENDIAN, ByteOrder.BIG_ENDIAN)) {
+            Path file = withNarrowNote(order, "1.0.0");
+            assertEquals(new ElfFile("armhf", "1.0.0"), ElfFile.read(file.toString()),
+                    order.toString());
+        }
+    }
+
+    @Test
+    void notesThatEndWithinANotesHeadHaveNoVersion() throws Exception {
+        for (int length = 0; length < 12; length++) {
+            Path file = withNote(ElfFile.NOTE_OWNER, "1.0.0");
+            byte[] bytes = Files.readAllBytes(file);
+            ByteBuffer.wrap(bytes).order(ByteOrder.LITTLE_ENDIAN).putLong(64 + 32, length);
+            assertNull(ElfFile.read(Files.write(file, bytes).toString()).version(),
+                    "of " + length + " bytes");
+        }
+    }
+
+    @Test
     void theArchitectureIsCheckedBeforeTheVersion() throws Exception {
         String refusal = refusal(
                 withNote(ElfFile.NOTE_OWNER, "0.9.1"), new Machine("linux", "armhf"), "1.0.0");
@@ -114,7 +150,7 @@ class LibraryCheckTest {
     @Test
     void aNoteWithANegativeOrTooLargeSizeHasNoVersion() throws Exception {
         for (int field : new int[] {120, 124}) {
-            for (int size : new int[] {-1, Integer.MIN_VALUE, 1000, Integer.MAX_VALUE}) {
+            for (int size : new int[] {-1, Integer.MIN_VALUE, 125, 1000, Integer.MAX_VALUE}) {
                 Path file = withNote(ElfFile.NOTE_OWNER, "1.0.0");
                 byte[] bytes = Files.readAllBytes(file);
                 ByteBuffer.wrap(bytes).order(ByteOrder.LITTLE_ENDIAN).putInt(field, size);

@@ -17,6 +17,7 @@ class LibraryPathTest {
     void anEmptyFolderBetweenOthersIsTheCurrentOne() {
         assertEquals(List.of("/a", ".", "/b"), LibraryPath.folders("/a::/b"));
         assertEquals(List.of("/a", "."), LibraryPath.folders("/a:"));
+        assertEquals(List.of(".", "/a"), LibraryPath.folders(":/a"));
         assertEquals(List.of("/a"), LibraryPath.folders("/a"));
         assertEquals(List.of(), LibraryPath.folders(""));
         assertEquals(List.of(), LibraryPath.folders(null));

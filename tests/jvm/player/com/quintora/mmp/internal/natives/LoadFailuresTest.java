@@ -5,6 +5,7 @@ import static org.junit.jupiter.api.Assertions.assertEquals;
 import static org.junit.jupiter.api.Assertions.assertSame;
 import static org.junit.jupiter.api.Assertions.assertTrue;
 
+import java.util.List;
 import org.junit.jupiter.api.Test;
 
 class LoadFailuresTest {
@@ -31,6 +32,15 @@ class LoadFailuresTest {
                 LoadFailures.refused("/x/lib.so", "Debian 12", cause).getMessage());
         assertEquals("The native library did not load: strange.",
                 LoadFailures.refused(null, null, cause).getMessage());
+    }
+
+    @Test
+    void aLibraryThatIsNowhereHasEveryAdvice() {
+        Machine machine = new Machine("linux", "x86_64");
+        String missing = LoadFailures.missing(machine, "1.2.3", List.of()).getMessage();
+        assertTrue(missing.endsWith("Add the dependency com.quintora.mmp:mediaplayer-orv:1.2.3:"
+                + machine.name() + ", or install the Debian package, or build the library with"
+                + " ./orv build and start Java with -Djava.library.path=build/lib."), missing);
     }
 
     @Test
