@@ -74,9 +74,10 @@ class MemoryWindowTest extends WindowFixture {
         open("long.mkv");
         awaitPicture();
         assertEquals(place, onWindow(frame::getBounds));
-        LevelBar volume = find(LevelBar.class, "Volume");
-        assertEquals(
-                90, volume.getAccessibleContext().getAccessibleValue().getCurrentAccessibleValue());
+        var volume = find(LevelBar.class, "Volume").getAccessibleContext().getAccessibleValue();
+        Wait.until(
+                "the volume is that of before",
+                () -> onWindow(() -> volume.getCurrentAccessibleValue().intValue() == 90));
     }
 
     @Test

@@ -16,8 +16,6 @@ import java.nio.file.Path;
 import java.util.function.Predicate;
 import javax.swing.JFileChooser;
 import org.junit.jupiter.api.Test;
-import org.junit.jupiter.api.condition.DisabledForJreRange;
-import org.junit.jupiter.api.condition.JRE;
 import org.junit.jupiter.api.io.TempDir;
 
 /** Subtitles that change in the picture, by real pointer and keys. The picture is dark grey. */
@@ -39,22 +37,19 @@ class SubtitlePanelWindowTest extends WindowFixture {
     }
 
     @Test
-    @DisabledForJreRange(
-            min = JRE.JAVA_18,
-            disabledReason = "on Debian 13 the colour does not become yellow; not yet known why")
     void aColourIsSeenAtOnceAndRemembered() throws Exception {
         open("plain.mkv", "--subtitle", subtitles("0:00:00", "0:00:29"));
         Wait.until("white letters", () -> count(SubtitlePanelWindowTest::isWhite) > 50);
         assertEquals(0, count(SubtitlePanelWindowTest::isYellow));
         press("T");
         click(choice("Colour of letters: Yellow"));
-        Wait.until("yellow letters", () -> count(SubtitlePanelWindowTest::isYellow) > 50);
+        Wait.until("yellow letters", () -> count(SubtitlePanelWindowTest::isYellow) > 20);
         assertEquals(0, count(SubtitlePanelWindowTest::isWhite));
         press("Q");
         playing.get();
         assertEquals("#FFFFE040", Memory.in(file()).read().get("subtitles.color"));
         open("plain.mkv", "--subtitle", subtitles("0:00:00", "0:00:29"));
-        Wait.until("yellow again", () -> count(SubtitlePanelWindowTest::isYellow) > 50);
+        Wait.until("yellow again", () -> count(SubtitlePanelWindowTest::isYellow) > 20);
     }
 
     @Test
@@ -158,8 +153,10 @@ class SubtitlePanelWindowTest extends WindowFixture {
         return isNear(color, 0xFFFFFF);
     }
 
+    /** Of any brightness from that of a letter's edge on: mpv 0.40 draws small letters darker. */
     private static boolean isYellow(Color color) {
-        return isNear(color, 0xFFE040);
+        int red = color.getRed();
+        return red > 150 && color.getGreen() > red * 3 / 4 && color.getBlue() < red / 2;
     }
 
     private static boolean isBlue(Color color) {
