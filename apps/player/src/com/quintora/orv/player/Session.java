@@ -71,8 +71,8 @@ public final class Session implements AutoCloseable {
     }
 
     /**
-     * Has the graphics processor draw on that view, whose surface is there, instead of giving frames
-     * to the screen. To be asked before the media is opened.
+     * Has the graphics processor draw on that view, whose surface is there, instead of giving
+     * frames to the screen. To be asked before the media is opened.
      *
      * @return false when it does not: frames go to the screen
      */

@@ -399,7 +399,7 @@ final class Playing {
         soon(() -> session.showSubtitlesAs(look.get()));
     }
 
-    /** Reads what is known of the media, and answers on the window's thread; after a failure not. */
+    /** Reads what is known of the media; answers on the window's thread, after a failure not. */
     void readFacts(String drawing, Consumer<List<Fact>> answer) {
         later(
                 () -> {
