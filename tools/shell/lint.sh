@@ -40,12 +40,14 @@ lint_scripts() {
     } | xargs -0 realpath -z | sort -zu | xargs -0 shellcheck --external-sources
 }
 
-# The compiler's precompiled headers are not clang's: its commands go without.
+# The compiler's precompiled headers are not clang's: its commands go without. A source of
+# several programs is checked once.
 lint_tidy() {
     local log=$ORV_BUILD/log/tidy.log database=$ORV_BUILD/tidy
     mkdir -p "$database"
-    sed -E 's/-Winvalid-pch -include ([^ "\\]+|\\"[^"]*\\")//' "$ORV_BUILD/compile_commands.json" \
-        >"$database/compile_commands.json"
+    sed -E 's/-Winvalid-pch -include ([^ "\\]+|\\"[^"]*\\")//' "$ORV_BUILD/compile_commands.json" |
+        python3 -c 'import json, sys; print(json.dumps(list({each["file"]: each for each in json.load(sys.stdin)}.values())))' \
+            >"$database/compile_commands.json"
     run-clang-tidy -quiet -p "$database" '^((?!cmake_pch).)*$' >"$log" 2>&1 && return
     grep -E '(warning|error):' "$log" | sort -u
     say "all that clang-tidy said is in $log"
