@@ -10,7 +10,6 @@ again=
 with_lint=yes
 sanitize=
 short=
-lint=
 while [ $# -gt 0 ]; do
     case $1 in
     --target) target=${2:-} && shift ;;
@@ -32,9 +31,9 @@ while [ $# -gt 0 ]; do
 done
 
 # Many tests wait more than they compute, so one more than there are processors runs at a
-# time, and the static checks take what is left.
+# time.
 test_native() {
-    local once=mutate status=0
+    local once=mutate
     [ -z "$again" ] || once=
     # shellcheck disable=SC2086 # one word or none
     need_packages "build and test" play test tree maven $once
@@ -42,29 +41,9 @@ test_native() {
     local choice=(--label-exclude '^whole$')
     [ -z "$again" ] || choice=(--label-exclude '^(once|single)$')
     [ -z "$filter" ] || choice=(--label-exclude '^whole$' --tests-regex "$filter")
-    [ -z "$with_lint" ] || [ -n "$filter" ] || begin_lint
+    [ -z "$with_lint" ] || [ -n "$filter" ] || lint_everything
     on_some_display ctest --test-dir "$ORV_BUILD" --output-on-failure --no-tests=error \
-        --parallel "$(($(nproc) + 1))" "${choice[@]}" || status=$?
-    end_lint || status=1
-    return "$status"
-}
-
-# In a process group of its own, which ends whole with this one.
-begin_lint() {
-    set -m
-    nice -n 19 "$ORV_ROOT/orv" lint >"$ORV_BUILD/log/lint.log" 2>&1 </dev/null &
-    lint=$!
-    set +m
-    trap 'kill -- "-$lint" 2>/dev/null || true' EXIT
-}
-
-end_lint() {
-    [ -n "$lint" ] || return 0
-    local status=0
-    wait "$lint" || status=$?
-    trap - EXIT
-    cat -- "$ORV_BUILD/log/lint.log" >&2
-    return "$status"
+        --parallel "$(($(nproc) + 1))" "${choice[@]}"
 }
 
 # No Java: a virtual machine's own memory is beyond these sanitizers. The build is that

@@ -11,9 +11,6 @@ using namespace android;
 
 namespace {
 
-// The reference id of the Java objects' references; any fixed address does.
-const int kJavaReference = 0;
-
 // The layout of the long[] that nativeAcquire fills, as FrameReader reads it.
 enum FrameField { SLOT, WIDTH, HEIGHT, STRIDE, TIMESTAMP_US, MEMORY, FIELD_COUNT };
 

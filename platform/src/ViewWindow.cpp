@@ -13,9 +13,6 @@ using namespace android;
 
 namespace {
 
-// The reference id of the Java objects' references; any fixed address does.
-const int kJavaReference = 0;
-
 NativeWindow* windowOf(jlong handle) { return fromHandle<NativeWindow>(handle); }
 
 }  // namespace

@@ -9,13 +9,6 @@
 
 namespace android {
 
-namespace {
-
-// The reference id of the Java object's reference; any fixed address does.
-const int kJavaReference = 0;
-
-}  // namespace
-
 sp<Surface> android_view_Surface_getSurface(JNIEnv* env, jobject surfaceObj) {
     if (surfaceObj == nullptr) return nullptr;
     jclass const clazz = env->GetObjectClass(surfaceObj);

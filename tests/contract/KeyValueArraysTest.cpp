@@ -11,7 +11,7 @@ using fakejni::NativeResult;
 using fakejni::ObjectPtr;
 using fakejni::Value;
 
-constexpr char kTag[] = "Customer_media_Utils";
+constexpr char kUtilsTag[] = "Customer_media_Utils";
 
 class KeyValueArraysTest : public JniFixture {
 protected:
@@ -52,7 +52,7 @@ TEST_F(KeyValueArraysTest, NullAndEmptyArraysHaveNoPairs) {
 TEST_F(KeyValueArraysTest, MismatchThrows) {
     const Expected refused =
         Returns("false")
-            .logs({error("keys and values arrays have different length").tagged(kTag)})
+            .logs({error("keys and values arrays have different length").tagged(kUtilsTag)})
             .throws(kIllegalArgument);
     EXPECT_THAT(convert(strings({"a", "b"}), strings({"1"})), refused);
     EXPECT_THAT(convert(strings({"a"}), nullptr), refused);

@@ -19,7 +19,7 @@ namespace {
 
 using android::sp;
 
-const char kTag[] = "OrvMediaClient-JNI";
+const char kListenerTag[] = "OrvMediaClient-JNI";
 
 class MediaClientListenerTest : public ServiceFixture {
 protected:
@@ -52,10 +52,11 @@ TEST_F(MediaClientListenerTest, LogsItsConstructionAndDestruction) {
         "MediaClientListener::MediaClientListener(JNIEnv, jobject thiz, jobject weak_thiz): ";
     EXPECT_THAT(
         log.take(),
-        LinesAre({info(constructor + "Enter\n").tagged(kTag),
-                  info(constructor + "Leave\n").tagged(kTag),
-                  info("MediaClientListener::~MediaClientListener(): Enter\n").tagged(kTag),
-                  info("MediaClientListener::~MediaClientListener(): Leave\n").tagged(kTag)}));
+        LinesAre(
+            {info(constructor + "Enter\n").tagged(kListenerTag),
+             info(constructor + "Leave\n").tagged(kListenerTag),
+             info("MediaClientListener::~MediaClientListener(): Enter\n").tagged(kListenerTag),
+             info("MediaClientListener::~MediaClientListener(): Leave\n").tagged(kListenerTag)}));
 }
 
 TEST_F(MediaClientListenerTest, EventsGoToTheDispatcherWhichFindsNoPoster) {
@@ -64,8 +65,8 @@ TEST_F(MediaClientListenerTest, EventsGoToTheDispatcherWhichFindsNoPoster) {
     listener->notify(1, 2, 3, nullptr);
     ASSERT_TRUE(log.waitFor(discarded[1]));
     EXPECT_THAT(linesOf(true),
-                LinesAre({info("MediaClientListener::notify(): Enter\n").tagged(kTag),
-                          info("MediaClientListener::notify(): Leave\n").tagged(kTag)}));
+                LinesAre({info("MediaClientListener::notify(): Enter\n").tagged(kListenerTag),
+                          info("MediaClientListener::notify(): Leave\n").tagged(kListenerTag)}));
     EXPECT_THAT(linesOf(false), LinesAre(discarded));
 }
 
@@ -96,7 +97,7 @@ TEST_F(MediaClientListenerTest, ActionCarriesTheEventAndNoService) {
 // The leave line says that the dispatcher has the event.
 TEST_F(MediaClientListenerTest, LeavesWhenTheActionIsAdded) {
     ORV::SyncToAsync& dispatcher = *ORV::SyncToAsync::getInstance();
-    const ExpectedLine leave = info("MediaClientListener::notify(): Leave\n").tagged(kTag);
+    const ExpectedLine leave = info("MediaClientListener::notify(): Leave\n").tagged(kListenerTag);
     sp<MediaClientListener> listener = new MediaClientListener;
     std::optional<OtherThread> notifying;
     {

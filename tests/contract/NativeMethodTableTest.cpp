@@ -6,7 +6,7 @@
 namespace orvtest {
 namespace {
 
-struct Row {
+struct TableRow {
     const char* name;
     const char* signature;
     void* function;
@@ -14,8 +14,8 @@ struct Row {
 
 using namespace android;
 
-#define ROW(name, signature, function) Row{name, signature, reinterpret_cast<void*>(function)},
-const Row kRows[] = {ORV_NATIVE_METHODS(ROW)};
+#define ROW(name, signature, function) TableRow{name, signature, reinterpret_cast<void*>(function)},
+const TableRow kTable[] = {ORV_NATIVE_METHODS(ROW)};
 #undef ROW
 
 class NativeMethodTableTest : public JniFixture {};
@@ -25,9 +25,9 @@ TEST_F(NativeMethodTableTest, RegistersEveryRowInOrderWithItsFunction) {
     ASSERT_EQ(registered.size(), 83u);
     for (size_t i = 0; i < registered.size(); ++i) {
         SCOPED_TRACE(i + 1);
-        EXPECT_STREQ(registered[i].name, kRows[i].name);
-        EXPECT_STREQ(registered[i].signature, kRows[i].signature);
-        EXPECT_EQ(registered[i].fnPtr, kRows[i].function);
+        EXPECT_STREQ(registered[i].name, kTable[i].name);
+        EXPECT_STREQ(registered[i].signature, kTable[i].signature);
+        EXPECT_EQ(registered[i].fnPtr, kTable[i].function);
     }
 }
 

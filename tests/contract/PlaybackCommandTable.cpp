@@ -144,7 +144,7 @@ Command setParameter() {
     return returning(made, "false", "false");
 }
 
-const std::vector<Command> kRows = {
+const std::vector<Command> kCommands = {
     setDataSourceWithHeaders(),
     setDataSourceFd(),
     prepare(),
@@ -211,10 +211,10 @@ const std::vector<Command> kRows = {
 
 }  // namespace
 
-const std::vector<Command>& playbackCommands() { return kRows; }
+const std::vector<Command>& playbackCommands() { return kCommands; }
 
 const Command& playbackCommand(const std::string& name) {
-    return *std::find_if(kRows.begin(), kRows.end(), [&](const Command& command) {
+    return *std::find_if(kCommands.begin(), kCommands.end(), [&](const Command& command) {
         return command.function == "OrvMediaClient_" + name;
     });
 }

@@ -9,14 +9,14 @@
 namespace orvtest {
 namespace {
 
-const char kTag[] = "OrvMediaService";
+const char kServiceTag[] = "OrvMediaService";
 const int kUntouched = -77;
 const int kFromEngine = 4711;
 
 std::vector<ExpectedLine> joined(std::vector<ExpectedLine> first,
                                  const std::vector<ExpectedLine>& second) {
     first.insert(first.end(), second.begin(), second.end());
-    for (ExpectedLine& line : first) line.tag = kTag;
+    for (ExpectedLine& line : first) line.tag = kServiceTag;
     return first;
 }
 

@@ -12,13 +12,13 @@ using android::NO_ERROR;
 namespace orvkit {
 namespace {
 
-constexpr int kRestMs = 300;  // what is left to play before the end
+constexpr int kBeforeEndMs = 300;  // what is left to play before the end
 
 class PlaybackTest : public KitTest {
 protected:
     // Engines without seeks reach the end by playing all of it.
     void playToEnd() {
-        player->seekTo(duration() - kRestMs, 0);
+        player->seekTo(duration() - kBeforeEndMs, 0);
         ASSERT_EQ(NO_ERROR, player->start());
         ASSERT_TRUE(eventually([&] { return !player->isPlaying() && position() == duration(); }));
     }
@@ -116,7 +116,7 @@ TEST_F(PlaybackTest, LoopingOutlastsAReset) {
     ASSERT_EQ(NO_ERROR, player->reset());
     ORV_OPEN();
     ORV_NOT_OFFERED_IF(!player->canDoSeek(0), "it does not seek");
-    ASSERT_EQ(NO_ERROR, player->seekTo(duration() - kRestMs, 0));
+    ASSERT_EQ(NO_ERROR, player->seekTo(duration() - kBeforeEndMs, 0));
     ASSERT_EQ(NO_ERROR, player->start());
     EXPECT_TRUE(eventually([&] { return position() < kMiddleMs; }));
     EXPECT_TRUE(eventually([&] { return player->isPlaying(); }));

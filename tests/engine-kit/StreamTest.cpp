@@ -13,7 +13,7 @@ using orvtest::FakeStream;
 namespace orvkit {
 namespace {
 
-constexpr int kShortMs = 3000;
+constexpr int kStreamMs = 3000;
 
 class StreamTest : public KitTest {
 protected:
@@ -52,7 +52,7 @@ TEST_F(StreamTest, AStreamIsPlayed) {
     checks("setDataSource(source)", "The player takes the source over");
     openStream(stream);
     if (IsSkipped() || HasFailure()) return;
-    EXPECT_NEAR(kShortMs, duration(), kNearMs);
+    EXPECT_NEAR(kStreamMs, duration(), kNearMs);
     playBeyond(kNearMs);
     EXPECT_EQ(0, stream.mDeletes);
 }
@@ -126,7 +126,7 @@ TEST_F(StreamTest, ASourceThatCannotSeekIsPlayed) {
     openStream(broadcast);
     if (!IsSkipped() && !HasFailure()) {
         EXPECT_FALSE(player->canDoSeek(0));
-        EXPECT_EQ(INVALID_OPERATION, player->seekTo(kShortMs / 2, 0));
+        EXPECT_EQ(INVALID_OPERATION, player->seekTo(kStreamMs / 2, 0));
         playBeyond(kNearMs);
     }
     player->release();

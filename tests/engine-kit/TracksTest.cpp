@@ -10,8 +10,8 @@ namespace orvkit {
 namespace {
 
 constexpr int kTracks = 2;  // of sound, and as many of subtitles, in tracks.mp4
-constexpr int kWidth = 320;
-constexpr int kHeight = 180;
+constexpr int kVideoWidth = 320;
+constexpr int kVideoHeight = 180;
 
 class TracksTest : public KitTest {
 protected:
@@ -83,7 +83,7 @@ TEST_F(TracksTest, ThePictureHasTheSizeThatItIsSeenAt) {
     if (IsSkipped() || HasFailure()) return;
     int width = 0;
     ASSERT_EQ(NO_ERROR, player->getVideoWidth(&width));
-    EXPECT_EQ(kHeight, width) << "it lies in the file";
+    EXPECT_EQ(kVideoHeight, width) << "it lies in the file";
 }
 
 TEST_F(TracksTest, SoundHasNoPicture) {
@@ -103,8 +103,8 @@ TEST_F(TracksTest, ThePictureHasItsHeight) {
     int height = 0;
     ASSERT_EQ(NO_ERROR, player->getVideoWidth(&width));
     ASSERT_EQ(NO_ERROR, player->getVideoHeight(&height));
-    EXPECT_EQ(kWidth, width);
-    EXPECT_EQ(kHeight, height);
+    EXPECT_EQ(kVideoWidth, width);
+    EXPECT_EQ(kVideoHeight, height);
 }
 
 TEST_F(TracksTest, AudioTracksAreCounted) {

@@ -17,7 +17,7 @@ namespace {
 
 // Another scaler fills in the colours that are left out between pixels. The frame
 // beside the right one has less than 25 dB.
-constexpr double kSamePicture = 30;  // dB
+constexpr double kSameColours = 30;  // dB
 
 constexpr char kDeinterlace[] = "bwdif=mode=send_frame:deint=interlaced,";
 // Up to 1000 cd/m², of which 203 are white.
@@ -105,10 +105,10 @@ TEST_P(PictureTest, IsTheFrameThatFfmpegGives) {
     const Picture shown = sink->newest();
     EXPECT_EQ(kind.width, shown.width);
     EXPECT_EQ(kind.height, shown.height);
-    EXPECT_GE(psnr(shown.pixels, expected), kSamePicture);
+    EXPECT_GE(psnr(shown.pixels, expected), kSameColours);
     const std::vector<uint8_t> drawn = drawThumbnail(kind.width, kind.height);
-    EXPECT_GE(psnr(drawn, expected), kSamePicture) << "the thumbnail";
-    EXPECT_GE(psnr(drawn, shown.pixels), kSamePicture) << "the thumbnail and the frame";
+    EXPECT_GE(psnr(drawn, expected), kSameColours) << "the thumbnail";
+    EXPECT_GE(psnr(drawn, shown.pixels), kSameColours) << "the thumbnail and the frame";
 }
 
 TEST_F(PictureTracksTest, FollowsTheSelectedTrack) {
@@ -126,7 +126,7 @@ TEST_F(PictureTracksTest, ACoverIsAThumbnailAndNoFrame) {
         SCOPED_TRACE(name);
         player->reset();
         open(name);
-        EXPECT_GE(psnr(drawThumbnail(96, 64), cover), kSamePicture);
+        EXPECT_GE(psnr(drawThumbnail(96, 64), cover), kSameColours);
         playToEnd();
         EXPECT_EQ(0u, sink->frameCount());
     }

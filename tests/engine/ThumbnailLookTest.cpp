@@ -8,11 +8,10 @@ namespace orvtarn {
 namespace {
 
 using orvtest::decodedAt;
+using orvtest::kSamePicture;
 using orvtest::openThumbnailer;
 using orvtest::psnr;
 using orvtest::thumbnailAt;
-
-const double kSamePicture = 30;  // dB
 
 struct Look {
     const char* name;

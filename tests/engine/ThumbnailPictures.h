@@ -23,6 +23,9 @@ std::vector<uint8_t> thumbnailAt(orvtarn::Thumbnailer& thumbnailer, int64_t posi
 std::vector<uint8_t> decodedAt(const std::string& name, double seconds, const std::string& filters,
                                int width, int height);
 
+// In dB; a picture that another decoder or scaler made differs by no more.
+constexpr double kSamePicture = 30;
+
 // In dB over the three colours; 100 for equal pictures.
 double psnr(const std::vector<uint8_t>& one, const std::vector<uint8_t>& other);
 

@@ -10,12 +10,12 @@ namespace orvtarn {
 namespace {
 
 using orvtest::decodedAt;
+using orvtest::kSamePicture;
 using orvtest::openThumbnailer;
 using orvtest::psnr;
 using orvtest::thumbnailAt;
 
 // The frame beside the right one has less than 25 dB.
-const double kSamePicture = 30;  // dB
 
 struct Media {
     const char* name;

@@ -18,7 +18,7 @@ using orvtest::outputOf;
 
 // Both pictures come from the same decoder and scaler, so that what is left is
 // rounding; the frame beside the right one has less than 25 dB.
-const double kSamePicture = 40;  // dB
+const double kSameDrawing = 40;  // dB
 
 struct Mode {
     int32_t colorMode;
@@ -115,7 +115,7 @@ TEST(Thumbnailer, DrawsWhatFfmpegExtractsInEveryMode) {
         for (const Size size : {Size{150, 9}, Size{96, 255}}) {
             EXPECT_GT(psnr(mode, draw(*thumbnailer, 3480, size, mode),
                            reference("video.mp4", "3.48", size, mode)),
-                      kSamePicture)
+                      kSameDrawing)
                 << mode.pixelFormat << " " << size.width << "x" << size.height;
         }
     }
@@ -132,7 +132,7 @@ TEST(Thumbnailer, FindsTheFrameOfATimeInEveryContainer) {
             const bool isTs = std::string(name) == "video.ts";
             EXPECT_GT(psnr(kBgra, draw(*thumbnailer, position, {160, 90}),
                            reference(isTs ? "video.mp4" : name, time, {160, 90})),
-                      isTs ? 30 : kSamePicture)
+                      isTs ? 30 : kSameDrawing)
                 << name << " at " << time;
         }
     }
@@ -142,13 +142,13 @@ TEST(Thumbnailer, DrawsTheLastFramePastTheEndAndTheFirstBeforeTheStart) {
     const auto thumbnailer = open("video.mp4");
     const auto last = reference("video.mp4", "9.96", {160, 90});
     for (int64_t position : {int64_t{9960}, int64_t{9990}, int64_t{10000}, int64_t{1} << 40}) {
-        EXPECT_GT(psnr(kBgra, draw(*thumbnailer, position, {160, 90}), last), kSamePicture);
+        EXPECT_GT(psnr(kBgra, draw(*thumbnailer, position, {160, 90}), last), kSameDrawing);
     }
     // Broadcast formats cannot even be sought past the end.
     EXPECT_GT(psnr(kBgra, draw(*open("video.ts"), 60000, {160, 90}), last), 30);
     const auto first = reference("video.mp4", "0", {160, 90});
     for (int64_t position : {int64_t{0}, int64_t{-1}, INT64_MIN}) {
-        EXPECT_GT(psnr(kBgra, draw(*thumbnailer, position, {160, 90}), first), kSamePicture);
+        EXPECT_GT(psnr(kBgra, draw(*thumbnailer, position, {160, 90}), first), kSameDrawing);
     }
 }
 
@@ -158,7 +158,7 @@ TEST(Thumbnailer, DrawsTheSlideOnScreen) {
     for (int64_t position : {3000, 3500, 3880}) {
         EXPECT_GT(psnr(kBgra, draw(*thumbnailer, position, {160, 90}),
                        reference("slides.mkv", "3", {160, 90})),
-                  kSamePicture)
+                  kSameDrawing)
             << position;
     }
 }
@@ -177,12 +177,12 @@ TEST(Thumbnailer, TakesTheMatrixFromTheTagOrTheSize) {
     for (const char* name : {"hd.mp4", "hd709.mp4"}) {
         EXPECT_GT(psnr(kBgra, draw(*open(name), 400, {160, 90}),
                        reference(name, "0.4", {160, 90}, kBgra, ":in_color_matrix=bt709")),
-                  kSamePicture)
+                  kSameDrawing)
             << name;
         const Mode& uyvy = kModes[4];
         EXPECT_GT(psnr(uyvy, draw(*open(name), 400, {160, 90}, uyvy),
                        reference(name, "0.4", {160, 90}, uyvy, ":in_color_matrix=bt709")),
-                  kSamePicture)
+                  kSameDrawing)
             << name;
     }
 }
@@ -190,7 +190,7 @@ TEST(Thumbnailer, TakesTheMatrixFromTheTagOrTheSize) {
 TEST(Thumbnailer, DrawsOddSizesAndOtherFormats) {
     EXPECT_GT(
         psnr(kBgra, draw(*open("odd.mkv"), 400, {161, 91}), reference("odd.mkv", "0.4", {161, 91})),
-        kSamePicture);
+        kSameDrawing);
     const auto alpha = open("alpha.mov");
     const std::vector<uint8_t> pixels = draw(*alpha, 0, {64, 64});
     EXPECT_EQ(pixels[3], 0);
@@ -201,17 +201,17 @@ TEST(Thumbnailer, DrawsAStillPictureAgainAndAgain) {
     const auto thumbnailer = open("still.png");
     const auto expected = reference("still.png", "0", {160, 90});
     for (int64_t position : {0, 5000, 0}) {
-        EXPECT_GT(psnr(kBgra, draw(*thumbnailer, position, {160, 90}), expected), kSamePicture);
+        EXPECT_GT(psnr(kBgra, draw(*thumbnailer, position, {160, 90}), expected), kSameDrawing);
     }
 }
 
 TEST(Thumbnailer, DrawsTheCoverOfMusicAndTheVideoOfVideo) {
     const auto cover = reference("front.jpg", "", {96, 64});
-    EXPECT_GT(psnr(kBgra, draw(*open("covered.m4a"), 1000, {96, 64}), cover), kSamePicture);
+    EXPECT_GT(psnr(kBgra, draw(*open("covered.m4a"), 1000, {96, 64}), cover), kSameDrawing);
     EXPECT_LT(psnr(kBgra, draw(*open("covered.mkv"), 1000, {96, 64}), cover), 20);
     EXPECT_GT(psnr(kBgra, draw(*open("covered.mkv"), 1000, {96, 64}),
                    reference("covered.mkv", "1", {96, 64})),
-              kSamePicture);
+              kSameDrawing);
 }
 
 TEST(Thumbnailer, ReadsFromSourcesOfEveryKind) {
@@ -227,7 +227,7 @@ TEST(Thumbnailer, ReadsFromSourcesOfEveryKind) {
             ASSERT_EQ(MediaFile::open(std::move(source), {}, file), 0);
             std::unique_ptr<Thumbnailer> thumbnailer;
             ASSERT_EQ(Thumbnailer::create(std::move(file), -1, thumbnailer), 0);
-            EXPECT_GT(psnr(kBgra, draw(*thumbnailer, 3480, {160, 90}), expected), kSamePicture)
+            EXPECT_GT(psnr(kBgra, draw(*thumbnailer, 3480, {160, 90}), expected), kSameDrawing)
                 << isSeekable << hasSize;
         }
     }

@@ -3,10 +3,11 @@
 
 #include <jni/DivxNavigation.h>
 #include <jni/OrvMediaClient.h>
+#include <stdio.h>
+#include <stdlib.h>
 
 #include <algorithm>
 #include <set>
-#include <stdexcept>
 #include <tuple>
 
 #include "FakeJni/NativeCall.h"
@@ -117,7 +118,8 @@ const Native& native(const std::string& name) {
     for (const Native& row : natives()) {
         if (row.name == name) return row;
     }
-    throw std::logic_error("no native " + name);
+    fprintf(stderr, "no native %s\n", name.c_str());
+    abort();
 }
 
 void callOn(World& world, Random& random, const ObjectPtr& player, const Native& row) {

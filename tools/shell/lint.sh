@@ -40,16 +40,24 @@ lint_scripts() {
     } | xargs -0 realpath -z | sort -zu | xargs -0 shellcheck --external-sources
 }
 
-# The compiler's precompiled headers are not clang's: its commands go without. A source of
-# several programs is checked once.
+# Sources are checked in groups, which share the time that their headers take; a group lies
+# where its sources do, and has their settings.
 lint_tidy() {
-    local log=$ORV_BUILD/log/tidy.log database=$ORV_BUILD/tidy
-    mkdir -p "$database"
-    sed -E 's/-Winvalid-pch -include ([^ "\\]+|\\"[^"]*\\")//' "$ORV_BUILD/compile_commands.json" |
-        python3 -c 'import json, sys; print(json.dumps(list({each["file"]: each for each in json.load(sys.stdin)}.values())))' \
-            >"$database/compile_commands.json"
-    run-clang-tidy -quiet -p "$database" '^((?!cmake_pch).)*$' >"$log" 2>&1 && return
-    grep -E '(warning|error):' "$log" | sort -u
+    local log=$ORV_BUILD/log/tidy.log groups=$ORV_BUILD/tidy/groups singles=$ORV_BUILD/tidy/singles
+    database "$groups" -DCMAKE_UNITY_BUILD=ON -DCMAKE_UNITY_BUILD_BATCH_SIZE=16
+    (cd -- "$ORV_ROOT" && find . -path './build*' -prune -o -name .clang-tidy -print0 |
+        xargs -0 cp --parents -t "$groups")
+    database "$singles"
+    "$ORV_ROOT/tools/tidy" "$groups" "$singles" "$log" && return
     say "all that clang-tidy said is in $log"
     return 1
+}
+
+# database FOLDER OPTION…: how each source is compiled. The compiler's precompiled headers are
+# not clang's: its commands go without.
+database() {
+    local folder=$1
+    shift
+    run_logged "$ORV_BUILD/log/tidy-configure.log" cmake -S "$ORV_ROOT" -B "$folder" -G Ninja \
+        -DORV_TESTS=ON -DCMAKE_DISABLE_PRECOMPILE_HEADERS=ON "$@"
 }

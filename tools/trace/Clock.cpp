@@ -7,8 +7,7 @@ namespace orvtrace {
 
 namespace {
 
-constexpr int64_t kSecond = 1000000000;
-constexpr int64_t kDay = 24 * 60 * 60 * kSecond;
+constexpr int64_t kDay = 24 * 60 * 60 * kNanosecondsPerSecond;
 constexpr int kDaysBefore[] = {0, 31, 59, 90, 120, 151, 181, 212, 243, 273, 304, 334};
 constexpr int kHalfYear = 182;
 
@@ -26,7 +25,7 @@ int64_t Clock::at(const LogTime& time) {
     if (!time.known) return 0;
     mDigits = std::min(mDigits, time.digits);
     const int64_t now = (time.counted ? 0 : dayOf(time) * kDay) + time.nanoseconds;
-    if (mStarted && now < mLatest - kSecond) {
+    if (mStarted && now < mLatest - kNanosecondsPerSecond) {
         ++mSetBack;
         mLatest = now;
     }

@@ -61,8 +61,6 @@ private:
     const char* mEnd;
 };
 
-constexpr int64_t kSecond = 1000000000;
-
 // ".123", as nanoseconds. Nothing is nothing.
 bool takeFraction(Cursor& cursor, int64_t& nanoseconds, int& digits) {
     nanoseconds = 0;
@@ -106,7 +104,7 @@ bool takeTimeOfDay(Cursor& cursor, LogTime& time) {
         return false;
     }
     if (hours > 23 || minutes > 59 || seconds > 60) return false;
-    time.nanoseconds = ((hours * 60 + minutes) * 60LL + seconds) * kSecond + fraction;
+    time.nanoseconds = ((hours * 60 + minutes) * 60LL + seconds) * kNanosecondsPerSecond + fraction;
     return true;
 }
 
@@ -126,7 +124,7 @@ bool takeTime(Cursor& cursor, LogTime& time) {
             return false;
         }
         time.counted = true;
-        time.nanoseconds = seconds * kSecond + fraction;
+        time.nanoseconds = seconds * kNanosecondsPerSecond + fraction;
     }
     time.known = true;
     time.text = {begin, static_cast<size_t>(cursor.at() - begin)};

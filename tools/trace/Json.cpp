@@ -7,7 +7,7 @@ namespace orvtrace {
 
 namespace {
 
-constexpr size_t kBufferSize = 256 * 1024;
+constexpr size_t kWriteSize = 256 * 1024;
 
 bool isAscii(std::string_view text) {
     unsigned char all = 0;
@@ -18,7 +18,7 @@ bool isAscii(std::string_view text) {
 }  // namespace
 
 Json::Json(FILE* file)
-    : mBuffer(kBufferSize), mStream(file, mBuffer.data(), mBuffer.size()), mWriter(mStream) {}
+    : mBuffer(kWriteSize), mStream(file, mBuffer.data(), mBuffer.size()), mWriter(mStream) {}
 
 void Json::text(std::string_view text) {
     if (isAscii(text)) {

@@ -9,11 +9,11 @@
 namespace orvtrace {
 
 namespace {
-constexpr size_t kBufferSize = 4 * LineReader::kMaxLine;
+constexpr size_t kReadSize = 4 * LineReader::kMaxLine;
 }
 
 LineReader::LineReader(int fd, int patienceMs)
-    : mFd(fd), mPatienceMs(patienceMs), mBuffer(kBufferSize) {}
+    : mFd(fd), mPatienceMs(patienceMs), mBuffer(kReadSize) {}
 
 LineReader::Result LineReader::next(std::string_view& line) {
     while (true) {

@@ -6,6 +6,8 @@
 
 namespace orvtrace {
 
+constexpr int64_t kNanosecondsPerSecond = 1000000000;
+
 // A date and a time of day as a log line has them.
 struct LogTime {
     bool known = false;       // brief lines have none

@@ -6,7 +6,7 @@
 namespace orvtarn {
 namespace {
 
-std::mutex gMutex;
+std::mutex gCoresMutex;
 int gCores = 0;
 // The one that was made while there was no other; null when that one is gone or, of
 // several that were made at once, not known.
@@ -18,7 +18,7 @@ bool gFirstIsMade = false;
 bool SharedLog::isOfFfmpeg(std::string_view writer) { return writer.substr(0, 6) == "ffmpeg"; }
 
 void SharedLog::enter() {
-    std::lock_guard<std::mutex> lock(gMutex);
+    std::lock_guard<std::mutex> lock(gCoresMutex);
     mEntered = true;
     if (gCores++ == 0) {
         gFirst = this;
@@ -29,12 +29,12 @@ void SharedLog::enter() {
 }
 
 void SharedLog::settle() {
-    std::lock_guard<std::mutex> lock(gMutex);
+    std::lock_guard<std::mutex> lock(gCoresMutex);
     if (gFirst == this) gFirstIsMade = true;
 }
 
 void SharedLog::leave() {
-    std::lock_guard<std::mutex> lock(gMutex);
+    std::lock_guard<std::mutex> lock(gCoresMutex);
     if (!mEntered) return;
     mEntered = false;
     gCores--;
@@ -42,7 +42,7 @@ void SharedLog::leave() {
 }
 
 bool SharedLog::isOwn() const {
-    std::lock_guard<std::mutex> lock(gMutex);
+    std::lock_guard<std::mutex> lock(gCoresMutex);
     return gFirst == this && gCores == 1;
 }
 

@@ -10,7 +10,7 @@ namespace orvtarn {
 namespace {
 
 // Those whose errors end nothing.
-std::mutex gMutex;
+std::mutex gDisplaysMutex;
 std::set<Display*> gDisplays;
 XErrorHandler gFormerHandler = nullptr;
 
@@ -50,7 +50,7 @@ const XConnection::Library* XConnection::library() {
 int XConnection::onError(Display* display, XErrorEvent* event) {
     XErrorHandler former = nullptr;
     {
-        std::lock_guard<std::mutex> lock(gMutex);
+        std::lock_guard<std::mutex> lock(gDisplaysMutex);
         if (gDisplays.count(display) > 0) return 0;
         former = gFormerHandler;
     }
@@ -67,7 +67,7 @@ std::unique_ptr<XConnection> XConnection::open() {
 // The handler is set again each time: others may have set theirs meanwhile.
 XConnection::XConnection(const Library& library, Display* display)
     : mLibrary(library), mDisplay(display) {
-    std::lock_guard<std::mutex> lock(gMutex);
+    std::lock_guard<std::mutex> lock(gDisplaysMutex);
     gDisplays.insert(display);
     const XErrorHandler former = mLibrary.setErrorHandler(onError);
     if (former != onError) gFormerHandler = former;
@@ -75,7 +75,7 @@ XConnection::XConnection(const Library& library, Display* display)
 
 XConnection::~XConnection() {
     mLibrary.closeDisplay(mDisplay);
-    std::lock_guard<std::mutex> lock(gMutex);
+    std::lock_guard<std::mutex> lock(gDisplaysMutex);
     gDisplays.erase(mDisplay);
 }
 

@@ -17,8 +17,7 @@ extern "C" {
 namespace orvtarn {
 namespace {
 
-constexpr int64_t kRoundingUs = StreamTime::kRoundingUs;
-constexpr int64_t kFirstRunUpUs = 1000 * 1000;
+constexpr int64_t kFrameRunUpUs = 1000 * 1000;
 
 class FrameCounter {
 public:
@@ -26,10 +25,10 @@ public:
         : mFile(file), mStream(stream), mTime(file, stream) {}
 
     std::optional<FrameAt> find(int64_t timeUs, int amount) {
-        for (int64_t ahead = kFirstRunUpUs; !mFile.isInterrupted(); ahead *= 4) {
+        for (int64_t ahead = kFrameRunUpUs; !mFile.isInterrupted(); ahead *= 4) {
             const int64_t fromUs = std::max<int64_t>(timeUs - ahead, 0);
             if (!mTime.seek(fromUs) || !read(timeUs, amount)) return {};
-            const auto now = mTimes.upper_bound(timeUs + kRoundingUs);
+            const auto now = mTimes.upper_bound(timeUs + StreamTime::kRoundingUs);
             const auto before = static_cast<int>(std::distance(mTimes.begin(), now)) - 1;
             const bool isEnough = before >= std::max(-amount, 0);
             if (isEnough || fromUs == 0) return at(before + amount);
@@ -63,7 +62,7 @@ private:
             if (isPicture && areTimed) {
                 const int64_t us = mTime.of(packet->pts);
                 const bool isNew = mTimes.insert(us).second;
-                after += isNew && us > timeUs + kRoundingUs;
+                after += isNew && us > timeUs + StreamTime::kRoundingUs;
                 goesOn = after < std::max(amount, 1) || !isSettled(*packet, timeUs, amount);
             }
             av_packet_unref(packet);
@@ -75,7 +74,7 @@ private:
     // Whether no packet to come is shown before the frame that is wanted.
     bool isSettled(const AVPacket& packet, int64_t timeUs, int amount) const {
         if (packet.dts == AV_NOPTS_VALUE) return true;
-        auto wanted = mTimes.upper_bound(timeUs + kRoundingUs);
+        auto wanted = mTimes.upper_bound(timeUs + StreamTime::kRoundingUs);
         std::advance(wanted, std::max(amount, 1) - 1);
         return mTime.of(packet.dts) >= *wanted;
     }

@@ -14,8 +14,7 @@ extern "C" {
 namespace orvtarn {
 namespace {
 
-constexpr int64_t kRoundingUs = StreamTime::kRoundingUs;
-constexpr int64_t kFirstRunUpUs = 2 * 1000 * 1000;
+constexpr int64_t kKeyFrameRunUpUs = 2 * 1000 * 1000;
 
 class Search {
 public:
@@ -72,8 +71,8 @@ std::optional<double> keyFrameBefore(MediaFile& file, double seconds) {
     const int best = av_find_best_stream(file.context(), AVMEDIA_TYPE_VIDEO, -1, -1, nullptr, 0);
     if (best < 0) return {};
     Search search(file, *file.stream(best));
-    const auto target = static_cast<int64_t>(seconds * 1e6) + kRoundingUs;
-    for (int64_t ahead = kFirstRunUpUs; !file.isInterrupted(); ahead *= 4) {
+    const auto target = static_cast<int64_t>(seconds * 1e6) + StreamTime::kRoundingUs;
+    for (int64_t ahead = kKeyFrameRunUpUs; !file.isInterrupted(); ahead *= 4) {
         const int64_t from = std::max<int64_t>(target - ahead, 0);
         const std::optional<int64_t> found = search.lastKeyFrame(from, target);
         if (found) return static_cast<double>(*found) / 1e6;

@@ -70,14 +70,17 @@ Frame newFrame(AVPixelFormat format, int width, int height) {
     return av_frame_get_buffer(frame.get(), 0) < 0 ? nullptr : std::move(frame);
 }
 
-const AVPixFmtDescriptor& describe(const AVFrame& frame) {
+const AVPixFmtDescriptor& knownFormatOf(const AVFrame& frame) {
     return *av_pix_fmt_desc_get(static_cast<AVPixelFormat>(frame.format));
 }
 
-bool hasAlpha(const AVFrame& frame) { return (describe(frame).flags & AV_PIX_FMT_FLAG_ALPHA) != 0; }
+bool hasAlpha(const AVFrame& frame) {
+    return (knownFormatOf(frame).flags & AV_PIX_FMT_FLAG_ALPHA) != 0;
+}
 
 bool isFullRange(const AVFrame& frame) {
-    return frame.color_range == AVCOL_RANGE_JPEG || strncmp(describe(frame).name, "yuvj", 4) == 0;
+    return frame.color_range == AVCOL_RANGE_JPEG ||
+           strncmp(knownFormatOf(frame).name, "yuvj", 4) == 0;
 }
 
 // Between RGB formats libswscale takes a way through YUV, and back by the same.

@@ -38,12 +38,12 @@ double peakOf(const LightMetadata& light) {
     return isKnown ? av_q2d(light.mastering->max_luminance) : 0;
 }
 
-const AVPixFmtDescriptor* describe(const AVFrame& frame) {
+const AVPixFmtDescriptor* formatOf(const AVFrame& frame) {
     return av_pix_fmt_desc_get(static_cast<AVPixelFormat>(frame.format));
 }
 
 bool isRgb(const AVFrame& frame) {
-    const AVPixFmtDescriptor* format = describe(frame);
+    const AVPixFmtDescriptor* format = formatOf(frame);
     return format != nullptr && (format->flags & AV_PIX_FMT_FLAG_RGB) != 0;
 }
 

@@ -18,7 +18,7 @@ namespace {
 
 using android::status_t;
 
-constexpr int kSample = 64 * 1024;
+constexpr int kFormatSample = 64 * 1024;
 
 struct KnownFormat {
     const char* libavName;  // one of those that a format of libavformat has
@@ -77,13 +77,13 @@ status_t checkFormat(std::vector<uint8_t> bytes) {
 status_t checkFormat(MediaSource& source) {
     const std::unique_ptr<ByteSource> reader = openReader(source);
     if (reader == nullptr) return ORV_ERROR_MALFORMED;
-    std::vector<uint8_t> bytes(kSample);
+    std::vector<uint8_t> bytes(kFormatSample);
     int length = 0;
     int count = 0;
     do {
-        count = reader->read(bytes.data() + length, kSample - length);
+        count = reader->read(bytes.data() + length, kFormatSample - length);
         if (count > 0) length += count;
-    } while (count > 0 && length < kSample);
+    } while (count > 0 && length < kFormatSample);
     if (count < 0) return ORV_ERROR_IO;
     bytes.resize(static_cast<size_t>(length));
     return checkFormat(std::move(bytes));

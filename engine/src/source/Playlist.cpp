@@ -13,7 +13,7 @@ namespace {
 
 const char* const kEndings[] = {".m3u", ".m3u8", ".pls", ".asx", ".mpd"};
 const char* const kStarts[] = {"#EXTM3U", "[playlist]", "<MPD", "<ASX"};
-constexpr size_t kSample = 1024;
+constexpr size_t kPlaylistSample = 1024;
 
 bool endsWith(const std::string& path, const std::string& ending) {
     return path.size() > ending.size() &&
@@ -23,9 +23,9 @@ bool endsWith(const std::string& path, const std::string& ending) {
 std::string sampleOf(const std::string& path) {
     struct stat status;
     if (stat(path.c_str(), &status) != 0 || !S_ISREG(status.st_mode)) return "";
-    std::string sample(kSample, '\0');
+    std::string sample(kPlaylistSample, '\0');
     std::ifstream file(path, std::ios::binary);
-    file.read(sample.data(), kSample);
+    file.read(sample.data(), kPlaylistSample);
     sample.resize(static_cast<size_t>(file.gcount()));
     return sample;
 }

@@ -22,7 +22,7 @@ using android::status_t;
 using Clock = std::chrono::steady_clock;
 
 constexpr long kLimitMs = 5000;
-constexpr size_t kSample = 64 * 1024;
+constexpr size_t kAnswerSample = 64 * 1024;
 // Between two bytes of an answer that goes on.
 constexpr std::chrono::seconds kPause{2};
 constexpr long kLargestRedirection = 8;  // as libavformat
@@ -47,13 +47,13 @@ struct Sample {
     std::vector<uint8_t> bytes;
     Clock::time_point newest = Clock::now();
 
-    bool isFull() const { return bytes.size() >= kSample; }
+    bool isFull() const { return bytes.size() >= kAnswerSample; }
     bool isFlowing() const { return Clock::now() - newest < kPause; }
 };
 
 size_t take(char* data, size_t, size_t length, void* context) {
     auto* sample = static_cast<Sample*>(context);
-    const size_t count = std::min(length, kSample - sample->bytes.size());
+    const size_t count = std::min(length, kAnswerSample - sample->bytes.size());
     sample->bytes.insert(sample->bytes.end(), data, data + count);
     sample->newest = Clock::now();
     return sample->isFull() ? 0 : length;
