@@ -67,8 +67,7 @@ fuzz_target() {
     local target=$1 status=0 options
     mkdir -p -- "$folder/grown/$target"
     mapfile -t options < <(fuzzer_options "$target")
-    LSAN_OPTIONS=suppressions=$ORV_ROOT/cmake/lsan.supp:print_suppressions=0 \
-        "$folder/bin/$target" "${options[@]}" "$folder/grown/$target" \
+    "$folder/bin/$target" "${options[@]}" "$folder/grown/$target" \
         "$ORV_ROOT/fuzz/corpus/$target" >"$ORV_BUILD/log/fuzz-$target.log" 2>&1 </dev/null ||
         status=$?
     report_target "$target" "$status"

@@ -67,7 +67,6 @@ ctest_sanitized() {
     rm -rf -- "$reports" && mkdir -p -- "$reports"
     [ -z "$filter" ] || choice=(--tests-regex "$filter")
     ASAN_OPTIONS=log_path=$reports/asan UBSAN_OPTIONS=log_path=$reports/ubsan:print_stacktrace=1 \
-        LSAN_OPTIONS=suppressions=$ORV_ROOT/cmake/lsan.supp:print_suppressions=0 \
         on_some_display ctest --test-dir "$(preset_folder asan)" --output-on-failure --no-tests=error \
         --parallel "$(($(nproc) + 1))" --exclude-regex '^tools\.' "${choice[@]}" "$@" || status=$?
     [ -n "$(find "$reports" -type f -size +0)" ] || return "$status"

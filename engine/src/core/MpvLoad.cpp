@@ -43,7 +43,11 @@ int loadMedia(mpv_handle* mpv, const std::string& name, const MpvOptions& option
     command.put("url", name.c_str());
     command.put("options", forMedia.node());
     mpv_node node = command.node();
-    return mpv_command_node(mpv, &node, nullptr);
+    // mpv keeps its answer, the entry of its playlist, for good unless somebody takes it.
+    mpv_node answer = {};
+    const int error = mpv_command_node(mpv, &node, &answer);
+    mpv_free_node_contents(&answer);
+    return error;
 }
 
 }  // namespace orvtarn
