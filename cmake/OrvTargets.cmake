@@ -27,3 +27,11 @@ endif()
 include(AndroidPackages)
 set(CMAKE_BUILD_RPATH ${ANDROID_LIBRARY_DIR})
 find_package(Threads REQUIRED)
+
+# Has all functions of a library be found when it is linked. A sanitizer's are the
+# program's alone.
+function(orv_refuse_undefined library)
+  if(NOT CMAKE_CXX_FLAGS MATCHES "-fsanitize")
+    target_link_options(${library} PRIVATE LINKER:--no-undefined)
+  endif()
+endfunction()
