@@ -75,6 +75,26 @@ TEST(ClockTest, CountsThatItWasSetBackAndNotThatLinesAreOutOfOrder) {
     EXPECT_EQ(clock.setBack(), 1u);
 }
 
+TEST(ClockTest, HasAllTimesThatALogMayHave) {
+    const int64_t years = 2200 - 1970;
+    const int64_t leapDays = 56;  // 1972 to 2196, without 2100
+    EXPECT_EQ(passed("1970-01-01 00:00:00", "2200-01-01 00:00:00"),
+              (years * 365 + leapDays) * kDay);
+    EXPECT_EQ(passed("1970-01-01 00:00:00.5", "8000000000.5"), 8000000000 * kSecond);
+}
+
+TEST(ClockTest, EndsTheYearsOfALogThatDoesNot) {
+    Clock clock;
+    int64_t last = 0;
+    for (int year = 0; year < 400; ++year) {
+        for (const char* day : {"01-01 00:00:00", "06-01 00:00:00", "12-01 00:00:00"}) {
+            last = clock.at(timeOf(day));
+        }
+    }
+    EXPECT_LT(last, kMostSeconds * kSecond);
+    EXPECT_GT(clock.setBack(), 0U);
+}
+
 TEST(ClockTest, SecondsSinceAStartNeedNoDate) {
     EXPECT_EQ(passed("1700000000.5", "1700000001.25"), kSecond * 3 / 4);
 }

@@ -10,13 +10,19 @@ namespace {
 constexpr int64_t kDay = 24 * 60 * 60 * kNanosecondsPerSecond;
 constexpr int kDaysBefore[] = {0, 31, 59, 90, 120, 151, 181, 212, 243, 273, 304, 334};
 constexpr int kHalfYear = 182;
+constexpr int64_t kMostDays = int64_t{365} * (kLastYear - kFirstYear);
 
 bool isLeapYear(int year) { return (year % 4 == 0 && year % 100 != 0) || year % 400 == 0; }
 
-// Days from a year 0 to the first of January.
-int64_t daysBefore(int year) {
+int64_t leapDaysBefore(int year) {
     const int64_t past = year - 1;
-    return 365 * static_cast<int64_t>(year) + past / 4 - past / 100 + past / 400;
+    return past / 4 - past / 100 + past / 400;
+}
+
+// Days from the first of January of the first year that a log may have to that of this one.
+int64_t daysBefore(int year) {
+    return 365 * static_cast<int64_t>(year - kFirstYear) + leapDaysBefore(year) -
+           leapDaysBefore(kFirstYear);
 }
 
 }  // namespace
@@ -43,7 +49,7 @@ int64_t Clock::dayOf(const LogTime& time) {
     }
     int day = kDaysBefore[time.month - 1] + time.day - 1;
     if (mStarted && day > mDayOfYear + kHalfYear) return mYearBegin - mLengthBefore + day;
-    if (mStarted && day < mDayOfYear - kHalfYear) {
+    if (mStarted && day < mDayOfYear - kHalfYear && mYearBegin < kMostDays) {
         mLengthBefore = mLeapDaySeen ? 366 : 365;
         mYearBegin += mLengthBefore;
         mLeapDaySeen = false;

@@ -16,7 +16,7 @@ public:
     int64_t at(const LogTime& time);
     // How often a line was older than one before it by more than a second: the clock was set.
     uint64_t setBack() const { return mSetBack; }
-    // The fewest digits behind the point so far: 3 where lines have milliseconds.
+    // The fewest digits after the point so far: 3 where lines have milliseconds.
     int digits() const { return mDigits; }
 
 private:

@@ -88,8 +88,11 @@ bool takeDate(Cursor& cursor, LogTime& time) {
     int first;
     if (!cursor.takeInt(first, 4)) return false;
     const bool hasYear = cursor.at() - begin == 4;
-    if (hasYear) time.year = first;
-    if (hasYear && !(cursor.take('-') && cursor.takeInt(first, 2))) return false;
+    if (hasYear) {
+        time.year = first;
+        if (time.year < kFirstYear || time.year > kLastYear) return false;
+        if (!cursor.take('-') || !cursor.takeInt(first, 2)) return false;
+    }
     time.month = first;
     return cursor.take('-') && cursor.takeInt(time.day, 2) && time.month >= 1 && time.month <= 12 &&
            time.day >= 1 && time.day <= 31;
@@ -119,8 +122,8 @@ bool takeTime(Cursor& cursor, LogTime& time) {
         time = {};
         int64_t seconds, fraction;
         cursor.takeBlanks();
-        if (!cursor.takeNumber(seconds, 10) || !takeFraction(cursor, fraction, time.digits) ||
-            time.digits == 0) {
+        if (!cursor.takeNumber(seconds, 10) || seconds > kMostSeconds ||
+            !takeFraction(cursor, fraction, time.digits) || time.digits == 0) {
             return false;
         }
         time.counted = true;
