@@ -57,13 +57,12 @@ const Row kRows[] = {
 INSTANTIATE_TEST_SUITE_P(All, FormatsTest, testing::ValuesIn(kRows));
 
 TEST(ForeignLinesTest, AreNoEntries) {
-    for (const char* text : {"x", "hello world", "11-22 10:00:01.123", "11-22 10:00:01.123 1 2 I",
-                             "11-22 10:00:01.123 1 2 I A", "11-22 25:00:01.123 1 2 I A: x",
-                             "13-22 10:00:01.123 1 2 I A: x", "11-32 10:00:01.123 1 2 I A: x",
-                             "I/A(x): y", "12 34 I A: x", "[ 11-22 10:00:01.123 1:2 I/A",
-                             "1969-11-22 10:00:01.123 1 2 I A: x",
-                             "2201-11-22 10:00:01.123 1 2 I A: x",
-                             "8000000001.123 1 2 I A: x"}) {
+    for (const char* text :
+         {"x", "hello world", "11-22 10:00:01.123", "11-22 10:00:01.123 1 2 I",
+          "11-22 10:00:01.123 1 2 I A", "11-22 25:00:01.123 1 2 I A: x",
+          "13-22 10:00:01.123 1 2 I A: x", "11-32 10:00:01.123 1 2 I A: x", "I/A(x): y",
+          "12 34 I A: x", "[ 11-22 10:00:01.123 1:2 I/A", "1969-11-22 10:00:01.123 1 2 I A: x",
+          "2201-11-22 10:00:01.123 1 2 I A: x", "8000000001.123 1 2 I A: x"}) {
         FormatReader formats;
         LogLine line;
         EXPECT_EQ(formats.read(text, line), Result::kForeign) << text;

@@ -15,7 +15,6 @@
 
 #include "base/EngineLog.h"
 #include "core/MpvError.h"
-#include "core/MpvLoad.h"
 #include "source/StreamMediaSource.h"
 #include "source/UrlScheme.h"
 
@@ -189,12 +188,7 @@ android::status_t Loader::load() {
     setReach(*media);
     secondReading()->tryAgain();
     if (mBeforeLoad) mBeforeLoad();
-    MpvOptions options;
-    {
-        std::lock_guard<std::mutex> lock(mSourceMutex);
-        if (mRawFormat) options = mRawFormat->options;
-    }
-    const int error = loadMedia(mMpv.get(), media->name(), options);
+    const int error = loadMedia(mMpv.get(), media->name(), mediaOptions());
     if (error >= 0) return android::NO_ERROR;
     const android::status_t status = statusOfMpvError(error);
     mState.update([&](PlayerState::Values& v) {
@@ -202,6 +196,14 @@ android::status_t Loader::load() {
         v.fileOpen = false;
     });
     return failed(status, "prepare", mpv_error_string(error));
+}
+
+// The channels are no option of one media: mpv never frees those.
+MpvOptions Loader::mediaOptions() {
+    std::lock_guard<std::mutex> lock(mSourceMutex);
+    if (!mRawFormat) return {};
+    mMpv.set("demuxer-rawaudio-channels", std::to_string(mRawFormat->channels));
+    return mRawFormat->options;
 }
 
 // mpv keeps headers for all its requests, so those of an earlier source

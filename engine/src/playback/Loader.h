@@ -12,6 +12,7 @@
 #include <string>
 
 #include "core/MpvHandle.h"
+#include "core/MpvLoad.h"
 #include "core/OpenMedia.h"
 #include "core/PlayerState.h"
 #include "core/VideoOutput.h"
@@ -69,6 +70,7 @@ private:
     void describeSource();
     android::status_t beginPrepare(const char* operation, uint64_t& session);
     android::status_t load();
+    MpvOptions mediaOptions();
     void setHeaders();
     void setReach(const MediaSource& media);
     android::status_t awaitPrepared(uint64_t session);

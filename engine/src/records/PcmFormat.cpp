@@ -67,8 +67,7 @@ void setCompanded(const ORV_AUD_PCM_INFO_T& pcm, PcmFormat& format) {
 void setLinear(const ORV_AUD_PCM_INFO_T& pcm, PcmFormat& format) {
     format.options = {{"demuxer", "rawaudio"},
                       {"demuxer-rawaudio-format", sampleFormat(pcm)},
-                      {"demuxer-rawaudio-rate", std::to_string(pcm.eSampleRate)},
-                      {"demuxer-rawaudio-channels", std::to_string(pcm.eNumCh)}};
+                      {"demuxer-rawaudio-rate", std::to_string(pcm.eSampleRate)}};
 }
 
 // Milliseconds, 0 when unknown.
@@ -90,6 +89,7 @@ bool pcmFormat(const IORV_PB_CTRL_SET_MEDIA_INFO_T& info, PcmFormat& format, std
         return false;
     }
     format = PcmFormat();
+    format.channels = pcm.eNumCh;
     format.bytesPerSecond = pcm.eSampleRate * pcm.u2BlockAlign;
     format.durationMs = durationOf(info, format.bytesPerSecond);
     const bool isCompanded =

@@ -12,7 +12,8 @@ namespace orvtarn {
 
 // How mpv is to read a stream of raw samples.
 struct PcmFormat {
-    MpvOptions options;
+    MpvOptions options;  // all but the channels
+    int channels = 0;
     int bytesPerSecond = 0;
     int64_t durationMs = 0;  // 0 when the description does not say
 };
