@@ -30,7 +30,7 @@ while [ $# -gt 0 ]; do
     shift || die_usage "an option of test lacks its value."
 done
 
-# Many tests wait more than they compute, so one more than there are processors runs at a
+# Many tests wait more than they compute, so two more than there are processors run at a
 # time.
 test_native() {
     local once=mutate
@@ -43,7 +43,7 @@ test_native() {
     [ -z "$filter" ] || choice=(--label-exclude '^whole$' --tests-regex "$filter")
     [ -z "$with_lint" ] || [ -n "$filter" ] || lint_everything
     on_some_display ctest --test-dir "$ORV_BUILD" --output-on-failure --no-tests=error \
-        --parallel "$(($(nproc) + 1))" "${choice[@]}"
+        --parallel "$(($(nproc) + 2))" "${choice[@]}"
 }
 
 # No Java: a virtual machine's own memory is beyond these sanitizers. The build is that
