@@ -154,8 +154,10 @@ void HttpServer::answer(int connection, const std::string& request, const HttpFa
     } else {
         return sendFile(connection, request, faults);
     }
-    head = "HTTP/1.1 " + head + "\r\nContent-Length: 0\r\n\r\n";
-    sendAll(connection, head.data(), head.size());
+    // As most servers, with words for people.
+    const std::string words = "<p>See elsewhere.</p>";
+    head = "HTTP/1.1 " + head + "\r\nContent-Length: " + std::to_string(words.size()) + "\r\n\r\n";
+    sendAll(connection, (head + words).data(), head.size() + words.size());
 }
 
 void HttpServer::sendFile(int connection, const std::string& request, const HttpFaults& faults) {

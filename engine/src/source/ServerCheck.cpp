@@ -108,6 +108,8 @@ void setLimits(CURL* easy) {
     curl_easy_setopt(easy, CURLOPT_TIMEOUT_MS, kLimitMs);
     curl_easy_setopt(easy, CURLOPT_FOLLOWLOCATION, 1L);
     curl_easy_setopt(easy, CURLOPT_MAXREDIRS, kLargestRedirection);
+    // A server may close a connection that it redirects on without a word.
+    curl_easy_setopt(easy, CURLOPT_FORBID_REUSE, 1L);
     curl_easy_setopt(easy, CURLOPT_PROTOCOLS_STR, "http,https,ftp,ftps");
     curl_easy_setopt(easy, CURLOPT_REDIR_PROTOCOLS_STR, "http,https");
     curl_easy_setopt(easy, CURLOPT_USERAGENT, "orvtarn");  // unless the headers have one
@@ -124,6 +126,8 @@ void setTrust(CURL* easy) {
 
 status_t statusOf(CURLcode code, long httpStatus, const Sample& sample) {
     if (httpStatus >= kFirstFailure) return ORV_ERROR_HTTP - static_cast<status_t>(httpStatus);
+    // The sample is of the last answer, which is words for people.
+    if (code == CURLE_TOO_MANY_REDIRECTS) return ORV_ERROR_REDIRECTS;
     if (sample.isFull() || (!sample.bytes.empty() && sample.isFlowing())) {
         return android::NO_ERROR;
     }
@@ -137,8 +141,6 @@ status_t statusOf(CURLcode code, long httpStatus, const Sample& sample) {
             return ORV_ERROR_CANNOT_CONNECT;
         case CURLE_OPERATION_TIMEDOUT:
             return ORV_ERROR_NO_ANSWER;
-        case CURLE_TOO_MANY_REDIRECTS:
-            return ORV_ERROR_REDIRECTS;
         case CURLE_UNSUPPORTED_PROTOCOL:  // where a redirect leads to
             return ORV_ERROR_LOCAL_REFERENCE;
         case CURLE_PEER_FAILED_VERIFICATION:
