@@ -34,7 +34,9 @@ final class SeekPreview extends MouseAdapter {
     /** Takes pictures from there from now on; null for none. */
     void use(Previews previews) {
         this.previews = previews;
-        hide();
+        if (isOpen()) {
+            update();
+        }
     }
 
     /** A picture is there, which is wanted if the pointer still is at that part. */
@@ -78,10 +80,15 @@ final class SeekPreview extends MouseAdapter {
     }
 
     private void follow(MouseEvent event) {
+        x = event.getX();
+        update();
+    }
+
+    private void update() {
         if (!bar.isEnabled() || !bar.isShowing()) {
+            hide();
             return;
         }
-        x = event.getX();
         int millis = bar.timeAt(x);
         card.showPlace(Times.clock(millis), bar.chapterAt(millis));
         if (previews == null) {
