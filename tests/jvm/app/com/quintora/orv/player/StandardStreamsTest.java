@@ -150,10 +150,14 @@ class StandardStreamsTest {
         List<String> arguments = new ArrayList<>(List.of("play", "--no-window", "--stats"));
         arguments.addAll(Arrays.asList(source));
         PlayerProcess play = assertEnds(0, streams, arguments.toArray(String[]::new));
-        // 90 frames; a busy machine leaves some out.
-        assertTrue(play.out().matches("(?s).*; \\d+ frames shown, \\d+ dropped\n"), play::all);
+        // All three seconds. Of the 90 frames a busy machine leaves some out, not all of which
+        // mpv counts.
+        String end = "(?s).*; 3\\.0\\d s of media took .*; \\d+ frames shown, \\d+ dropped\n";
+        assertTrue(play.out().matches(end), play::all);
         String[] counts = play.out().replaceAll("(?s).*; ", "").split("\\D+");
-        assertEquals(90, Integer.parseInt(counts[0]) + Integer.parseInt(counts[1]), 2, play::all);
+        int shown = Integer.parseInt(counts[0]);
+        int dropped = Integer.parseInt(counts[1]);
+        assertTrue(shown > 1 && shown + dropped <= 92, play::all);
     }
 
     private PlayerProcess assertEnds(int status, String streams, String... arguments)
